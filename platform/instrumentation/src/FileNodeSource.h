@@ -1,0 +1,20 @@
+/// \file
+#ifndef TAVRO_FILENODESOURCE_H
+#define TAVRO_FILENODESOURCE_H
+
+#include "NodeSource.h"
+
+namespace Tavro {
+
+/// The inventory file named by the environment variable TAVRO_INVENTORY.
+class FileNodeSource : public NodeSource
+{
+public:
+    std::vector<Node> read() const override;
+    /// The path as it stands in the file, where people wrote it.
+    std::string displayText(const std::string& path) const override;
+};
+
+} // namespace Tavro
+
+#endif

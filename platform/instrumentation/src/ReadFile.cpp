@@ -1,0 +1,87 @@
+#include "ReadFile.h"
+
+#include <algorithm>
+#include <cerrno>
+#include <system_error>
+
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+namespace Tavro {
+namespace {
+
+class Descriptor
+{
+public:
+    explicit Descriptor(int number) : number_(number) {}
+    ~Descriptor()
+    {
+        if (number_ >= 0)
+            close(number_);
+    }
+    Descriptor(const Descriptor&) = delete;
+    Descriptor& operator=(const Descriptor&) = delete;
+
+    int number() const { return number_; }
+
+private:
+    int number_;
+};
+
+[[noreturn]] void failWithErrno()
+{
+    throw ReadFailure("expected a readable file: " + std::generic_category().message(errno));
+}
+
+std::string fileType(mode_t mode)
+{
+    if (S_ISDIR(mode))
+        return "a directory";
+    if (S_ISFIFO(mode))
+        return "a pipe";
+    return "a device";
+}
+
+void checkType(int descriptor)
+{
+    struct stat status
+    {};
+    if (fstat(descriptor, &status) != 0)
+        failWithErrno();
+    if (!S_ISREG(status.st_mode))
+        throw ReadFailure("expected a regular file, found " + fileType(status.st_mode));
+}
+
+/// Appends what one call reads. \return whether there was anything left to read
+bool readPart(int descriptor, std::string& content)
+{
+    char part[65536];
+    ssize_t count = 0;
+    do
+        count = read(descriptor, &part[0], sizeof part);
+    while (count < 0 && errno == EINTR);
+    if (count < 0)
+        failWithErrno();
+    content.append(&part[0], static_cast<std::size_t>(count));
+    return count > 0;
+}
+
+} // namespace
+
+std::string readFile(const std::string& name, std::size_t mostBytes)
+{
+    // Without O_NONBLOCK opening a pipe would wait for somebody to write to it.
+    const Descriptor file(open(name.c_str(), O_RDONLY | O_CLOEXEC | O_NOCTTY | O_NONBLOCK));
+    if (file.number() < 0)
+        failWithErrno();
+    checkType(file.number());
+
+    std::string content;
+    while (readPart(file.number(), content))
+        if (content.size() > mostBytes)
+            throw ReadFailure("expected at most " + std::to_string(mostBytes) + " bytes, found more");
+    return content;
+}
+
+} // namespace Tavro

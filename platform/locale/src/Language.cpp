@@ -1,0 +1,45 @@
+#include "Tavro/Locale.h"
+
+#include <algorithm>
+#include <cstdlib>
+#include <initializer_list>
+#include <string_view>
+
+namespace Tavro::Locale {
+namespace {
+
+constexpr std::string_view defaultLanguage = "en_US";
+
+/// Such as de_DE.UTF-8@euro; empty when nothing is said.
+std::string_view localeForMessages()
+{
+    for (const char* const name : {"LC_ALL", "LC_MESSAGES", "LANG"}) {
+        const char* const value = std::getenv(name);
+        if (value != nullptr && *value != '\0')
+            return value;
+    }
+    return {};
+}
+
+bool isLanguageCharacter(char character)
+{
+    return (character >= 'a' && character <= 'z') || (character >= 'A' && character <= 'Z') ||
+           (character >= '0' && character <= '9') || character == '-' || character == '_';
+}
+
+bool isLanguage(std::string_view text)
+{
+    return !text.empty() && text != "C" && text != "POSIX" &&
+           std::all_of(text.begin(), text.end(), isLanguageCharacter);
+}
+
+} // namespace
+
+std::string getLanguageId()
+{
+    const std::string_view locale = localeForMessages();
+    const std::string_view language = locale.substr(0, locale.find_first_of(".@"));
+    return std::string(isLanguage(language) ? language : defaultLanguage);
+}
+
+} // namespace Tavro::Locale

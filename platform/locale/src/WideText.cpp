@@ -1,0 +1,32 @@
+#include "Tavro/Locale.h"
+
+#include <cstddef>
+
+#include <utf8proc.h>
+
+namespace Tavro {
+namespace {
+
+constexpr utf8proc_int32_t replacementCharacter = 0xFFFD;
+
+void appendUtf8(std::string& text, wchar_t character)
+{
+    const auto codePoint = static_cast<utf8proc_int32_t>(character);
+    utf8proc_uint8_t bytes[4];
+    const utf8proc_ssize_t count = utf8proc_encode_char(
+        utf8proc_codepoint_valid(codePoint) ? codePoint : replacementCharacter, &bytes[0]);
+    text.append(&bytes[0], &bytes[count]);
+}
+
+} // namespace
+
+std::string make_string(const std::wstring& text)
+{
+    std::string utf8;
+    utf8.reserve(text.size());
+    for (const wchar_t character : text)
+        appendUtf8(utf8, character);
+    return utf8;
+}
+
+} // namespace Tavro
