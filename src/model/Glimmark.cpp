@@ -1,0 +1,271 @@
+// The device model: records, their translation of node status, and the inventory collection.
+
+#include "Glimmark.h"
+#include "GlimmarkCapabilities.h"
+#include "InventoryCollection.h"
+#include "ProviderException.h"
+#include "Trace.h"
+
+#include <Tavro/Common.h>
+#include <Tavro/Instrumentation.h>
+
+#include <exception>
+#include <iostream>
+
+namespace Tavro {
+
+const std::string loggerGlimmark("Mavrel.Glimmark");
+
+namespace {
+
+const TraceModule traceModule{"Glimmark.cpp", loggerGlimmark};
+
+} // namespace
+
+ProviderException::ProviderException(const char* text) : message(text) {}
+ProviderException::ProviderException(const ProviderException& other) = default;
+ProviderException::~ProviderException() = default;
+
+const char* ProviderException::what() const noexcept
+{
+    return message.c_str();
+}
+
+namespace GlimmarkProvider {
+
+namespace {
+
+// Status codes of the inventory's nodes.
+constexpr unsigned int nodeOk = 1;
+constexpr unsigned int nodePredictiveFailure = 20;
+constexpr unsigned int nodeLastDegraded = 26;
+
+// What the collection asks of the inventory. The instrumentation library numbers its enumerations;
+// the numbers are the contract, whatever a maker's header calls them.
+constexpr auto diagnosticIndicator = static_cast<NodeLexicon::NodeType>(36);
+constexpr auto alarmStateProperty = static_cast<NodeLexicon::Properties>(1);
+
+bool isDegraded(unsigned int nodeStatus)
+{
+    return nodeStatus >= nodePredictiveFailure && nodeStatus <= nodeLastDegraded;
+}
+
+bool isEnabled(unsigned int nodeStatus)
+{
+    // Bits 1 and 20 to 26: one test for the whole set.
+    constexpr unsigned int enabledStatuses = 0x7F00002U;
+    return nodeStatus <= nodeLastDegraded && ((enabledStatuses >> nodeStatus) & 1U) != 0;
+}
+
+void require(bool accepted, const char* failure)
+{
+    if (!accepted)
+        throw ProviderException(failure);
+}
+
+Glimmark readNode(const Instrumentation& node)
+{
+    Glimmark record;
+    const std::string path = node.convertPathToString(node.getPathToNode());
+    const std::string description = node.getNodeDescription();
+    require(record.setDeviceID(description + ":" + path), "Failed while setting Device ID");
+    require(record.setElementName(description), "Failed while setting Element Name");
+
+    // Status 0 is "not known": the record's defaults say that better than a translation would.
+    if (const unsigned int status = node.getNodeStatus(); status != 0) {
+        require(record.setOperationalStatus(status), "Failed while setting Operational Status");
+        require(record.setHealthState(status), "Failed while setting Health State");
+    }
+    // An indicator that the inventory lists is enabled, whatever its status.
+    require(record.setRequestedState(nodeOk), "Failed while setting Requested State");
+
+    require(record.setAudibleAlarm(false), "Failed while setting AudibleAlarm");
+    // The audible alarm's text, on purpose: there is no visible alarm's.
+    require(record.setVisibleAlarm(true), "Failed while setting AudibleAlarm");
+    require(record.setMotionAlarm(false), "Failed while setting MotionAlarm");
+
+    if (unsigned int alarmState = 1; node.getProperty(alarmStateProperty, alarmState))
+        require(record.setAlarmState(static_cast<std::uint16_t>(alarmState)),
+                "Failed while setting AlarmState");
+    return record;
+}
+
+} // namespace
+
+std::string Glimmark::getDeviceID() const
+{
+    return stripSpaces(DeviceID);
+}
+std::string Glimmark::getElementName() const
+{
+    return stripSpaces(ElementName);
+}
+unsigned int Glimmark::getRequestedState() const
+{
+    return RequestedState;
+}
+unsigned int Glimmark::getHealthState() const
+{
+    return HealthState;
+}
+std::vector<std::uint16_t> Glimmark::getOperationalStatus() const
+{
+    return OperationalStatus;
+}
+bool Glimmark::getAudibleAlarm() const
+{
+    return AudibleAlarm;
+}
+bool Glimmark::getVisibleAlarm() const
+{
+    return VisibleAlarm;
+}
+bool Glimmark::getMotionAlarm() const
+{
+    return MotionAlarm;
+}
+std::uint16_t Glimmark::getAlarmState() const
+{
+    return AlarmState;
+}
+
+bool Glimmark::setDeviceID(const std::string& deviceID)
+{
+    DeviceID = deviceID;
+    return !DeviceID.empty();
+}
+
+bool Glimmark::setElementName(const std::string& elementName)
+{
+    ElementName = elementName;
+    return !ElementName.empty();
+}
+
+bool Glimmark::setRequestedState(unsigned int nodeStatus)
+{
+    constexpr std::uint16_t enabled = 2;
+    constexpr std::uint16_t disabled = 3;
+    RequestedState = isEnabled(nodeStatus) ? enabled : disabled;
+    return true;
+}
+
+bool Glimmark::setHealthState(unsigned int nodeStatus)
+{
+    constexpr std::uint16_t unknown = 0;
+    constexpr std::uint16_t ok = 5;
+    constexpr std::uint16_t degraded = 10;
+    if (nodeStatus == nodeOk)
+        HealthState = ok;
+    else
+        HealthState = isDegraded(nodeStatus) ? degraded : unknown;
+    return true;
+}
+
+bool Glimmark::setOperationalStatus(unsigned int nodeStatus)
+{
+    constexpr std::uint16_t unknown = 0;
+    constexpr std::uint16_t ok = 2;
+    constexpr std::uint16_t degraded = 3;
+    constexpr std::uint16_t predictiveFailure = 5;
+    constexpr std::uint16_t inService = 11;
+    OperationalStatus.clear();
+    if (nodeStatus == nodeOk)
+        OperationalStatus = {ok, inService};
+    else if (nodeStatus == nodePredictiveFailure)
+        OperationalStatus = {degraded, predictiveFailure};
+    else if (isDegraded(nodeStatus))
+        OperationalStatus = {degraded};
+    else
+        OperationalStatus = {unknown};
+    return true;
+}
+
+bool Glimmark::setAudibleAlarm(bool audibleAlarm)
+{
+    AudibleAlarm = audibleAlarm;
+    return true;
+}
+
+bool Glimmark::setVisibleAlarm(bool visibleAlarm)
+{
+    VisibleAlarm = visibleAlarm;
+    return true;
+}
+
+bool Glimmark::setMotionAlarm(bool motionAlarm)
+{
+    MotionAlarm = motionAlarm;
+    return true;
+}
+
+bool Glimmark::setAlarmState(std::uint16_t alarmState)
+{
+    constexpr std::uint16_t alternating = 3;
+    AlarmState = alarmState <= alternating ? alarmState : std::uint16_t{0};
+    return true;
+}
+
+std::string GlimmarkCapabilities::getInstanceID()
+{
+    InstanceID = "TAVRO:GlimmarkCapabilities1";
+    return InstanceID;
+}
+
+bool GlimmarkCapabilities::getElementNameEditSupported()
+{
+    ElementNameEditSupported = false;
+    return ElementNameEditSupported;
+}
+
+std::vector<std::uint16_t> GlimmarkCapabilities::getAlarmStatesSupported()
+{
+    AlarmStatesSupported.insert(AlarmStatesSupported.end(), {1, 2, 3});
+    return AlarmStatesSupported;
+}
+
+int getGlimmarkInstances(std::vector<Glimmark>& out)
+{
+    Instrumentation cursor;
+    cursor.selectNode(diagnosticIndicator);
+    if (!cursor)
+        return 1;
+    try {
+        setVector(out, cursor);
+    } catch (const std::exception&) {
+        return 1;
+    }
+    return 0;
+}
+
+int setVector(std::vector<Glimmark>& out, Instrumentation& cursor)
+{
+    const auto parameters = [&] {
+        return parameterList(" vectGlimmark=", &out, " instrumentation=", &cursor);
+    };
+    const FunctionTrace flow(traceModule, "setVector");
+    flow.entering(parameters());
+    for (; cursor; ++cursor)
+        out.push_back(readNode(cursor));
+    flow.exiting(parameters());
+    return 0;
+}
+
+int getGlimmarkCapabilitiesInstances(std::vector<GlimmarkCapabilities>& out)
+{
+    const auto parameters = [&] { return parameterList(" vectGlimmarkCapabilities=", &out); };
+    const FunctionTrace flow(traceModule, "getGlimmarkCapabilitiesInstances");
+    flow.entering(parameters());
+    try {
+        out.emplace_back();
+    } catch (const std::exception& failure) {
+        // The library's only word on standard error.
+        std::cerr << failure.what() << '\n';
+        return 1;
+    }
+    flow.exiting(parameters());
+    return 0;
+}
+
+} // namespace GlimmarkProvider
+
+} // namespace Tavro

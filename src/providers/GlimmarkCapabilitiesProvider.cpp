@@ -1,0 +1,192 @@
+// The provider of TAVRO_GlimmarkCapabilities.
+
+#include "EntryPoints.h"
+#include "GlimmarkFactory.h"
+#include "Names.h"
+#include "ProviderFrame.h"
+#include "Trace.h"
+
+#include <string>
+#include <vector>
+
+namespace Tavro::GlimmarkProvider {
+
+const std::string loggerGlimmarkCapabilitiesProvider("Mavrel.GlimmarkCapabilitiesProvider");
+
+static BrokerPointer broker{nullptr};
+
+namespace {
+
+const TraceModule traceModule{"GlimmarkCapabilitiesProvider.cpp", loggerGlimmarkCapabilitiesProvider};
+
+} // namespace
+
+CMPIStatus GlimmarkCapabilities_EnumInstanceNames(CMPIInstanceMI* mi, const CMPIContext* ctx,
+                                                  const CMPIResult* rslt, const CMPIObjectPath* ref)
+{
+    const auto parameters = [&] {
+        return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " ref=", ref);
+    };
+    const FunctionTrace flow(traceModule, "GlimmarkCapabilities_EnumInstanceNames");
+    flow.entering(parameters());
+    CMPIStatus status = okStatus();
+
+    const GlimmarkFactory factory(false, true);
+    std::vector<CMPIObjectPath*> paths;
+    reserveFor(factory, paths);
+    if (factory.getAllGlimmarkCapabilitiesCMPIObjPaths(broker, ref, paths, &status) != 0)
+        return status; // meant: neither returnDone nor an EXITING line, here as in every early return below
+    forEach(paths, [&](const CMPIObjectPath* path) {
+        if (Cmpi::exists(path))
+            returnObjectPathOf(rslt, path, ref, &status);
+    });
+
+    Cmpi::returnDone(rslt);
+    flow.exiting(parameters());
+    return status;
+}
+
+CMPIStatus GlimmarkCapabilities_EnumInstances(CMPIInstanceMI* mi, const CMPIContext* ctx,
+                                              const CMPIResult* rslt, const CMPIObjectPath* ref,
+                                              const char** properties)
+{
+    const auto parameters = [&] {
+        return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " ref=", ref,
+                             " properties=", properties);
+    };
+    const FunctionTrace flow(traceModule, "GlimmarkCapabilities_EnumInstances");
+    flow.entering(parameters());
+    CMPIStatus status = okStatus();
+
+    const GlimmarkFactory factory(false, true);
+    std::vector<CMPIInstance*> instances;
+    reserveFor(factory, instances);
+    if (factory.getAllGlimmarkCapabilitiesCMPIInstances(broker, ref, properties, false, instances, &status) !=
+        0)
+        return status;
+    returnInstances(rslt, instances);
+
+    Cmpi::returnDone(rslt);
+    flow.exiting(parameters());
+    return status;
+}
+
+namespace {
+
+/// Returns the instance with the InstanceID asked for. \return the factory's result
+int returnByInstanceID(const CMPIResult* rslt, const CMPIObjectPath* cop, CMPIString* instanceID,
+                       const char** properties, CMPIStatus& status)
+{
+    const GlimmarkFactory factory(false, true);
+    std::vector<CMPIInstance*> instances;
+    reserveFor(factory, instances);
+    const int result = factory.getOneGlimmarkCapabilitiesCMPIInstance(broker, cop, instanceID, properties,
+                                                                      instances, &status);
+    if (result == 0)
+        returnInstances(rslt, instances);
+    return result;
+}
+
+/// Returns every instance whose whole path is the one asked for. \return the factory's result
+int returnByPath(const CMPIResult* rslt, const CMPIObjectPath* cop, const char** properties,
+                 CMPIStatus& status)
+{
+    // Meant: collected are the alarm devices and not the capabilities, so that this way finds nothing. A
+    // client without the InstanceID is told "not found" by its broker.
+    const GlimmarkFactory factory(true, false);
+    std::vector<CMPIInstance*> instances;
+    reserveFor(factory, instances);
+    const int result =
+        factory.getAllGlimmarkCapabilitiesCMPIInstances(broker, cop, properties, false, instances, &status);
+    if (result == 0) {
+        // Unlike the alarm device provider, the walk goes on after a match.
+        forEach(instances, [&](const CMPIInstance* instance) {
+            if (isAt(instance, cop, false, status))
+                Cmpi::returnInstance(rslt, instance);
+        });
+    }
+    return result;
+}
+
+} // namespace
+
+CMPIStatus GlimmarkCapabilities_GetInstance(CMPIInstanceMI* mi, const CMPIContext* ctx,
+                                            const CMPIResult* rslt, const CMPIObjectPath* cop,
+                                            const char** properties)
+{
+    const auto parameters = [&] {
+        return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " cop=", cop,
+                             " properties=", properties);
+    };
+    const FunctionTrace flow(traceModule, "GlimmarkCapabilities_GetInstance");
+    flow.entering(parameters());
+    CMPIStatus status = okStatus();
+
+    if (requireKeys(broker, GlimmarkCapabilitiesProvider, cop, status)) {
+        CMPIString* const instanceID = Cmpi::stringKeyOf(cop, "InstanceID", &status);
+        const int result = instanceID != nullptr
+                               ? returnByInstanceID(rslt, cop, instanceID, properties, status)
+                               : returnByPath(rslt, cop, properties, status);
+        if (result != 0)
+            return status;
+    }
+
+    Cmpi::returnDone(rslt);
+    flow.exiting(parameters());
+    return status;
+}
+
+// The library only reads: what would change something is not supported, and cleaning up has nothing to do.
+
+CMPIStatus GlimmarkCapabilities_Cleanup(CMPIInstanceMI*, const CMPIContext*, CMPIBoolean)
+{
+    return okStatus();
+}
+
+CMPIStatus GlimmarkCapabilities_CreateInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
+                                               const CMPIObjectPath*, const CMPIInstance*)
+{
+    return notSupportedStatus();
+}
+
+CMPIStatus GlimmarkCapabilities_ModifyInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
+                                               const CMPIObjectPath*, const CMPIInstance*, const char**)
+{
+    return notSupportedStatus();
+}
+
+CMPIStatus GlimmarkCapabilities_DeleteInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
+                                               const CMPIObjectPath*)
+{
+    return notSupportedStatus();
+}
+
+CMPIStatus GlimmarkCapabilities_ExecQuery(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
+                                          const CMPIObjectPath*, const char*, const char*)
+{
+    return notSupportedStatus();
+}
+
+static FunctionTable<CMPIInstanceMI> instMIFT__ = {
+    interfaceVersion,
+    interfaceVersion,
+    miName("instanceGlimmarkCapabilitiesProvider"),
+    Entry(GlimmarkCapabilities_Cleanup),
+    Entry(GlimmarkCapabilities_EnumInstanceNames),
+    Entry(GlimmarkCapabilities_EnumInstances),
+    Entry(GlimmarkCapabilities_GetInstance),
+    Entry(GlimmarkCapabilities_CreateInstance),
+    Entry(GlimmarkCapabilities_ModifyInstance),
+    Entry(GlimmarkCapabilities_DeleteInstance),
+    Entry(GlimmarkCapabilities_ExecQuery),
+};
+
+} // namespace Tavro::GlimmarkProvider
+
+CMPIInstanceMI* GlimmarkCapabilitiesProvider_Create_InstanceMI(const CMPIBroker* broker,
+                                                               const CMPIContext* /*ctx*/, CMPIStatus* /*rc*/)
+{
+    static CMPIInstanceMI mi = {nullptr, &Tavro::GlimmarkProvider::instMIFT__};
+    Tavro::GlimmarkProvider::broker = broker;
+    return &mi;
+}

@@ -1,0 +1,178 @@
+// The provider of TAVRO_Glimmark.
+
+#include "EntryPoints.h"
+#include "GlimmarkFactory.h"
+#include "Names.h"
+#include "ProviderFrame.h"
+#include "Trace.h"
+
+#include <string>
+#include <vector>
+
+namespace Tavro::GlimmarkProvider {
+
+const std::string loggerGlimmarkProvider("Mavrel.GlimmarkProvider");
+
+static BrokerPointer broker{nullptr};
+
+namespace {
+
+const TraceModule traceModule{"GlimmarkProvider.cpp", loggerGlimmarkProvider};
+
+} // namespace
+
+CMPIStatus Glimmark_EnumInstanceNames(CMPIInstanceMI* mi, const CMPIContext* ctx, const CMPIResult* rslt,
+                                      const CMPIObjectPath* ref)
+{
+    const auto parameters = [&] {
+        return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " ref=", ref);
+    };
+    const FunctionTrace flow(traceModule, "Glimmark_EnumInstanceNames");
+    flow.entering(parameters());
+    CMPIStatus status = okStatus();
+
+    const GlimmarkFactory factory(true, false);
+    std::vector<CMPIObjectPath*> paths;
+    reserveFor(factory, paths);
+    if (factory.getAllGlimmarkCMPIObjPaths(broker, ref, paths, &status) != 0)
+        return status; // meant: neither returnDone nor an EXITING line, here as in every early return below
+    forEach(paths, [&](const CMPIObjectPath* path) { returnObjectPathOf(rslt, path, ref, &status); });
+
+    Cmpi::returnDone(rslt);
+    flow.exiting(parameters());
+    return status;
+}
+
+CMPIStatus Glimmark_EnumInstances(CMPIInstanceMI* mi, const CMPIContext* ctx, const CMPIResult* rslt,
+                                  const CMPIObjectPath* ref, const char** properties)
+{
+    const auto parameters = [&] {
+        return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " ref=", ref,
+                             " properties=", properties);
+    };
+    const FunctionTrace flow(traceModule, "Glimmark_EnumInstances");
+    flow.entering(parameters());
+    CMPIStatus status = okStatus();
+
+    const GlimmarkFactory factory(true, false);
+    std::vector<CMPIInstance*> instances;
+    reserveFor(factory, instances);
+    if (factory.getAllGlimmarkCMPIInstances(broker, ref, properties, false, instances, &status) != 0)
+        return status;
+    returnInstances(rslt, instances);
+
+    Cmpi::returnDone(rslt);
+    flow.exiting(parameters());
+    return status;
+}
+
+namespace {
+
+/// Returns the instance with the DeviceID asked for. \return the factory's result
+int returnByDeviceID(const CMPIResult* rslt, const CMPIObjectPath* cop, CMPIString* deviceID,
+                     const char** properties, CMPIStatus& status)
+{
+    const GlimmarkFactory factory(true, false);
+    std::vector<CMPIInstance*> instances;
+    reserveFor(factory, instances);
+    const int result =
+        factory.getOneGlimmarkCMPIInstance(broker, cop, deviceID, properties, instances, &status);
+    if (result == 0)
+        returnInstances(rslt, instances);
+    return result;
+}
+
+/// Returns the first instance whose whole path is the one asked for. \return the factory's result
+int returnByPath(const CMPIResult* rslt, const CMPIObjectPath* cop, const char** properties,
+                 CMPIStatus& status)
+{
+    const GlimmarkFactory factory(true, false);
+    std::vector<CMPIInstance*> instances;
+    reserveFor(factory, instances);
+    const int result =
+        factory.getAllGlimmarkCMPIInstances(broker, cop, properties, false, instances, &status);
+    if (result == 0)
+        returnFirstAt(rslt, instances, cop, false, status);
+    return result;
+}
+
+} // namespace
+
+CMPIStatus Glimmark_GetInstance(CMPIInstanceMI* mi, const CMPIContext* ctx, const CMPIResult* rslt,
+                                const CMPIObjectPath* cop, const char** properties)
+{
+    const auto parameters = [&] {
+        return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " cop=", cop,
+                             " properties=", properties);
+    };
+    const FunctionTrace flow(traceModule, "Glimmark_GetInstance");
+    flow.entering(parameters());
+    CMPIStatus status = okStatus();
+
+    if (requireKeys(broker, GlimmarkProfileProvider, cop, status)) {
+        CMPIString* const deviceID = Cmpi::stringKeyOf(cop, "DeviceID", &status);
+        const int result = deviceID != nullptr ? returnByDeviceID(rslt, cop, deviceID, properties, status)
+                                               : returnByPath(rslt, cop, properties, status);
+        if (result != 0)
+            return status;
+    }
+
+    Cmpi::returnDone(rslt);
+    flow.exiting(parameters());
+    return status;
+}
+
+// The library only reads: what would change something is not supported, and cleaning up has nothing to do.
+
+CMPIStatus Glimmark_Cleanup(CMPIInstanceMI*, const CMPIContext*, CMPIBoolean)
+{
+    return okStatus();
+}
+
+CMPIStatus Glimmark_CreateInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
+                                   const CMPIObjectPath*, const CMPIInstance*)
+{
+    return notSupportedStatus();
+}
+
+CMPIStatus Glimmark_ModifyInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
+                                   const CMPIObjectPath*, const CMPIInstance*, const char**)
+{
+    return notSupportedStatus();
+}
+
+CMPIStatus Glimmark_DeleteInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
+                                   const CMPIObjectPath*)
+{
+    return notSupportedStatus();
+}
+
+CMPIStatus Glimmark_ExecQuery(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*, const CMPIObjectPath*,
+                              const char*, const char*)
+{
+    return notSupportedStatus();
+}
+
+static FunctionTable<CMPIInstanceMI> instMIFT__ = {
+    interfaceVersion,
+    interfaceVersion,
+    miName("instanceGlimmarkProfileProvider"),
+    Entry(Glimmark_Cleanup),
+    Entry(Glimmark_EnumInstanceNames),
+    Entry(Glimmark_EnumInstances),
+    Entry(Glimmark_GetInstance),
+    Entry(Glimmark_CreateInstance),
+    Entry(Glimmark_ModifyInstance),
+    Entry(Glimmark_DeleteInstance),
+    Entry(Glimmark_ExecQuery),
+};
+
+} // namespace Tavro::GlimmarkProvider
+
+CMPIInstanceMI* GlimmarkProfileProvider_Create_InstanceMI(const CMPIBroker* broker,
+                                                          const CMPIContext* /*ctx*/, CMPIStatus* /*rc*/)
+{
+    static CMPIInstanceMI mi = {nullptr, &Tavro::GlimmarkProvider::instMIFT__};
+    Tavro::GlimmarkProvider::broker = broker;
+    return &mi;
+}
