@@ -1,0 +1,79 @@
+/// \file
+/// A thin layer over the host's broker that writes down every call a provider makes and can let single
+/// calls fail. It stands in the broker's function tables, so that nothing passes by it.
+#ifndef TESTS_SUPPORT_RECORDINGBROKER_H
+#define TESTS_SUPPORT_RECORDINGBROKER_H
+
+#include "broker/Broker.h"
+
+#include <map>
+#include <mutex>
+#include <string>
+#include <vector>
+
+#include <cmpift.h>
+
+/// How a call fails.
+enum class Failure
+{
+    nullResult,  ///< a null pointer or a zero; a status argument is left alone
+    noHandle,    ///< an object with a null handle
+    errorStatus, ///< a null pointer or a zero, and code 1 with the message "injected" in the status argument
+    wrongValue   ///< getNext: an item that is no reference; hasNext: false
+};
+
+/// One at a time may exist. Calls are written as the service's name with its arguments in parentheses:
+/// the broker, the object's own table and out-parameters are left out, texts are quoted, objects have
+/// the names given by name() or else "path1", "instance1" and so on in the order in which they were made;
+/// a status pointer is "rc", a null pointer "null", a value is followed by its type.
+class RecordingBroker
+{
+public:
+    explicit RecordingBroker(cimhost::Broker& broker);
+    ~RecordingBroker();
+    RecordingBroker(const RecordingBroker&) = delete;
+    RecordingBroker& operator=(const RecordingBroker&) = delete;
+
+    /// What to call an object of the test's own.
+    void name(const void* object, const std::string& name);
+
+    /// Forgets the calls so far, and the names of objects that calls made.
+    void clear();
+
+    std::vector<std::string> calls() const;
+
+    /// Those calls that begin with one of the services' names.
+    std::vector<std::string> calls(const std::vector<std::string>& services) const;
+
+    /// Lets the nth call (from 1, counted from now on) of a service fail. May be said for several.
+    void fail(const std::string& service, int nth, Failure failure);
+
+    // What the layer's functions in the tables use.
+
+    static RecordingBroker* current();
+    /// Writes a call down. \return how it is to fail; nothing: it is not
+    std::optional<Failure> record(const std::string& service, const std::vector<std::string>& arguments);
+    /// The name of an object; a new one of that kind if it has none.
+    std::string nameOf(const void* object, const std::string& kind);
+    /// A broker's string for the status of a failing call.
+    CMPIString* injectedMessage();
+
+private:
+    struct Plan
+    {
+        std::string service;
+        int remaining;
+        Failure failure;
+    };
+
+    cimhost::Broker& broker;
+    cimhost::FunctionTables originalTables;
+    mutable std::mutex mutex;
+    std::vector<std::string> recorded;
+    std::map<const void*, std::string> names;
+    std::map<const void*, std::string> givenNames;
+    std::map<std::string, int> counters;
+    std::vector<Plan> plans;
+};
+
+#endif
