@@ -33,6 +33,7 @@ endfunction()
 function(add_support_library_tests name)
     add_executable(${name}-tests ${ARGN})
     target_link_libraries(${name}-tests PRIVATE ${name} GTest::gmock GTest::gtest_main glimmark::settings)
+    target_include_directories(${name}-tests PRIVATE ${PROJECT_SOURCE_DIR}/platform)
     gtest_discover_tests(${name}-tests TEST_PREFIX ${name}.)
 
     add_test(

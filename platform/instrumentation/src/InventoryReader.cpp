@@ -21,6 +21,7 @@ using Json = nlohmann::json;
 
 constexpr unsigned int largestNumber = std::numeric_limits<unsigned int>::max();
 constexpr std::size_t longestNameShown = 64;
+constexpr std::size_t longestDetailShown = 200;
 
 struct Field
 {
@@ -47,14 +48,14 @@ std::string listOf(const Field (&fields)[count])
 }
 
 /// Cut where a character of UTF-8 ends.
-std::string shortened(const std::string& name)
+std::string shortened(const std::string& text, std::size_t longest = longestNameShown)
 {
-    if (name.size() <= longestNameShown)
-        return name;
-    std::size_t length = longestNameShown;
-    while (length > 0 && (static_cast<unsigned char>(name[length]) & 0xC0) == 0x80)
+    if (text.size() <= longest)
+        return text;
+    std::size_t length = longest;
+    while (length > 0 && (static_cast<unsigned char>(text[length]) & 0xC0) == 0x80)
         --length;
-    return name.substr(0, length) + "...";
+    return text.substr(0, length) + "...";
 }
 
 /// Such as "line 3, column 5", both counted from 1, the column in bytes.
@@ -77,7 +78,7 @@ std::string parserDetail(std::string message, const std::string& lastToken)
     message.erase(0, message.find("] ") + 2);
     if (message.rfind("parse error", 0) == 0)
         message.erase(0, message.find(": ") + 2);
-    return message;
+    return shortened(message, longestDetailShown);
 }
 
 /// Takes the file in as the parser comes along, and so stops at the first fault: what is nested where
@@ -246,7 +247,7 @@ private:
             pointer = pointer / "nodes" / (nodes_.size() - 1);
         if (level_ != Level::NodeList && !field_.empty())
             pointer /= shortened(field_);
-        return pointer.empty() ? "the whole" : pointer.to_string();
+        return pointer.empty() ? "the whole file" : pointer.to_string();
     }
 
     std::string expected() const

@@ -35,10 +35,25 @@ std::shared_ptr<DescriptorSink> openSink(Settings& settings)
     }
 }
 
+/// One line stays one line, and a terminal is sent no commands.
+std::string withControlCharactersEscaped(const std::string& text)
+{
+    std::string escaped;
+    escaped.reserve(text.size());
+    for (const char character : text) {
+        const auto code = static_cast<unsigned char>(character);
+        if (code < 0x20 || code == 0x7F)
+            escaped += fmt::format("\\x{:02X}", code);
+        else
+            escaped += character;
+    }
+    return escaped;
+}
+
 /// Says on standard error what is wrong with the log itself.
 void complain(const std::string& complaint)
 {
-    spdlog::logger("mvlog", std::make_shared<DescriptorSink>()).warn("{}", complaint);
+    spdlog::logger("mvlog", std::make_shared<DescriptorSink>()).warn(withControlCharactersEscaped(complaint));
 }
 
 std::unique_ptr<spdlog::logger> openLogger(Settings& settings)
@@ -77,21 +92,6 @@ void open()
 const char* orUnknown(const char* text)
 {
     return text == nullptr ? "?" : text;
-}
-
-/// One line stays one line, and a terminal is sent no commands.
-std::string withControlCharactersEscaped(const std::string& text)
-{
-    std::string escaped;
-    escaped.reserve(text.size());
-    for (const char character : text) {
-        const auto code = static_cast<unsigned char>(character);
-        if (code < 0x20 || code == 0x7F)
-            escaped += fmt::format("\\x{:02X}", code);
-        else
-            escaped += character;
-    }
-    return escaped;
 }
 
 std::string format(const Line& line)
