@@ -10,9 +10,9 @@ namespace Tavro {
 class FileNodeSource : public NodeSource
 {
 public:
-    std::vector<Node> read() const override;
+    [[nodiscard]] std::vector<Node> read() const override;
     /// The path as it stands in the file, where people wrote it.
-    std::string displayText(const std::string& path) const override;
+    [[nodiscard]] std::string displayText(const std::string& path) const override;
 };
 
 } // namespace Tavro

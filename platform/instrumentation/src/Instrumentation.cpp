@@ -22,7 +22,7 @@ struct Instrumentation::Implementation
     }
 
     /// Null while the cursor stands on none.
-    const Node* node() const { return position < nodes.size() ? &nodes[position] : nullptr; }
+    [[nodiscard]] const Node* node() const { return position < nodes.size() ? &nodes[position] : nullptr; }
 };
 
 Instrumentation::Instrumentation() : implementation_(std::make_unique<Implementation>()) {}

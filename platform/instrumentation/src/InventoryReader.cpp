@@ -3,6 +3,7 @@
 #include "NodeKinds.h"
 
 #include <algorithm>
+#include <array>
 #include <cstddef>
 #include <cstdint>
 #include <functional>
@@ -29,17 +30,17 @@ struct Field
     bool isRequired;
 };
 
-constexpr Field inventoryFields[] = {{"$schema", false}, {"nodes", true}};
-constexpr Field nodeFields[] = {
-    {"kind", true}, {"description", true}, {"path", true}, {"status", true}, {"alarmState", false}};
+constexpr std::array inventoryFields = {Field{"$schema", false}, Field{"nodes", true}};
+constexpr std::array nodeFields = {Field{"kind", true}, Field{"description", true}, Field{"path", true},
+                                   Field{"status", true}, Field{"alarmState", false}};
 
 std::string inQuotes(std::string_view text)
 {
     return '"' + std::string(text) + '"';
 }
 
-template <std::size_t count>
-std::string listOf(const Field (&fields)[count])
+template <class Fields>
+std::string listOf(const Fields& fields)
 {
     std::string list;
     for (const Field& field : fields)
@@ -195,10 +196,13 @@ private:
     };
     using Names = std::set<std::string, std::less<>>;
 
-    bool isAt(std::string_view nodeField) const { return level_ == Level::Node && field_ == nodeField; }
+    [[nodiscard]] bool isAt(std::string_view nodeField) const
+    {
+        return level_ == Level::Node && field_ == nodeField;
+    }
 
-    template <std::size_t count>
-    void enterField(const Field (&known)[count], Names& seen)
+    template <class Fields>
+    void enterField(const Fields& known, Names& seen)
     {
         if (std::none_of(std::begin(known), std::end(known),
                          [this](const Field& f) { return f.name == field_; }))
@@ -207,8 +211,8 @@ private:
             throw InventoryError(place() + ": field given twice, expected it once");
     }
 
-    template <std::size_t count>
-    void checkComplete(const Field (&known)[count], const Names& seen) const
+    template <class Fields>
+    void checkComplete(const Fields& known, const Names& seen) const
     {
         for (const Field& field : known)
             if (field.isRequired && seen.find(field.name) == seen.end())
@@ -216,7 +220,7 @@ private:
                                      ", found none");
     }
 
-    unsigned int kindCalled(const std::string& name) const
+    [[nodiscard]] unsigned int kindCalled(const std::string& name) const
     {
         const std::optional<unsigned int> kind = findNodeKind(name);
         if (!kind)
@@ -225,7 +229,7 @@ private:
     }
 
     /// Texts go through interfaces in which a null character ends them.
-    const std::string& checkedText(const std::string& text) const
+    [[nodiscard]] const std::string& checkedText(const std::string& text) const
     {
         if (text.find('\0') != std::string::npos)
             refuse("a null character in it");
@@ -238,7 +242,7 @@ private:
     }
 
     /// The JSON pointer to where the parser is.
-    std::string place() const
+    [[nodiscard]] std::string place() const
     {
         Json::json_pointer pointer;
         if (level_ == Level::NodeList)
@@ -250,7 +254,7 @@ private:
         return pointer.empty() ? "the whole file" : pointer.to_string();
     }
 
-    std::string expected() const
+    [[nodiscard]] std::string expected() const
     {
         if (level_ == Level::Outside)
             return "an object with the field \"nodes\"";
@@ -258,7 +262,7 @@ private:
             return "a node, which is an object";
         if (field_ == "nodes")
             return "a list of nodes";
-        const std::string number = "a whole number from 0 to " + std::to_string(largestNumber);
+        std::string number = "a whole number from 0 to " + std::to_string(largestNumber);
         if (field_ == "kind")
             return number + " or one of " + listNodeKinds();
         if (field_ == "status" || field_ == "alarmState")

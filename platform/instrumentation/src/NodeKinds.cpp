@@ -2,6 +2,8 @@
 
 #include "Tavro/NodeLexicon.h"
 
+#include <array>
+
 namespace Tavro {
 namespace {
 
@@ -11,16 +13,16 @@ struct NamedKind
     NodeLexicon::NodeType kind;
 };
 
-constexpr NamedKind namedKinds[] = {
-    {"chassis", NodeLexicon::Chassis},
-    {"system board", NodeLexicon::SystemBoard},
-    {"processor", NodeLexicon::Processor},
-    {"memory module", NodeLexicon::MemoryModule},
-    {"drive", NodeLexicon::Drive},
-    {"fan", NodeLexicon::Fan},
-    {"power supply", NodeLexicon::PowerSupply},
-    {"temperature sensor", NodeLexicon::TemperatureSensor},
-    {"diagnostic indicator", NodeLexicon::DiagnosticIndicator},
+constexpr std::array namedKinds = {
+    NamedKind{"chassis", NodeLexicon::Chassis},
+    NamedKind{"system board", NodeLexicon::SystemBoard},
+    NamedKind{"processor", NodeLexicon::Processor},
+    NamedKind{"memory module", NodeLexicon::MemoryModule},
+    NamedKind{"drive", NodeLexicon::Drive},
+    NamedKind{"fan", NodeLexicon::Fan},
+    NamedKind{"power supply", NodeLexicon::PowerSupply},
+    NamedKind{"temperature sensor", NodeLexicon::TemperatureSensor},
+    NamedKind{"diagnostic indicator", NodeLexicon::DiagnosticIndicator},
 };
 
 } // namespace

@@ -20,10 +20,10 @@ public:
 
     /// All nodes as they are now, in the inventory's order. A source that cannot be read logs why, in
     /// one error line, and has no nodes. Throws nothing but std::bad_alloc.
-    virtual std::vector<Node> read() const = 0;
+    [[nodiscard]] virtual std::vector<Node> read() const = 0;
 
     /// What is shown to people for a path of this source.
-    virtual std::string displayText(const std::string& path) const = 0;
+    [[nodiscard]] virtual std::string displayText(const std::string& path) const = 0;
 };
 
 } // namespace Tavro

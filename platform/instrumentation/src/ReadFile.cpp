@@ -1,6 +1,6 @@
 #include "ReadFile.h"
 
-#include <algorithm>
+#include <array>
 #include <cerrno>
 #include <system_error>
 
@@ -23,7 +23,7 @@ public:
     Descriptor(const Descriptor&) = delete;
     Descriptor& operator=(const Descriptor&) = delete;
 
-    int number() const { return number_; }
+    [[nodiscard]] int number() const { return number_; }
 
 private:
     int number_;
@@ -56,14 +56,14 @@ void checkType(int descriptor)
 /// Appends what one call reads. \return whether there was anything left to read
 bool readPart(int descriptor, std::string& content)
 {
-    char part[65536];
+    std::array<char, 65536> part{};
     ssize_t count = 0;
     do
-        count = read(descriptor, &part[0], sizeof part);
+        count = read(descriptor, part.data(), part.size());
     while (count < 0 && errno == EINTR);
     if (count < 0)
         failWithErrno();
-    content.append(&part[0], static_cast<std::size_t>(count));
+    content.append(part.data(), static_cast<std::size_t>(count));
     return count > 0;
 }
 

@@ -85,8 +85,9 @@ class WithoutPrivileges
 public:
     WithoutPrivileges() : before_(geteuid())
     {
-        if (before_ == 0)
+        if (before_ == 0) {
             EXPECT_EQ(seteuid(65534), 0);
+        }
     }
     ~WithoutPrivileges() { EXPECT_EQ(seteuid(before_), 0); }
     WithoutPrivileges(const WithoutPrivileges&) = delete;

@@ -1,7 +1,7 @@
 #include "Catalogue.h"
 
 #include <algorithm>
-#include <iterator>
+#include <array>
 
 namespace Tavro {
 namespace {
@@ -15,8 +15,8 @@ struct Text
     std::wstring_view english;
 };
 
-constexpr Text texts[] = {
-    {L"2", L"MSGID_ALARMDEVICE_CAPTION", L"Diagnostic Indicator"},
+constexpr std::array texts = {
+    Text{L"2", L"MSGID_ALARMDEVICE_CAPTION", L"Diagnostic Indicator"},
 };
 
 } // namespace
@@ -35,10 +35,10 @@ std::optional<std::wstring_view> findText(std::wstring_view catalogue, std::wstr
         return std::nullopt;
     const std::wstring_view library = catalogue.substr(0, end);
 
-    const auto* const found = std::find_if(std::begin(texts), std::end(texts), [&](const Text& text) {
+    const auto* const found = std::find_if(texts.begin(), texts.end(), [&](const Text& text) {
         return text.library == library && text.messageId == messageId;
     });
-    if (found == std::end(texts))
+    if (found == texts.end())
         return std::nullopt;
     return found->english;
 }

@@ -1,6 +1,6 @@
 #include "Tavro/Locale.h"
 
-#include <cstddef>
+#include <array>
 
 #include <utf8proc.h>
 
@@ -12,10 +12,10 @@ constexpr utf8proc_int32_t replacementCharacter = 0xFFFD;
 void appendUtf8(std::string& text, wchar_t character)
 {
     const auto codePoint = static_cast<utf8proc_int32_t>(character);
-    utf8proc_uint8_t bytes[4];
+    std::array<utf8proc_uint8_t, 4> bytes{};
     const utf8proc_ssize_t count = utf8proc_encode_char(
-        utf8proc_codepoint_valid(codePoint) ? codePoint : replacementCharacter, &bytes[0]);
-    text.append(&bytes[0], &bytes[count]);
+        utf8proc_codepoint_valid(codePoint) ? codePoint : replacementCharacter, bytes.data());
+    text.append(bytes.begin(), bytes.begin() + count);
 }
 
 } // namespace

@@ -39,16 +39,16 @@ public:
     Instrumentation& operator++();
 
     /// The inventory's own path of the node.
-    std::string getPathToNode() const;
+    [[nodiscard]] std::string getPathToNode() const;
 
     /// What is shown to people for a path of this inventory. A file's paths are shown as they stand there.
-    std::string convertPathToString(const std::string& path) const;
+    [[nodiscard]] std::string convertPathToString(const std::string& path) const;
 
     /// The node's description, as it stands in the inventory.
-    std::string getNodeDescription() const;
+    [[nodiscard]] std::string getNodeDescription() const;
 
     /// The raw status code of the node.
-    unsigned int getNodeStatus() const;
+    [[nodiscard]] unsigned int getNodeStatus() const;
 
     /// Reads a property of the node.
     /// \param value  left untouched when the answer is false

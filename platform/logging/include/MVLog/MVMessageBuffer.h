@@ -27,7 +27,7 @@ public:
     MVMessageBuffer& operator<<(bool flag);
 
     /// All that was inserted so far.
-    std::string str() const;
+    [[nodiscard]] std::string str() const;
 
 private:
     struct Implementation;
