@@ -71,7 +71,8 @@ public:
     Broker& operator=(const Broker&) = delete;
 
     cim::Answer enumerateInstanceNames(const cim::ObjectPath& classPath);
-    cim::Answer enumerateInstances(const cim::ObjectPath& classPath, const cim::PropertyList& properties = {});
+    cim::Answer enumerateInstances(const cim::ObjectPath& classPath,
+                                   const cim::PropertyList& properties = {});
     cim::Answer getInstance(const cim::ObjectPath& path, const cim::PropertyList& properties = {});
     cim::Answer createInstance(const cim::ObjectPath& classPath, const cim::Instance& instance);
     cim::Answer modifyInstance(const cim::ObjectPath& path, const cim::Instance& instance,

@@ -1,0 +1,63 @@
+/// \file
+/// Which provider serves a request.
+#ifndef CIMHOST_BROKER_ROUTER_H
+#define CIMHOST_BROKER_ROUTER_H
+
+#include "broker/Core.h"
+#include "broker/Provider.h"
+#include "broker/Registration.h"
+#include "cim/Model.h"
+
+#include <map>
+#include <memory>
+#include <stdexcept>
+#include <string>
+#include <utility>
+#include <vector>
+
+namespace cimhost {
+
+/// A request that no provider can be asked.
+class RoutingError : public std::runtime_error
+{
+public:
+    RoutingError(CMPIrc code, const std::string& message) : std::runtime_error(message), code_(code) {}
+    CMPIrc code() const { return code_; }
+
+private:
+    CMPIrc code_;
+};
+
+/// Owns the providers. Safe to use from several threads at once.
+class Router
+{
+public:
+    Router(Core& core, Registration registration, std::vector<std::string> directories);
+
+    const Registration& registration() const { return registration_; }
+
+    /// Who serves the instances of a class in a namespace. \throws RoutingError
+    Provider& instanceProvider(const std::string& className, const std::string& nameSpace);
+    /// Who serves the traversals of an association class in a namespace. \throws RoutingError
+    Provider& associationProvider(const std::string& className, const std::string& nameSpace);
+    /// All who serve traversals in a namespace, each once. \throws RoutingError
+    std::vector<Provider*> associationProviders(const std::string& nameSpace);
+
+    /// Cleans up every provider; no request may come any more.
+    void cleanUp();
+
+private:
+    Provider& find(const std::string& className, const std::string& nameSpace, bool RegisteredClass::*serves,
+                   const char* type);
+    void requireNameSpace(const std::string& nameSpace) const;
+    Provider& providerOf(const RegisteredClass& entry);
+
+    Registration registration_;
+    ProviderSurroundings surroundings_;
+    /// By name and location.
+    std::map<std::pair<std::string, std::string>, std::unique_ptr<Provider>> providers_;
+};
+
+} // namespace cimhost
+
+#endif

@@ -1,0 +1,57 @@
+#include "broker/Scope.h"
+
+namespace cimhost {
+
+namespace {
+
+thread_local Scope* current = nullptr;
+
+} // namespace
+
+Scope::Scope(Core& core)
+    : core_(core),
+      outer_(current),
+      depth_(current == nullptr ? 0 : current->depth_ + 1),
+      store_(core)
+{
+    current = this;
+}
+
+Scope::~Scope()
+{
+    current = outer_;
+}
+
+Scope* Scope::outer() const
+{
+    return firstOf(core_, outer_);
+}
+
+Scope* Scope::innermost(const Core& core)
+{
+    return firstOf(core, current);
+}
+
+Scope* Scope::firstOf(const Core& core, Scope* scope)
+{
+    while (scope != nullptr && &scope->core_ != &core)
+        scope = scope->outer_;
+    return scope;
+}
+
+Core* Scope::currentCore()
+{
+    return current == nullptr ? nullptr : &current->core_;
+}
+
+OutsideScopes::OutsideScopes() : suspended_(current)
+{
+    current = nullptr;
+}
+
+OutsideScopes::~OutsideScopes()
+{
+    current = suspended_;
+}
+
+} // namespace cimhost
