@@ -1,16 +1,13 @@
 /// \file
-/// Answers in JSON, for programs.
+/// CIM objects in JSON, for programs.
 ///
-///     {
-///       "status": { "code": 0, "name": "CMPI_RC_OK", "message": null },
-///       "paths": [ PATH, ... ],
-///       "instances": [ { "path": PATH, "properties": { NAME: VALUE, ... } }, ... ]
-///     }
+/// A value is null, true or false, a number, a string or an array of these; a reference is a path, an
+/// embedded instance an instance, a char16 its number. Infinities and NaN, which JSON lacks, are strings.
 ///
-/// A PATH is an object with "text" (as the command line takes it), "host" and "namespace" (null where
-/// there is none), "className" and "keys" (NAME: VALUE). A VALUE is null, true or false, a number, a
-/// string or an array of these; a reference is a PATH, an embedded instance as under "instances", a
-/// char16 its number. Infinities and NaN, which JSON lacks, are strings.
+///     path:      { "text": as a command line takes it, "host": STRING or null,
+///                  "namespace": STRING or null, "className": STRING, "keys": { NAME: value, ... } }
+///     instance:  { "path": path, "properties": { NAME: value, ... } }
+///     status:    { "code": NUMBER, "name": STRING, "message": STRING or null }
 #ifndef CIMHOST_CIM_JSON_H
 #define CIMHOST_CIM_JSON_H
 
