@@ -1,0 +1,181 @@
+#include "Cmpi.h"
+
+namespace Tavro::ComputerSystem::Cmpi {
+namespace {
+
+/// Older CMPI headers declare objects and values without const.
+template <class Object>
+Object* unconst(const Object* object)
+{
+    return const_cast<Object*>(object);
+}
+
+/// A service that may be called.
+template <class Table, class Service>
+Service usable(const Table* table, Service Table::*service, const char* name)
+{
+    if (table == nullptr || table->*service == nullptr)
+        throw Failure(CMPI_RC_ERR_INVALID_HANDLE, std::string("There is no ") + name + " to call");
+    return table->*service;
+}
+
+/// Calls a service of an encapsulated object.
+template <class Object, class Table, class Service, class... Arguments>
+auto call(const Object* object, Service Table::*service, const char* name, Arguments... arguments)
+{
+    const Table* const table = object != nullptr && object->hdl != nullptr ? object->ft : nullptr;
+    return usable(table, service, name)(unconst(object), arguments...);
+}
+
+/// Calls a factory service of the broker.
+template <class Service, class... Arguments>
+auto call(const CMPIBroker* broker, Service CMPIBrokerEncFT::*service, const char* name,
+          Arguments... arguments)
+{
+    return usable(broker != nullptr ? broker->eft : nullptr, service, name)(broker, arguments...);
+}
+
+void require(const CMPIStatus& status, const char* service)
+{
+    if (status.rc != CMPI_RC_OK)
+        throw Failure(status.rc, std::string("The broker's ") + service + " failed");
+}
+
+/// What a service gave, unless it failed or gave no object.
+template <class Object>
+Object* require(Object* object, const CMPIStatus& status, const char* service)
+{
+    require(status, service);
+    if (object == nullptr || object->hdl == nullptr)
+        throw Failure(CMPI_RC_ERR_FAILED, std::string("The broker's ") + service + " gave nothing");
+    return object;
+}
+
+/// A text as the value of a CMPI_chars: the character pointer itself, in the place of the pointer to a
+/// value.
+CMPIValue* asValue(const std::string& text)
+{
+    return reinterpret_cast<CMPIValue*>(unconst(text.c_str()));
+}
+
+} // namespace
+
+std::string nameSpaceOf(const CMPIObjectPath* path)
+{
+    CMPIStatus status{CMPI_RC_OK, nullptr};
+    CMPIString* const string = call(path, &CMPIObjectPathFT::getNameSpace, "getNameSpace", &status);
+    require(string, status, "getNameSpace");
+    const char* const text = call(string, &CMPIStringFT::getCharPtr, "getCharPtr", &status);
+    require(status, "getCharPtr");
+    if (text == nullptr)
+        throw Failure(CMPI_RC_ERR_INVALID_NAMESPACE, "The path has no namespace");
+    return text;
+}
+
+CMPIObjectPath* newObjectPath(const CMPIBroker* broker, const std::string& nameSpace, const char* className)
+{
+    constexpr const char* service = "newObjectPath";
+    CMPIStatus status{CMPI_RC_OK, nullptr};
+    CMPIObjectPath* const path =
+        call(broker, &CMPIBrokerEncFT::newObjectPath, service, nameSpace.c_str(), className, &status);
+    return require(path, status, service);
+}
+
+CMPIInstance* newInstance(const CMPIBroker* broker, const CMPIObjectPath* path)
+{
+    constexpr const char* service = "newInstance";
+    CMPIStatus status{CMPI_RC_OK, nullptr};
+    CMPIInstance* const instance =
+        call(broker, &CMPIBrokerEncFT::newInstance, service, unconst(path), &status);
+    return require(instance, status, service);
+}
+
+CMPIArray* newArray(const CMPIBroker* broker, std::initializer_list<CMPIUint16> elements)
+{
+    constexpr const char* service = "newArray";
+    CMPIStatus status{CMPI_RC_OK, nullptr};
+    CMPIArray* const array =
+        require(call(broker, &CMPIBrokerEncFT::newArray, service, static_cast<CMPICount>(elements.size()),
+                     CMPIType{CMPI_uint16}, &status),
+                status, service);
+    CMPICount index = 0;
+    for (const CMPIUint16 element : elements) {
+        CMPIValue value{};
+        value.uint16 = element;
+        require(call(array, &CMPIArrayFT::setElementAt, "setElementAt", index, &value, CMPIType{CMPI_uint16}),
+                "setElementAt");
+        ++index;
+    }
+    return array;
+}
+
+void setHostname(const CMPIObjectPath* path, const std::string& host)
+{
+    require(call(path, &CMPIObjectPathFT::setHostname, "setHostname", host.c_str()), "setHostname");
+}
+
+void addKey(const CMPIObjectPath* path, const char* name, const std::string& value)
+{
+    require(call(path, &CMPIObjectPathFT::addKey, "addKey", name, asValue(value), CMPIType{CMPI_chars}),
+            "addKey");
+}
+
+void setPropertyFilter(const CMPIInstance* instance, const char** properties, const char** keys)
+{
+    require(call(instance, &CMPIInstanceFT::setPropertyFilter, "setPropertyFilter", properties, keys),
+            "setPropertyFilter");
+}
+
+namespace {
+
+void set(const CMPIInstance* instance, const char* name, CMPIValue* value, CMPIType type)
+{
+    require(call(instance, &CMPIInstanceFT::setProperty, "setProperty", name, value, type), "setProperty");
+}
+
+} // namespace
+
+void setProperty(const CMPIInstance* instance, const char* name, const std::string& value)
+{
+    set(instance, name, asValue(value), CMPI_chars);
+}
+
+void setProperty(const CMPIInstance* instance, const char* name, CMPIUint16 value)
+{
+    CMPIValue number{};
+    number.uint16 = value;
+    set(instance, name, &number, CMPI_uint16);
+}
+
+void setProperty(const CMPIInstance* instance, const char* name, CMPIArray* array)
+{
+    CMPIValue value{};
+    value.array = array;
+    set(instance, name, &value, CMPI_uint16A);
+}
+
+void returnInstance(const CMPIResult* result, const CMPIInstance* instance)
+{
+    require(call(result, &CMPIResultFT::returnInstance, "returnInstance", unconst(instance)),
+            "returnInstance");
+}
+
+void returnObjectPath(const CMPIResult* result, const CMPIObjectPath* path)
+{
+    require(call(result, &CMPIResultFT::returnObjectPath, "returnObjectPath", unconst(path)),
+            "returnObjectPath");
+}
+
+void returnDone(const CMPIResult* result)
+{
+    require(call(result, &CMPIResultFT::returnDone, "returnDone"), "returnDone");
+}
+
+CMPIStatus failed(const CMPIBroker* broker, CMPIrc code, const char* message) noexcept
+{
+    const bool makesStrings =
+        broker != nullptr && broker->eft != nullptr && broker->eft->newString != nullptr;
+    return {code, makesStrings ? broker->eft->newString(broker, message, nullptr) : nullptr};
+}
+
+} // namespace Tavro::ComputerSystem::Cmpi
