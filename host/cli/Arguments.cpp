@@ -1,0 +1,273 @@
+#include "cli/Arguments.h"
+
+#include "cim/ObjectPathText.h"
+#include "cim/Utf8.h"
+
+#include <algorithm>
+#include <array>
+#include <functional>
+#include <map>
+#include <sstream>
+#include <string_view>
+#include <utility>
+
+#include <CLI/CLI.hpp>
+
+namespace cimhost::cli {
+
+namespace {
+
+constexpr const char* footer = R"(Object paths are written as the commands print them:
+  root/cimv2:CLASS.Key="value",Key2=42,Flag=TRUE
+Quote them for the shell: 'CLASS.Key="value"'. Without a namespace, that of --namespace is meant.
+
+Examples:
+  cimhost ein CLASS                        the names of all instances
+  cimhost ei CLASS Name HealthState        two properties of all instances
+  cimhost gi 'CLASS.Key="value"'           one instance
+  cimhost ai -ac ASSOC 'CLASS.Key="value"' what an association ties to it
+  cimhost graph | dot -Tsvg > graph.svg    the whole picture
+
+Environment:
+  CIMHOST_PROVIDER_DIR   directories of provider libraries, separated by colons
+  CIMHOST_REGISTRATION   registration files, separated by colons
+
+Exit status: 0 answered; 1 answered with an error status, or the answer could not be written;
+2 wrong usage.)";
+
+/// How the field's clients spell the options of a traversal. No such name of several letters after
+/// one dash can be declared: it would be read as several options of one letter.
+constexpr std::array<std::pair<const char*, const char*>, 4> fieldSpellings{{
+    {"-ac", "--assoc-class"},
+    {"-arc", "--result-class"},
+    {"-ar", "--role"},
+    {"-arr", "--result-role"},
+}};
+
+void translateFieldSpellings(std::vector<std::string>& arguments)
+{
+    const auto end = std::find(arguments.begin(), arguments.end(), "--");
+    for (const auto& [spelling, option] : fieldSpellings)
+        std::replace(arguments.begin(), end, std::string(spelling), std::string(option));
+}
+
+/// What the options and positionals write into.
+struct Arguments
+{
+    std::string target;
+    std::string nameSpace = "root/cimv2";
+    std::vector<std::string> properties;
+    std::string format;
+    std::string inventory;
+    Invocation invocation;
+};
+
+/// What an operation takes besides the common options.
+enum class Target
+{
+    none,
+    classPath,
+    objectPath,
+};
+enum class Filters
+{
+    none,
+    associators, ///< association class, result class and both roles
+    references,  ///< the association class, which is the operation's result class, and one role
+};
+
+struct CommandEntry
+{
+    Operation operation;
+    const char* name;
+    const char* alias;
+    const char* description;
+    Target target;
+    Filters filters;
+};
+
+constexpr std::array commandEntries{
+    CommandEntry{Operation::enumerateInstanceNames, "ein", "enumerate-instance-names",
+                 "Enumerate the names of a class's instances", Target::classPath, Filters::none},
+    CommandEntry{Operation::enumerateInstances, "ei", "enumerate-instances", "Enumerate a class's instances",
+                 Target::classPath, Filters::none},
+    CommandEntry{Operation::getInstance, "gi", "get-instance", "Get one instance", Target::objectPath,
+                 Filters::none},
+    CommandEntry{Operation::associatorNames, "ain", "associator-names",
+                 "Names of the objects that associations tie to an object", Target::objectPath,
+                 Filters::associators},
+    CommandEntry{Operation::associators, "ai", "associators",
+                 "The objects that associations tie to an object", Target::objectPath, Filters::associators},
+    CommandEntry{Operation::referenceNames, "rin", "reference-names",
+                 "Names of the association instances that refer to an object", Target::objectPath,
+                 Filters::references},
+    CommandEntry{Operation::references, "ri", "references",
+                 "The association instances that refer to an object", Target::objectPath,
+                 Filters::references},
+    CommandEntry{Operation::graph, "graph", "", "Write a namespace's instances as a Graphviz graph",
+                 Target::none, Filters::none},
+};
+
+const std::map<std::string, Format>& formats()
+{
+    static const std::map<std::string, Format> names{
+        {"text", Format::text}, {"table", Format::table}, {"mof", Format::mof}, {"json", Format::json}};
+    return names;
+}
+
+/// The text in a line of its own with a mark under the place of the error.
+std::string markPlace(const std::string& text, const cim::ParseError& error)
+{
+    const std::string before = cim::printable(std::string_view(text).substr(0, error.offset()));
+    return "\n  " + cim::printable(text) + "\n  " + std::string(cim::displayWidth(before), ' ') + '^';
+}
+
+cim::ObjectPath readTarget(const std::string& text, const std::string& nameSpace)
+{
+    try {
+        cim::ObjectPath path = cim::parseObjectPath(text);
+        if (path.nameSpace.empty())
+            path.nameSpace = nameSpace;
+        return path;
+    } catch (const cim::ParseError& error) {
+        throw UsageError(std::string(error.what()) + markPlace(text, error));
+    }
+}
+
+void addCommonOptions(CLI::App& app, Arguments& arguments)
+{
+    Settings& settings = arguments.invocation.settings;
+    app.add_option("-n,--namespace", arguments.nameSpace, "Namespace of paths without one")
+        ->type_name("NAMESPACE")
+        ->capture_default_str();
+    app.add_option("--provider-dir", settings.providerDirectories,
+                   "Directory of provider libraries; repeatable")
+        ->type_name("DIR")
+        ->allow_extra_args(false);
+    app.add_option("--registration", settings.registrationFiles, "Registration of providers; repeatable")
+        ->type_name("FILE")
+        ->allow_extra_args(false);
+    app.add_option("--inventory", arguments.inventory,
+                   "Hardware inventory for the providers, TAVRO_INVENTORY")
+        ->type_name("FILE");
+    app.add_flag("--trace", settings.trace, "Show what providers trace and log, on standard error");
+    app.add_option("-f,--format", arguments.format,
+                   "How answers are shown; without it as text, and instances on a terminal as a table")
+        ->type_name("FORMAT")
+        ->check(CLI::IsMember(formats()));
+}
+
+void addFilters(CLI::App& command, Filters filters, Traversal& traversal)
+{
+    if (filters == Filters::none)
+        return;
+    const bool references = filters == Filters::references;
+    command.add_option("--role", traversal.role, "The object's role in the association, -ar")
+        ->type_name("ROLE");
+    command
+        .add_option(references ? "--result-class,--assoc-class" : "--result-class", traversal.resultClass,
+                    references ? "Class of the association, -arc or -ac" : "Class of the objects found, -arc")
+        ->type_name("CLASS");
+    if (references)
+        return;
+    command.add_option("--assoc-class", traversal.assocClass, "Class of the association, -ac")
+        ->type_name("CLASS");
+    command.add_option("--result-role", traversal.resultRole, "Role of the objects found, -arr")
+        ->type_name("ROLE");
+}
+
+void addCommand(CLI::App& app, const CommandEntry& entry, Arguments& arguments)
+{
+    Command& result = arguments.invocation.command;
+    CLI::App* command = app.add_subcommand(entry.name, entry.description);
+    if (*entry.alias != '\0')
+        command->alias(entry.alias);
+    command->fallthrough();
+    command->group("Commands");
+    command->footer("More options, for all commands: cimhost --help");
+    command->callback([&entry, &result] { result.operation = entry.operation; });
+    if (entry.target != Target::none) {
+        const bool isClass = entry.target == Target::classPath;
+        command
+            ->add_option(isClass ? "CLASS" : "PATH", arguments.target,
+                         isClass ? "The class, such as root/cimv2:CLASS" : "The object's path")
+            ->type_name("")
+            ->required();
+        if (!answersPaths(entry.operation))
+            command->add_option("PROPERTY", arguments.properties, "Properties wanted; without any, all")
+                ->type_name("");
+    }
+    addFilters(*command, entry.filters, result.traversal);
+}
+
+/// What the parser alone cannot judge.
+void finish(Arguments& arguments)
+{
+    Command& command = arguments.invocation.command;
+    const auto* entry =
+        std::find_if(commandEntries.begin(), commandEntries.end(),
+                     [&](const CommandEntry& candidate) { return candidate.operation == command.operation; });
+    if (!arguments.format.empty())
+        command.format = formats().at(arguments.format);
+    if (!arguments.inventory.empty())
+        arguments.invocation.settings.inventory = arguments.inventory;
+    if (!arguments.properties.empty())
+        command.properties = arguments.properties;
+
+    if (entry->target == Target::none) {
+        if (command.format)
+            throw UsageError("--format has no meaning for graph, which writes DOT");
+        command.target.nameSpace = arguments.nameSpace;
+        return;
+    }
+    command.target = readTarget(arguments.target, arguments.nameSpace);
+    if (entry->target == Target::classPath && !command.target.keys.empty())
+        throw UsageError(std::string(entry->name) + " takes a class; gi gets the one instance of a path");
+}
+
+/// What is wrong, in one line.
+std::string describe(const CLI::App& app, const CLI::ParseError& error)
+{
+    if (!app.get_subcommands().empty())
+        return error.what();
+    const std::vector<std::string> unknown = app.remaining();
+    return unknown.empty() ? "a command is required"
+                           : "there is no command " + cim::printable(unknown.front());
+}
+
+/// The help or version that was asked for, or the error.
+Notice noticeOf(const CLI::App& app, const CLI::ParseError& error)
+{
+    std::ostringstream out;
+    std::ostringstream err;
+    if (app.exit(error, out, err) != 0)
+        throw UsageError(describe(app, error) + "\nTry: cimhost --help");
+    return {out.str()};
+}
+
+} // namespace
+
+std::variant<Invocation, Notice> parseArguments(std::vector<std::string> arguments)
+{
+    Arguments result;
+    CLI::App app("Asks CIM providers, loaded into this process, what a CIM client asks.", "cimhost");
+    app.footer(footer);
+    app.set_version_flag("--version", "cimhost " CIMHOST_VERSION);
+    app.get_formatter()->label("SUBCOMMAND", "COMMAND");
+    app.require_subcommand(1);
+    addCommonOptions(app, result);
+    for (const CommandEntry& entry : commandEntries)
+        addCommand(app, entry, result);
+
+    translateFieldSpellings(arguments);
+    std::reverse(arguments.begin(), arguments.end()); // the parser takes them off the back
+    try {
+        app.parse(std::move(arguments));
+    } catch (const CLI::ParseError& error) {
+        return noticeOf(app, error);
+    }
+    finish(result);
+    return result.invocation;
+}
+
+} // namespace cimhost::cli

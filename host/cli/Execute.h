@@ -1,0 +1,22 @@
+/// \file
+/// Carries a command out: asks the broker and shows the answer.
+#ifndef CIMHOST_CLI_EXECUTE_H
+#define CIMHOST_CLI_EXECUTE_H
+
+#include "broker/Broker.h"
+#include "cli/Command.h"
+
+#include <iosfwd>
+
+namespace cimhost::cli {
+
+/// \param isTerminal  whether a person looks at `out`
+/// \return exitAnswered, or exitError after an answer with an error status, which goes to `err`;
+/// what such an answer brought is not shown, as brokers do not send it. GetInstance that brings no
+/// instance without an error is CMPI_RC_ERR_NOT_FOUND, as brokers have it.
+ExitStatus execute(const Command& command, Broker& broker, bool isTerminal, std::ostream& out,
+                   std::ostream& err);
+
+} // namespace cimhost::cli
+
+#endif

@@ -1,0 +1,122 @@
+#include "cli/Installation.h"
+
+#include "cim/Values.h"
+#include "cli/Arguments.h"
+
+#include <algorithm>
+#include <array>
+#include <cerrno>
+#include <cstdlib>
+#include <fstream>
+#include <sstream>
+#include <system_error>
+
+namespace cimhost::cli {
+
+namespace {
+
+namespace fs = std::filesystem;
+
+std::optional<std::string> environmentVariable(const char* name)
+{
+    const char* value = std::getenv(name);
+    return value != nullptr && *value != '\0' ? std::optional<std::string>(value) : std::nullopt;
+}
+
+std::vector<std::string> splitAtColons(const std::string& list)
+{
+    std::vector<std::string> parts;
+    std::istringstream stream(list);
+    for (std::string part; std::getline(stream, part, ':');)
+        if (!part.empty())
+            parts.push_back(part);
+    return parts;
+}
+
+bool isDirectory(const fs::path& path)
+{
+    std::error_code ignored;
+    return fs::is_directory(path, ignored);
+}
+
+std::vector<std::string> registrationFilesIn(const fs::path& directory)
+{
+    std::vector<std::string> files;
+    std::error_code error;
+    for (fs::directory_iterator entry(directory, error), end; !error && entry != end; entry.increment(error))
+        if (entry->path().extension() == ".reg")
+            files.push_back(entry->path().string());
+    std::sort(files.begin(), files.end());
+    return files;
+}
+
+void append(const Registration& added, const std::string& file, Registration& all)
+{
+    for (const RegisteredClass& entry : added.classes) {
+        const bool repeated =
+            std::any_of(all.classes.begin(), all.classes.end(), [&](const RegisteredClass& other) {
+                return cim::sameName(other.className, entry.className) && other.provider == entry.provider;
+            });
+        if (repeated)
+            throw RegistrationError(file + ": [" + entry.className + "] is registered with the provider " +
+                                    entry.provider + " in another file already");
+    }
+    all.classes.insert(all.classes.end(), added.classes.begin(), added.classes.end());
+}
+
+} // namespace
+
+Surroundings readSurroundings()
+{
+    std::error_code ignored;
+    return {fs::read_symlink("/proc/self/exe", ignored).parent_path(),
+            environmentVariable("CIMHOST_PROVIDER_DIR"), environmentVariable("CIMHOST_REGISTRATION")};
+}
+
+std::vector<std::string> findProviderDirectories(const Settings& settings, const Surroundings& surroundings)
+{
+    if (!settings.providerDirectories.empty())
+        return settings.providerDirectories;
+    if (surroundings.providerDirs)
+        return splitAtColons(*surroundings.providerDirs);
+    for (const char* directory : {CIMHOST_PROVIDERDIR_FROM_BIN, "../lib"}) {
+        const fs::path path = (surroundings.programDirectory / directory).lexically_normal();
+        if (isDirectory(path))
+            return {path.string()};
+    }
+    return {};
+}
+
+std::vector<std::string> findRegistrationFiles(const Settings& settings, const Surroundings& surroundings)
+{
+    if (!settings.registrationFiles.empty())
+        return settings.registrationFiles;
+    if (surroundings.registrationFiles)
+        return splitAtColons(*surroundings.registrationFiles);
+    const fs::path directory = (surroundings.programDirectory / CIMHOST_DATADIR_FROM_BIN).lexically_normal();
+    std::vector<std::string> files = registrationFilesIn(directory);
+    if (files.empty())
+        throw UsageError("no registration of providers: " + directory.string() +
+                         " has no .reg file; name one with --registration or CIMHOST_REGISTRATION");
+    return files;
+}
+
+Registration readRegistrations(const std::vector<std::string>& files)
+{
+    Registration all;
+    for (const std::string& file : files)
+        append(readRegistrationFile(file), file, all);
+    return all;
+}
+
+void useInventory(const std::string& file)
+{
+    errno = 0;
+    std::ifstream stream(file);
+    stream.peek(); // a directory opens as a file does; only reading it fails
+    if (errno != 0)
+        throw UsageError("cannot read the inventory " + file + ": " + std::generic_category().message(errno));
+    setenv("TAVRO_INVENTORY", file.c_str(), 1);
+}
+
+} // namespace cimhost::cli

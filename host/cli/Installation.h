@@ -1,0 +1,47 @@
+/// \file
+/// Where the providers and their registrations are.
+#ifndef CIMHOST_CLI_INSTALLATION_H
+#define CIMHOST_CLI_INSTALLATION_H
+
+#include "broker/Registration.h"
+#include "cli/Command.h"
+
+#include <filesystem>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace cimhost::cli {
+
+/// What the program finds itself in.
+struct Surroundings
+{
+    std::filesystem::path programDirectory;       ///< the folder of the executable
+    std::optional<std::string> providerDirs;      ///< CIMHOST_PROVIDER_DIR
+    std::optional<std::string> registrationFiles; ///< CIMHOST_REGISTRATION
+};
+
+/// Those of this process.
+Surroundings readSurroundings();
+
+/// The directories of the command line; without any, those of the environment; without these, the
+/// provider directory of the installed tree that the executable stands in, or else the library
+/// directory of the build tree. None, if there is none of these.
+std::vector<std::string> findProviderDirectories(const Settings& settings, const Surroundings& surroundings);
+
+/// The files of the command line; without any, those of the environment; without these, every .reg
+/// file, by name, in the data directory of the tree that the executable stands in, installed or built.
+/// \throws UsageError  there is none
+std::vector<std::string> findRegistrationFiles(const Settings& settings, const Surroundings& surroundings);
+
+/// The classes of all files.
+/// \throws RegistrationError  also for a class that two files register with the same provider
+Registration readRegistrations(const std::vector<std::string>& files);
+
+/// Sets TAVRO_INVENTORY for the providers that will be loaded.
+/// \throws UsageError  the file cannot be read
+void useInventory(const std::string& file);
+
+} // namespace cimhost::cli
+
+#endif

@@ -1,0 +1,23 @@
+/// \file
+/// The program without the process around it.
+#ifndef CIMHOST_CLI_PROGRAM_H
+#define CIMHOST_CLI_PROGRAM_H
+
+#include "cli/Command.h"
+#include "cli/Installation.h"
+
+#include <iosfwd>
+#include <string>
+#include <vector>
+
+namespace cimhost::cli {
+
+/// Does what the command line asks for and never throws: errors are lines on `err`.
+/// \param arguments   without the program's name
+/// \param isTerminal  whether a person looks at `out`
+ExitStatus run(const std::vector<std::string>& arguments, const Surroundings& surroundings, bool isTerminal,
+               std::ostream& out, std::ostream& err);
+
+} // namespace cimhost::cli
+
+#endif

@@ -1,0 +1,41 @@
+// cimhost: asks CIM providers, loaded into this process, what a CIM client asks.
+
+#include "cli/Program.h"
+
+#include <cerrno>
+#include <csignal>
+#include <cstdio>
+#include <iostream>
+#include <sstream>
+#include <string>
+#include <system_error>
+#include <vector>
+
+#include <unistd.h>
+
+namespace {
+
+/// Everything at once, so that a reason for not writing is known and tells of the whole output.
+bool writeToStandardOutput(const std::string& text)
+{
+    return std::fwrite(text.data(), 1, text.size(), stdout) == text.size() && std::fflush(stdout) == 0;
+}
+
+} // namespace
+
+int main(int argc, char* argv[])
+{
+    using namespace cimhost::cli;
+
+    // Writing to a pipe that nobody reads is an error like any other.
+    std::signal(SIGPIPE, SIG_IGN);
+
+    std::ostringstream out;
+    const ExitStatus status = run(std::vector<std::string>(argv + (argc > 0 ? 1 : 0), argv + argc),
+                                  readSurroundings(), isatty(STDOUT_FILENO) != 0, out, std::cerr);
+    if (writeToStandardOutput(out.str()))
+        return status;
+    std::cerr << "cimhost: cannot write to standard output: " << std::generic_category().message(errno)
+              << '\n';
+    return exitError;
+}

@@ -1,0 +1,278 @@
+#include "cli/Arguments.h"
+
+#include "cim/Values.h"
+
+#include <optional>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+using namespace cimhost;
+using namespace cimhost::cli;
+using testing::ElementsAre;
+using testing::HasSubstr;
+
+namespace {
+
+Invocation parse(std::vector<std::string> arguments)
+{
+    return std::get<Invocation>(parseArguments(std::move(arguments)));
+}
+
+Command commandOf(std::vector<std::string> arguments)
+{
+    return parse(std::move(arguments)).command;
+}
+
+std::string noticeOf(std::vector<std::string> arguments)
+{
+    return std::get<Notice>(parseArguments(std::move(arguments))).text;
+}
+
+/// The message of the usage error; empty: there was none.
+std::string errorOf(std::vector<std::string> arguments)
+{
+    try {
+        parseArguments(std::move(arguments));
+        return "";
+    } catch (const UsageError& error) {
+        return error.what();
+    }
+}
+
+struct CommandName
+{
+    const char* name;
+    const char* target;
+    Operation operation;
+};
+
+class CommandNames : public testing::TestWithParam<CommandName>
+{};
+
+TEST_P(CommandNames, chooseTheOperation)
+{
+    EXPECT_EQ(commandOf({GetParam().name, GetParam().target}).operation, GetParam().operation);
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Arguments, CommandNames,
+    testing::Values(CommandName{"ein", "C", Operation::enumerateInstanceNames},
+                    CommandName{"enumerate-instance-names", "C", Operation::enumerateInstanceNames},
+                    CommandName{"ei", "C", Operation::enumerateInstances},
+                    CommandName{"enumerate-instances", "C", Operation::enumerateInstances},
+                    CommandName{"gi", "C.K=1", Operation::getInstance},
+                    CommandName{"get-instance", "C.K=1", Operation::getInstance},
+                    CommandName{"ai", "C.K=1", Operation::associators},
+                    CommandName{"associators", "C.K=1", Operation::associators},
+                    CommandName{"ain", "C.K=1", Operation::associatorNames},
+                    CommandName{"associator-names", "C.K=1", Operation::associatorNames},
+                    CommandName{"ri", "C.K=1", Operation::references},
+                    CommandName{"references", "C.K=1", Operation::references},
+                    CommandName{"rin", "C.K=1", Operation::referenceNames},
+                    CommandName{"reference-names", "C.K=1", Operation::referenceNames}));
+
+TEST(Arguments, graphTakesNoTarget)
+{
+    const Command command = commandOf({"graph"});
+    EXPECT_EQ(command.operation, Operation::graph);
+    EXPECT_EQ(command.target.nameSpace, "root/cimv2");
+    EXPECT_EQ(commandOf({"graph", "--namespace", "root/x"}).target.nameSpace, "root/x");
+    EXPECT_NE(errorOf({"graph", "C"}), "");
+}
+
+TEST(Arguments, theTargetHasANamespaceOfItsOwnOrTheCommonOne)
+{
+    EXPECT_EQ(commandOf({"ein", "C"}).target, (cim::ObjectPath{"", "root/cimv2", "C", {}}));
+    EXPECT_EQ(commandOf({"ein", "C", "--namespace", "root/x"}).target,
+              (cim::ObjectPath{"", "root/x", "C", {}}));
+    EXPECT_EQ(commandOf({"-n", "root/x", "ein", "C"}).target, (cim::ObjectPath{"", "root/x", "C", {}}));
+    EXPECT_EQ(commandOf({"ein", "a/b:C", "--namespace", "root/x"}).target,
+              (cim::ObjectPath{"", "a/b", "C", {}}));
+    EXPECT_EQ(commandOf({"gi", "//srv/a/b:C.K=\"x\""}).target,
+              (cim::ObjectPath{"srv", "a/b", "C", {{"K", cim::textValue("x")}}}));
+}
+
+TEST(Arguments, anObjectMayLackKeysAClassMayNotHaveThem)
+{
+    EXPECT_EQ(commandOf({"gi", "C"}).target.className, "C");
+    EXPECT_EQ(errorOf({"ei", "C.K=1"}), "ei takes a class; gi gets the one instance of a path");
+    EXPECT_EQ(errorOf({"ein", "C.K=1"}), "ein takes a class; gi gets the one instance of a path");
+}
+
+TEST(Arguments, marksTheWrongPlaceOfAPath)
+{
+    EXPECT_EQ(errorOf({"gi", "C.K=\"a"}), "column 7: found the end, expected the closing quote\n"
+                                          "  C.K=\"a\n"
+                                          "        ^");
+    // The mark stands by what a terminal shows: a wide character takes two columns, an escape six.
+    EXPECT_EQ(errorOf({"gi", "C.K=\"\u98a8\x1b\"!"}),
+              "column 9: found \"!\", expected \",\" and a key, or the end\n"
+              "  C.K=\"\u98a8\\x001B\"!\n"
+              "                ^");
+    EXPECT_EQ(errorOf({"ein", ""}), "column 1: found the end, expected a namespace or a class name\n"
+                                    "  \n"
+                                    "  ^");
+}
+
+TEST(Arguments, propertiesFollowTheTarget)
+{
+    EXPECT_EQ(commandOf({"ei", "C"}).properties, std::nullopt);
+    EXPECT_THAT(commandOf({"ei", "C", "A", "B"}).properties.value(), ElementsAre("A", "B"));
+    EXPECT_THAT(commandOf({"gi", "C.K=1", "A", "--trace"}).properties.value(), ElementsAre("A"));
+    EXPECT_THAT(commandOf({"ai", "C.K=1", "A"}).properties.value(), ElementsAre("A"));
+    EXPECT_THAT(commandOf({"ri", "C.K=1", "A"}).properties.value(), ElementsAre("A"));
+}
+
+TEST(Arguments, aPropertyMayBeNamedLikeACommand)
+{
+    EXPECT_THAT(commandOf({"ei", "C", "references", "gi"}).properties.value(),
+                ElementsAre("references", "gi"));
+}
+
+TEST(Arguments, namesHaveNoProperties)
+{
+    for (const char* command : {"ein", "ain", "rin"})
+        EXPECT_THAT(errorOf({command, "C", "A"}), HasSubstr("A")) << command;
+}
+
+TEST(Arguments, traversalsTakeClassesAndRoles)
+{
+    for (const char* command : {"ai", "ain"}) {
+        const Traversal traversal = commandOf({command, "C.K=1", "--assoc-class", "A", "--result-class", "R",
+                                               "--role", "From", "--result-role", "To"})
+                                        .traversal;
+        EXPECT_EQ(traversal.assocClass, "A");
+        EXPECT_EQ(traversal.resultClass, "R");
+        EXPECT_EQ(traversal.role, "From");
+        EXPECT_EQ(traversal.resultRole, "To");
+    }
+}
+
+TEST(Arguments, traversalsTakeTheFieldsSpellingsToo)
+{
+    const Traversal traversal =
+        commandOf({"ain", "-ac", "A", "-arc", "R", "-ar", "From", "-arr", "To", "C.K=1"}).traversal;
+    EXPECT_EQ(traversal.assocClass, "A");
+    EXPECT_EQ(traversal.resultClass, "R");
+    EXPECT_EQ(traversal.role, "From");
+    EXPECT_EQ(traversal.resultRole, "To");
+}
+
+TEST(Arguments, theAssociationOfReferencesIsTheirResultClass)
+{
+    for (const char* command : {"ri", "rin"})
+        for (const char* option : {"--result-class", "--assoc-class", "-arc", "-ac"}) {
+            const Traversal traversal = commandOf({command, option, "A", "-ar", "From", "C.K=1"}).traversal;
+            EXPECT_EQ(traversal.resultClass, "A") << command << option;
+            EXPECT_EQ(traversal.assocClass, std::nullopt) << command << option;
+            EXPECT_EQ(traversal.role, "From") << command << option;
+        }
+    EXPECT_NE(errorOf({"ri", "C.K=1", "-arr", "To"}), "");
+}
+
+TEST(Arguments, whatIsNotGivenIsNull)
+{
+    const Traversal traversal = commandOf({"ai", "C.K=1"}).traversal;
+    EXPECT_EQ(traversal.assocClass, std::nullopt);
+    EXPECT_EQ(traversal.resultClass, std::nullopt);
+    EXPECT_EQ(traversal.role, std::nullopt);
+    EXPECT_EQ(traversal.resultRole, std::nullopt);
+}
+
+TEST(Arguments, onlyTraversalsTakeFilters)
+{
+    EXPECT_NE(errorOf({"ei", "C", "-ac", "A"}), "");
+    EXPECT_NE(errorOf({"gi", "C", "--role", "A"}), "");
+    EXPECT_NE(errorOf({"graph", "--role", "A"}), "");
+}
+
+TEST(Arguments, formatsHaveNames)
+{
+    EXPECT_EQ(commandOf({"ei", "C"}).format, std::nullopt);
+    EXPECT_EQ(commandOf({"ei", "C", "--format", "text"}).format, Format::text);
+    EXPECT_EQ(commandOf({"ei", "C", "--format", "table"}).format, Format::table);
+    EXPECT_EQ(commandOf({"--format", "mof", "ei", "C"}).format, Format::mof);
+    EXPECT_EQ(commandOf({"ei", "-f", "json", "C"}).format, Format::json);
+    EXPECT_THAT(errorOf({"ei", "C", "--format", "xml"}), HasSubstr("xml not in {json,mof,table,text}"));
+    EXPECT_THAT(errorOf({"graph", "--format", "json"}), HasSubstr("--format"));
+}
+
+TEST(Arguments, setTheBrokerUp)
+{
+    const Settings defaults = parse({"ei", "C"}).settings;
+    EXPECT_TRUE(defaults.providerDirectories.empty());
+    EXPECT_TRUE(defaults.registrationFiles.empty());
+    EXPECT_EQ(defaults.inventory, std::nullopt);
+    EXPECT_FALSE(defaults.trace);
+
+    const Settings settings =
+        parse({"--provider-dir", "/a", "ei", "C", "P", "--provider-dir", "/b", "--registration", "r1",
+               "--registration", "r2", "--inventory", "i.json", "--trace"})
+            .settings;
+    EXPECT_THAT(settings.providerDirectories, ElementsAre("/a", "/b"));
+    EXPECT_THAT(settings.registrationFiles, ElementsAre("r1", "r2"));
+    EXPECT_EQ(settings.inventory, "i.json");
+    EXPECT_TRUE(settings.trace);
+}
+
+TEST(Arguments, repeatableOptionsTakeOneValueEach)
+{
+    const Invocation invocation = parse({"--provider-dir", "/a", "ei", "C"});
+    EXPECT_THAT(invocation.settings.providerDirectories, ElementsAre("/a"));
+    EXPECT_EQ(invocation.command.target.className, "C");
+}
+
+TEST(Arguments, refuseWhatIsMissingOrUnknown)
+{
+    EXPECT_EQ(errorOf({}), "a command is required\nTry: cimhost --help");
+    EXPECT_EQ(errorOf({"--trace"}), "a command is required\nTry: cimhost --help");
+    EXPECT_EQ(errorOf({"frobnicate", "C"}), "there is no command frobnicate\nTry: cimhost --help");
+    EXPECT_EQ(errorOf({"e\x1b"}), "there is no command e\\x001B\nTry: cimhost --help");
+    EXPECT_THAT(errorOf({"ei"}), HasSubstr("CLASS is required"));
+    EXPECT_THAT(errorOf({"gi"}), HasSubstr("PATH is required"));
+    EXPECT_THAT(errorOf({"ei", "C", "--frobnicate"}), HasSubstr("--frobnicate"));
+    EXPECT_THAT(errorOf({"ei", "C", "--namespace"}), HasSubstr("--namespace"));
+    EXPECT_THAT(errorOf({"ei"}), HasSubstr("\nTry: cimhost --help"));
+}
+
+TEST(Arguments, helpIsForAllOrForOneCommand)
+{
+    EXPECT_THAT(noticeOf({"--help"}), HasSubstr("Exit status"));
+    EXPECT_THAT(noticeOf({"--help"}), HasSubstr("--provider-dir DIR"));
+    for (const char* command : {"ein", "ei", "gi", "ain", "ai", "rin", "ri", "graph"})
+        EXPECT_THAT(noticeOf({"--help"}), HasSubstr(std::string("\n  ") + command)) << command;
+    EXPECT_THAT(noticeOf({"ei", "--help"}), HasSubstr("PROPERTY"));
+    EXPECT_THAT(noticeOf({"ai", "--help"}), HasSubstr("--result-role ROLE"));
+}
+
+TEST(Arguments, versionIsTheProjects)
+{
+    EXPECT_EQ(noticeOf({"--version"}), "cimhost " CIMHOST_VERSION "\n");
+}
+
+TEST(Formats, suitTheOutput)
+{
+    Command command;
+    command.operation = Operation::enumerateInstances;
+    EXPECT_EQ(formatOf(command, true), Format::table);
+    EXPECT_EQ(formatOf(command, false), Format::text);
+    command.format = Format::json;
+    EXPECT_EQ(formatOf(command, true), Format::json);
+}
+
+TEST(Formats, keepNamesReadyToBeCopied)
+{
+    for (const Operation operation :
+         {Operation::enumerateInstanceNames, Operation::associatorNames, Operation::referenceNames}) {
+        Command command;
+        command.operation = operation;
+        EXPECT_EQ(formatOf(command, true), Format::text);
+        EXPECT_EQ(formatOf(command, false), Format::text);
+    }
+}
+
+} // namespace

@@ -1,0 +1,157 @@
+#include "cli/Installation.h"
+
+#include "cli/Arguments.h"
+#include "cli/tests/TemporaryDirectory.h"
+
+#include <cstdlib>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+using namespace cimhost;
+using namespace cimhost::cli;
+using testing::ElementsAre;
+using testing::HasSubstr;
+using testing::IsEmpty;
+
+namespace {
+
+/// A tree with a program in its folder bin.
+class Installation : public testing::Test
+{
+protected:
+    Surroundings surroundings() const { return {tree.folder("bin"), std::nullopt, std::nullopt}; }
+
+    TemporaryDirectory tree;
+    Settings settings;
+};
+
+TEST_F(Installation, theCommandLinesDirectoriesComeFirst)
+{
+    settings.providerDirectories = {"/a", "/b"};
+    Surroundings around = surroundings();
+    around.providerDirs = "/c";
+    EXPECT_THAT(findProviderDirectories(settings, around), ElementsAre("/a", "/b"));
+}
+
+TEST_F(Installation, theEnvironmentListsDirectories)
+{
+    Surroundings around = surroundings();
+    around.providerDirs = "/c::/d:";
+    EXPECT_THAT(findProviderDirectories(settings, around), ElementsAre("/c", "/d"));
+}
+
+TEST_F(Installation, providersAreInTheInstalledTree)
+{
+    const std::string directory = tree.folder("x/" CIMHOST_PROVIDERDIR_FROM_BIN);
+    const std::string built = tree.folder("x/../lib");
+    Surroundings around = surroundings();
+    around.programDirectory = tree.folder("x");
+    EXPECT_THAT(findProviderDirectories(settings, around),
+                ElementsAre(std::filesystem::path(directory).lexically_normal().string()));
+}
+
+TEST_F(Installation, providersAreInTheBuildTree)
+{
+    const std::string directory = tree.folder("lib");
+    EXPECT_THAT(findProviderDirectories(settings, surroundings()), ElementsAre(directory));
+}
+
+TEST_F(Installation, thereMayBeNoProviderDirectory)
+{
+    EXPECT_THAT(findProviderDirectories(settings, surroundings()), IsEmpty());
+}
+
+TEST_F(Installation, theCommandLinesRegistrationsComeFirst)
+{
+    settings.registrationFiles = {"a.reg"};
+    Surroundings around = surroundings();
+    around.registrationFiles = "b.reg";
+    EXPECT_THAT(findRegistrationFiles(settings, around), ElementsAre("a.reg"));
+}
+
+TEST_F(Installation, theEnvironmentListsRegistrations)
+{
+    Surroundings around = surroundings();
+    around.registrationFiles = "b.reg:c.reg";
+    EXPECT_THAT(findRegistrationFiles(settings, around), ElementsAre("b.reg", "c.reg"));
+}
+
+TEST_F(Installation, registrationsAreInTheDataDirectory)
+{
+    const std::string data = "bin/" CIMHOST_DATADIR_FROM_BIN "/";
+    const Surroundings around = surroundings();
+    const std::string second = tree.file(data + "b.reg", "");
+    const std::string first = tree.file(data + "a.reg", "");
+    const std::string other = tree.file(data + "a.mof", "");
+    const auto normal = [](const std::string& file) {
+        return std::filesystem::path(file).lexically_normal().string();
+    };
+    EXPECT_THAT(findRegistrationFiles(settings, around), ElementsAre(normal(first), normal(second)));
+}
+
+TEST_F(Installation, withoutRegistrationsNothingCanBeDone)
+{
+    try {
+        findRegistrationFiles(settings, surroundings());
+        FAIL();
+    } catch (const UsageError& error) {
+        EXPECT_THAT(error.what(), HasSubstr("no registration of providers: " + tree.path().string()));
+        EXPECT_THAT(error.what(), HasSubstr("--registration or CIMHOST_REGISTRATION"));
+    }
+}
+
+std::string section(const std::string& className, const std::string& provider)
+{
+    return "[" + className + "]\n provider: " + provider +
+           "\n location: L\n type: instance\n namespace: root/cimv2\n#\n";
+}
+
+TEST_F(Installation, registrationsOfSeveralFilesAddUp)
+{
+    const Registration all =
+        readRegistrations({tree.file("a.reg", section("CIM_A", "P")),
+                           tree.file("b.reg", section("CIM_B", "P") + section("CIM_A", "Q"))});
+    ASSERT_EQ(all.classes.size(), 3U);
+    EXPECT_EQ(all.classes[0].className, "CIM_A");
+    EXPECT_EQ(all.classes[1].className, "CIM_B");
+    EXPECT_EQ(all.classes[2].provider, "Q");
+}
+
+TEST_F(Installation, aClassAndProviderMayNotBeInTwoFiles)
+{
+    const std::string first = tree.file("a.reg", section("CIM_A", "P"));
+    const std::string second = tree.file("b.reg", section("cim_a", "P"));
+    try {
+        readRegistrations({first, second});
+        FAIL();
+    } catch (const RegistrationError& error) {
+        EXPECT_EQ(error.what(),
+                  second + ": [cim_a] is registered with the provider P in another file already");
+    }
+}
+
+TEST_F(Installation, anInventoryIsHandedOnInTheEnvironment)
+{
+    const std::string file = tree.file("inventory.json", "{}");
+    useInventory(file);
+    EXPECT_EQ(std::getenv("TAVRO_INVENTORY"), file);
+    useInventory(tree.file("empty.json", "")); // whose content is the providers' concern
+    unsetenv("TAVRO_INVENTORY");
+}
+
+TEST_F(Installation, anInventoryMustBeReadable)
+{
+    for (const std::string& file : {tree.path().string() + "/missing.json", tree.folder("directory")}) {
+        try {
+            useInventory(file);
+            FAIL() << file;
+        } catch (const UsageError& error) {
+            EXPECT_THAT(error.what(), HasSubstr("cannot read the inventory " + file + ": ")) << file;
+        }
+        EXPECT_EQ(std::getenv("TAVRO_INVENTORY"), nullptr);
+    }
+    EXPECT_THROW(useInventory(""), UsageError);
+}
+
+} // namespace

@@ -1,0 +1,336 @@
+// A provider for the tests of the command line: a rack with two lamps and the association between
+// them, a class that always fails and one that breaks the interface. It serves fixed instances.
+
+#include <cmpidt.h>
+#include <cmpift.h>
+
+#include <cstdlib>
+#include <string>
+#include <strings.h>
+#include <vector>
+
+namespace {
+
+const CMPIBroker* broker = nullptr;
+
+struct Lamp
+{
+    const char* deviceId;
+    const char* name;
+    CMPIUint16 health;
+    std::vector<CMPIUint16> operationalStatus;
+    CMPIUint16 alarmState;
+};
+
+const std::vector<Lamp>& lamps()
+{
+    static const std::vector<Lamp> list{
+        {"Fan 1:/bay[0]", "Fan 1", 5, {2, 11}, 1},
+        {"L\u00fcfter \"2\", a=b\\c", "L\u00fcfter 2", 10, {3, 5}, 3},
+    };
+    return list;
+}
+
+constexpr const char* rackName = "rack-1";
+
+CMPIStatus good()
+{
+    return {CMPI_RC_OK, nullptr};
+}
+
+CMPIStatus failed(const char* message)
+{
+    return {CMPI_RC_ERR_FAILED, broker->eft->newString(broker, message, nullptr)};
+}
+
+std::string read(CMPIString* string)
+{
+    const char* text = string == nullptr ? nullptr : string->ft->getCharPtr(string, nullptr);
+    return text == nullptr ? "" : text;
+}
+
+bool hasClass(const CMPIObjectPath* path, const char* className)
+{
+    return strcasecmp(read(path->ft->getClassName(path, nullptr)).c_str(), className) == 0;
+}
+
+void trace(CMPILevel level, const std::string& text)
+{
+    broker->eft->trace(broker, level, "SampleProvider", text.c_str(), nullptr);
+}
+
+/// Text goes to a broker as the character pointer itself, in the place of the value's.
+const CMPIValue* chars(const char* text)
+{
+    return reinterpret_cast<const CMPIValue*>(text);
+}
+
+CMPIObjectPath* newPath(const CMPIObjectPath* request, const char* className)
+{
+    const std::string nameSpace = read(request->ft->getNameSpace(request, nullptr));
+    return broker->eft->newObjectPath(broker, nameSpace.c_str(), className, nullptr);
+}
+
+CMPIObjectPath* rackPath(const CMPIObjectPath* request)
+{
+    CMPIObjectPath* path = newPath(request, "CIMT_RackSystem");
+    path->ft->addKey(path, "Name", chars(rackName), CMPI_chars);
+    return path;
+}
+
+CMPIObjectPath* lampPath(const CMPIObjectPath* request, const Lamp& lamp)
+{
+    CMPIObjectPath* path = newPath(request, "CIMT_Lamp");
+    path->ft->addKey(path, "CreationClassName", chars("CIMT_Lamp"), CMPI_chars);
+    path->ft->addKey(path, "DeviceID", chars(lamp.deviceId), CMPI_chars);
+    return path;
+}
+
+CMPIInstance* rackInstance(const CMPIObjectPath* request, const char** properties)
+{
+    static const char* keys[] = {"Name", nullptr};
+    CMPIInstance* instance = broker->eft->newInstance(broker, rackPath(request), nullptr);
+    instance->ft->setPropertyFilter(instance, properties, keys);
+    instance->ft->setProperty(instance, "Name", chars(rackName), CMPI_chars);
+    instance->ft->setProperty(instance, "ElementName", chars("Rack <1> & \"co\""), CMPI_chars);
+    CMPIValue enabled{};
+    enabled.uint16 = 2;
+    instance->ft->setProperty(instance, "EnabledState", &enabled, CMPI_uint16);
+    return instance;
+}
+
+void setNumber(CMPIInstance* instance, const char* name, CMPIUint16 number)
+{
+    CMPIValue value{};
+    value.uint16 = number;
+    instance->ft->setProperty(instance, name, &value, CMPI_uint16);
+}
+
+CMPIInstance* lampInstance(const CMPIObjectPath* request, const char** properties, const Lamp& lamp)
+{
+    static const char* keys[] = {"CreationClassName", "DeviceID", nullptr};
+    CMPIInstance* instance = broker->eft->newInstance(broker, lampPath(request, lamp), nullptr);
+    instance->ft->setPropertyFilter(instance, properties, keys);
+    instance->ft->setProperty(instance, "CreationClassName", chars("CIMT_Lamp"), CMPI_chars);
+    instance->ft->setProperty(instance, "DeviceID", chars(lamp.deviceId), CMPI_chars);
+    instance->ft->setProperty(instance, "Name", chars(lamp.name), CMPI_chars);
+    setNumber(instance, "HealthState", lamp.health);
+
+    CMPIValue states{};
+    const auto count = static_cast<CMPICount>(lamp.operationalStatus.size());
+    states.array = broker->eft->newArray(broker, count, CMPI_uint16, nullptr);
+    for (CMPICount index = 0; index < count; ++index) {
+        CMPIValue state{};
+        state.uint16 = lamp.operationalStatus[index];
+        states.array->ft->setElementAt(states.array, index, &state, CMPI_uint16);
+    }
+    instance->ft->setProperty(instance, "OperationalStatus", &states, CMPI_uint16A);
+    setNumber(instance, "AlarmState", lamp.alarmState);
+    return instance;
+}
+
+void setReference(CMPIInstance* instance, const char* name, CMPIObjectPath* path)
+{
+    CMPIValue value{};
+    value.ref = path;
+    instance->ft->setProperty(instance, name, &value, CMPI_ref);
+}
+
+CMPIObjectPath* linkPath(const CMPIObjectPath* request, const Lamp& lamp)
+{
+    CMPIObjectPath* path = newPath(request, "CIMT_RackLamp");
+    CMPIValue end{};
+    end.ref = rackPath(request);
+    path->ft->addKey(path, "GroupComponent", &end, CMPI_ref);
+    end.ref = lampPath(request, lamp);
+    path->ft->addKey(path, "PartComponent", &end, CMPI_ref);
+    return path;
+}
+
+CMPIInstance* linkInstance(const CMPIObjectPath* request, const Lamp& lamp)
+{
+    CMPIInstance* instance = broker->eft->newInstance(broker, linkPath(request, lamp), nullptr);
+    setReference(instance, "GroupComponent", rackPath(request));
+    setReference(instance, "PartComponent", lampPath(request, lamp));
+    return instance;
+}
+
+CMPIStatus cleanup(CMPIInstanceMI* /*mi*/, const CMPIContext* /*ctx*/, CMPIBoolean /*terminating*/)
+{
+    return good();
+}
+
+CMPIStatus enumerateInstanceNames(CMPIInstanceMI* /*mi*/, const CMPIContext* /*ctx*/,
+                                  const CMPIResult* result, const CMPIObjectPath* request)
+{
+    if (hasClass(request, "CIMT_Broken"))
+        return failed("broken on purpose\x1b[2J");
+    if (hasClass(request, "CIMT_Careless"))
+        result->ft->returnObjectPath(result, nullptr);
+    if (hasClass(request, "CIMT_RackSystem"))
+        result->ft->returnObjectPath(result, rackPath(request));
+    for (const Lamp& lamp : lamps()) {
+        if (hasClass(request, "CIMT_Lamp"))
+            result->ft->returnObjectPath(result, lampPath(request, lamp));
+        if (hasClass(request, "CIMT_RackLamp"))
+            result->ft->returnObjectPath(result, linkPath(request, lamp));
+    }
+    result->ft->returnDone(result);
+    return good();
+}
+
+CMPIStatus enumerateInstances(CMPIInstanceMI* /*mi*/, const CMPIContext* /*ctx*/, const CMPIResult* result,
+                              const CMPIObjectPath* request, const char** properties)
+{
+    if (hasClass(request, "CIMT_Broken")) {
+        result->ft->returnInstance(result, rackInstance(request, properties));
+        return failed("broken on purpose\x1b[2J");
+    }
+    const char* inventory = std::getenv("TAVRO_INVENTORY");
+    trace(CMPI_LEV_VERBOSE, std::string("inventory ") + (inventory == nullptr ? "unset" : inventory));
+    if (hasClass(request, "CIMT_RackSystem"))
+        result->ft->returnInstance(result, rackInstance(request, properties));
+    for (const Lamp& lamp : lamps()) {
+        if (hasClass(request, "CIMT_Lamp"))
+            result->ft->returnInstance(result, lampInstance(request, properties, lamp));
+        if (hasClass(request, "CIMT_RackLamp"))
+            result->ft->returnInstance(result, linkInstance(request, lamp));
+    }
+    result->ft->returnDone(result);
+    return good();
+}
+
+CMPIStatus getInstance(CMPIInstanceMI* /*mi*/, const CMPIContext* /*ctx*/, const CMPIResult* result,
+                       const CMPIObjectPath* request, const char** properties)
+{
+    if (request->ft->getKeyCount(request, nullptr) == 0)
+        return failed("At least one key should be passed");
+    CMPIStatus status{};
+    const CMPIData key = request->ft->getKey(request, "DeviceID", &status);
+    const std::string wanted = status.rc == CMPI_RC_OK ? read(key.value.string) : "";
+    for (const Lamp& lamp : lamps())
+        if (wanted == lamp.deviceId)
+            result->ft->returnInstance(result, lampInstance(request, properties, lamp));
+    result->ft->returnDone(result);
+    return good();
+}
+
+CMPIStatus notSupported()
+{
+    return {CMPI_RC_ERR_NOT_SUPPORTED, nullptr};
+}
+
+CMPIStatus createInstance(CMPIInstanceMI* /*mi*/, const CMPIContext* /*ctx*/, const CMPIResult* /*result*/,
+                          const CMPIObjectPath* /*path*/, const CMPIInstance* /*instance*/)
+{
+    return notSupported();
+}
+
+CMPIStatus modifyInstance(CMPIInstanceMI* /*mi*/, const CMPIContext* /*ctx*/, const CMPIResult* /*result*/,
+                          const CMPIObjectPath* /*path*/, const CMPIInstance* /*instance*/,
+                          const char** /*properties*/)
+{
+    return notSupported();
+}
+
+CMPIStatus deleteInstance(CMPIInstanceMI* /*mi*/, const CMPIContext* /*ctx*/, const CMPIResult* /*result*/,
+                          const CMPIObjectPath* /*path*/)
+{
+    return notSupported();
+}
+
+CMPIStatus execQuery(CMPIInstanceMI* /*mi*/, const CMPIContext* /*ctx*/, const CMPIResult* /*result*/,
+                     const CMPIObjectPath* /*path*/, const char* /*query*/, const char* /*language*/)
+{
+    return notSupported();
+}
+
+CMPIStatus cleanupAssociation(CMPIAssociationMI* /*mi*/, const CMPIContext* /*ctx*/,
+                              CMPIBoolean /*terminating*/)
+{
+    return good();
+}
+
+/// Shows what came of the options of the command line.
+void traceArguments(std::initializer_list<const char*> arguments, const char** properties)
+{
+    std::string text;
+    for (const char* argument : arguments)
+        text += (text.empty() ? "" : " ") + std::string(argument == nullptr ? "-" : argument);
+    for (; properties != nullptr && *properties != nullptr; ++properties)
+        text += std::string(" +") + *properties;
+    trace(CMPI_LEV_INFO, text);
+}
+
+CMPIStatus associators(CMPIAssociationMI* /*mi*/, const CMPIContext* /*ctx*/, const CMPIResult* result,
+                       const CMPIObjectPath* request, const char* assocClass, const char* resultClass,
+                       const char* role, const char* resultRole, const char** properties)
+{
+    traceArguments({assocClass, resultClass, role, resultRole}, properties);
+    if (hasClass(request, "CIMT_Lamp"))
+        result->ft->returnInstance(result, rackInstance(request, properties));
+    if (hasClass(request, "CIMT_RackSystem"))
+        for (const Lamp& lamp : lamps())
+            result->ft->returnInstance(result, lampInstance(request, properties, lamp));
+    return good();
+}
+
+CMPIStatus associatorNames(CMPIAssociationMI* /*mi*/, const CMPIContext* /*ctx*/, const CMPIResult* result,
+                           const CMPIObjectPath* request, const char* assocClass, const char* resultClass,
+                           const char* role, const char* resultRole)
+{
+    traceArguments({assocClass, resultClass, role, resultRole}, nullptr);
+    if (hasClass(request, "CIMT_Lamp"))
+        result->ft->returnObjectPath(result, rackPath(request));
+    return good();
+}
+
+CMPIStatus references(CMPIAssociationMI* /*mi*/, const CMPIContext* /*ctx*/, const CMPIResult* result,
+                      const CMPIObjectPath* request, const char* resultClass, const char* role,
+                      const char** properties)
+{
+    traceArguments({resultClass, role}, properties);
+    for (const Lamp& lamp : lamps())
+        result->ft->returnInstance(result, linkInstance(request, lamp));
+    return good();
+}
+
+CMPIStatus referenceNames(CMPIAssociationMI* /*mi*/, const CMPIContext* /*ctx*/, const CMPIResult* result,
+                          const CMPIObjectPath* request, const char* resultClass, const char* role)
+{
+    traceArguments({resultClass, role}, nullptr);
+    result->ft->returnObjectPath(result, linkPath(request, lamps().front()));
+    return good();
+}
+
+} // namespace
+
+extern "C" CMPIInstanceMI* SampleProvider_Create_InstanceMI(const CMPIBroker* mb, const CMPIContext* /*ctx*/,
+                                                            CMPIStatus* /*rc*/)
+{
+    static CMPIInstanceMIFT table{200,
+                                  200,
+                                  "SampleProvider",
+                                  cleanup,
+                                  enumerateInstanceNames,
+                                  enumerateInstances,
+                                  getInstance,
+                                  createInstance,
+                                  modifyInstance,
+                                  deleteInstance,
+                                  execQuery};
+    static CMPIInstanceMI mi{nullptr, &table};
+    broker = mb;
+    return &mi;
+}
+
+extern "C" CMPIAssociationMI*
+SampleProvider_Create_AssociationMI(const CMPIBroker* mb, const CMPIContext* /*ctx*/, CMPIStatus* /*rc*/)
+{
+    static CMPIAssociationMIFT table{
+        200,        200,           "SampleProvider", cleanupAssociation, associators, associatorNames,
+        references, referenceNames};
+    static CMPIAssociationMI mi{nullptr, &table};
+    broker = mb;
+    return &mi;
+}
