@@ -25,10 +25,10 @@ public:
     TemporaryDirectory(const TemporaryDirectory&) = delete;
     TemporaryDirectory& operator=(const TemporaryDirectory&) = delete;
 
-    std::string path(const std::string& name) const { return path_ + '/' + name; }
+    [[nodiscard]] std::string path(const std::string& name) const { return path_ + '/' + name; }
 
     /// \return the file's path
-    std::string write(const std::string& name, const std::string& content) const
+    [[nodiscard]] std::string write(const std::string& name, const std::string& content) const
     {
         std::ofstream(path(name), std::ios::binary) << content;
         return path(name);

@@ -240,8 +240,8 @@ TEST(ObjectPathValues, booleansAreComparedAsTrueOrFalse)
 
 TEST(ObjectPathValues, charactersAndRealsAreComparedByValue)
 {
-    const Value a{"char16", CMPI_char16, valueOf(&CMPIValue::char16, 'a')};
-    const Value b{"char16", CMPI_char16, valueOf(&CMPIValue::char16, 'b')};
+    const Value a{"char16", CMPI_char16, valueOf(&CMPIValue::char16, 97)};
+    const Value b{"char16", CMPI_char16, valueOf(&CMPIValue::char16, 98)};
     EXPECT_TRUE(areValuesEqual(a, a));
     EXPECT_FALSE(areValuesEqual(a, b));
     const Value half{"real32", CMPI_real32, valueOf(&CMPIValue::real32, 0.5)};
@@ -257,10 +257,10 @@ TEST(ObjectPathValues, textsAreComparedWhicheverWayTheyAreCarried)
 {
     Fake::String string("text");
     Fake::DateTime dateTime("text");
-    char characters[] = "text";
+    std::string characters = "text";
     const std::vector<Value> texts = {
         {"string", CMPI_string, valueOf(&CMPIValue::string, &string.object)},
-        {"chars", CMPI_chars, valueOf(&CMPIValue::chars, &characters[0])},
+        {"chars", CMPI_chars, valueOf(&CMPIValue::chars, characters.data())},
         {"dateTime", CMPI_dateTime, valueOf(&CMPIValue::dateTime, &dateTime.object)},
     };
     Fake::String otherString("other");

@@ -37,9 +37,7 @@ TEST(StripSpaces, leavesNothingOfBlanksAlone)
 
 TEST(StripSpaces, takesNoOtherWhiteSpaceForABlank)
 {
-    for (const std::string text : {"\ta\t", "\na\n", "\ra\r", "\va\v", "\fa\f",
-                                   "\xC2\xA0"
-                                   "a\xC2\xA0"})
+    for (const std::string text : {"\ta\t", "\na\n", "\ra\r", "\va\v", "\fa\f", "\u00A0a\u00A0"})
         EXPECT_EQ(stripSpaces(" " + text + " "), text);
 }
 

@@ -250,8 +250,10 @@ TEST_F(Cursor, takesMoreNodesThanSixteenBitsCount)
 
 TEST_F(Cursor, cursorsOfSeveralThreadsDoNotMeet)
 {
+    constexpr int threadCount = 4;
     std::vector<std::thread> threads;
-    for (int number = 0; number < 4; ++number)
+    threads.reserve(threadCount);
+    for (int number = 0; number < threadCount; ++number)
         threads.emplace_back([] {
             for (int round = 0; round < 20; ++round)
                 EXPECT_THAT(descriptionsOf(36), ElementsAre("First", " Second ", ""));

@@ -9,7 +9,7 @@ namespace {
 
 constexpr utf8proc_int32_t replacementCharacter = 0xFFFD;
 
-void appendUtf8(std::string& text, wchar_t character)
+void appendUtf8(std::string& text, char32_t character)
 {
     const auto codePoint = static_cast<utf8proc_int32_t>(character);
     std::array<utf8proc_uint8_t, 4> bytes{};
@@ -25,7 +25,7 @@ std::string make_string(const std::wstring& text)
     std::string utf8;
     utf8.reserve(text.size());
     for (const wchar_t character : text)
-        appendUtf8(utf8, character);
+        appendUtf8(utf8, static_cast<char32_t>(character));
     return utf8;
 }
 

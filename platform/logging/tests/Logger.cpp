@@ -268,6 +268,7 @@ TEST_F(Logger, keepsLinesOfThreadsWhole)
     const std::string filling(300, '.');
     auto lines = standardErrorOf([&] {
         std::vector<std::thread> threads;
+        threads.reserve(threadCount);
         for (int number = 0; number < threadCount; ++number)
             threads.emplace_back([&, number] {
                 for (int line = 0; line < lineCount; ++line)
