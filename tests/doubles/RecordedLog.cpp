@@ -31,6 +31,12 @@ std::vector<Line> lines()
     return recordedLines;
 }
 
+std::size_t count()
+{
+    const std::lock_guard lock(mutex);
+    return recordedLines.size();
+}
+
 std::vector<std::string> insertions()
 {
     const std::lock_guard lock(mutex);

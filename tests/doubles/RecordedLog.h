@@ -3,6 +3,7 @@
 #ifndef TESTS_DOUBLES_RECORDEDLOG_H
 #define TESTS_DOUBLES_RECORDEDLOG_H
 
+#include <cstddef>
 #include <string>
 #include <vector>
 
@@ -31,6 +32,9 @@ struct Line
 
 /// All lines since the last clear(), of all threads, in the order of the calls.
 std::vector<Line> lines();
+
+/// Number of lines().
+std::size_t count();
 
 /// One insertion into an MVMessageBuffer since the last clear(), as the text it added; a null text is
 /// "<null>".

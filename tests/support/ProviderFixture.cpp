@@ -221,6 +221,30 @@ std::optional<std::string> ProviderFixture::message(const CMPIStatus& status)
     return cimhost::read(status.msg);
 }
 
+std::vector<std::string> ProviderFixture::timeline() const
+{
+    const std::vector<std::string> flow = Logged::flow();
+    const std::vector<std::string> calls = broker.calls();
+    const std::vector<std::size_t> linesBefore = broker.linesBeforeCalls();
+    std::vector<std::string> all;
+    std::size_t line = 0;
+    for (std::size_t call = 0; call < calls.size(); ++call) {
+        // Each flow line stands for two: one in the log, one in the trace.
+        for (; line < linesBefore[call] / 2; ++line)
+            all.push_back(flow.at(line));
+        all.push_back(calls[call]);
+    }
+    for (; line < flow.size(); ++line)
+        all.push_back(flow[line]);
+    return all;
+}
+
+void ProviderFixture::clearRecords()
+{
+    broker.clear();
+    RecordedLog::clear();
+}
+
 std::string valueOf(const cim::ObjectPath& path, const std::string& key)
 {
     return find(path.keys, key);

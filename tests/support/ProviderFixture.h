@@ -87,6 +87,12 @@ protected:
     /// The text of a status's message; nothing: there is none.
     static std::optional<std::string> message(const CMPIStatus& status);
 
+    /// The broker's calls and the flow lines, as Logged::flow() gives them, in the order in which they came
+    /// about. Both since the last clearRecords().
+    std::vector<std::string> timeline() const;
+    /// Forgets the calls and the lines so far.
+    void clearRecords();
+
     const CMPIContext* ctx() { return request->context(); }
     const CMPIResult* rslt() { return request->result(); }
 

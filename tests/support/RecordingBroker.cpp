@@ -1,5 +1,7 @@
 #include "RecordingBroker.h"
 
+#include "RecordedLog.h"
+
 #include <algorithm>
 #include <type_traits>
 
@@ -202,6 +204,13 @@ Result failed(Failure failure)
     }
 }
 
+/// Leaves the object that a call is made on without a handle.
+template <class Object, class... Rest>
+void dropHandle(const Object* object, Rest...)
+{
+    const_cast<Object*>(object)->hdl = nullptr;
+}
+
 /// Stands in a slot of a function table.
 template <auto Slot>
 struct Layer;
@@ -217,6 +226,11 @@ struct Layer<Slot>
         const auto failure = active->record(service, showAll(arguments...));
         if (!failure)
             return original(arguments...);
+        if (*failure == Failure::lostHandle) {
+            const Result result = original(arguments...);
+            dropHandle(arguments...);
+            return result;
+        }
         if (*failure == Failure::errorStatus)
             (fillStatus(arguments), ...);
         return failed<Result>(*failure);
@@ -301,6 +315,7 @@ void RecordingBroker::clear()
 {
     const std::lock_guard lock(mutex);
     recorded.clear();
+    linesBefore.clear();
     names.clear();
     counters.clear();
 }
@@ -309,6 +324,12 @@ std::vector<std::string> RecordingBroker::calls() const
 {
     const std::lock_guard lock(mutex);
     return recorded;
+}
+
+std::vector<std::size_t> RecordingBroker::linesBeforeCalls() const
+{
+    const std::lock_guard lock(mutex);
+    return linesBefore;
 }
 
 std::vector<std::string> RecordingBroker::calls(const std::vector<std::string>& services) const
@@ -336,6 +357,7 @@ std::optional<Failure> RecordingBroker::record(const std::string& service,
         call += (i == 0 ? "" : ", ") + arguments[i];
     const std::lock_guard lock(mutex);
     recorded.push_back(call + ")");
+    linesBefore.push_back(RecordedLog::count());
     for (Plan& plan : plans) {
         if (plan.service == service && --plan.remaining == 0)
             return plan.failure;

@@ -6,8 +6,10 @@
 
 #include "broker/Broker.h"
 
+#include <cstddef>
 #include <map>
 #include <mutex>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -19,7 +21,8 @@ enum class Failure
     nullResult,  ///< a null pointer or a zero; a status argument is left alone
     noHandle,    ///< an object with a null handle
     errorStatus, ///< a null pointer or a zero, and code 1 with the message "injected" in the status argument
-    wrongValue   ///< getNext: an item that is no reference; hasNext: false
+    wrongValue,  ///< getNext: an item that is no reference; hasNext: false
+    lostHandle   ///< the call is served, but the object it is made on has a null handle from then on
 };
 
 /// One at a time may exist. Calls are written as the service's name with its arguments in parentheses:
@@ -41,6 +44,9 @@ public:
     void clear();
 
     std::vector<std::string> calls() const;
+
+    /// For each of calls(), how many lines the logging library had been given before it.
+    std::vector<std::size_t> linesBeforeCalls() const;
 
     /// Those calls that begin with one of the services' names.
     std::vector<std::string> calls(const std::vector<std::string>& services) const;
@@ -70,6 +76,7 @@ private:
     cimhost::FunctionTables originalTables;
     mutable std::mutex mutex;
     std::vector<std::string> recorded;
+    std::vector<std::size_t> linesBefore;
     std::map<const void*, std::string> names;
     std::map<const void*, std::string> givenNames;
     std::map<std::string, int> counters;
