@@ -42,16 +42,16 @@ protected:
     CMPIAssociationMI* mi = GetParam().create(host.cmpiBroker(), ctx(), nullptr);
 };
 
-INSTANTIATE_TEST_SUITE_P(
-    Every, InstanceProviders,
-    ::testing::Values(InstanceProvider{&GlimmarkProfileProvider_Create_InstanceMI,
-                                       "instanceGlimmarkProfileProvider"},
-                      InstanceProvider{&GlimmarkCapabilitiesProvider_Create_InstanceMI,
-                                       "instanceGlimmarkCapabilitiesProvider"},
-                      InstanceProvider{&GlimmarkElementCapabilitiesProvider_Create_InstanceMI,
-                                       "instanceGlimmarkElementCapabilitiesProvider"},
-                      InstanceProvider{&GlimmarkSystemDeviceProvider_Create_InstanceMI,
-                                       "instanceGlimmarkSystemDeviceProvider"}));
+INSTANTIATE_TEST_SUITE_P(Every, InstanceProviders,
+                         ::testing::Values(InstanceProvider{&GlimmarkProfileProvider_Create_InstanceMI,
+                                                            "instanceGlimmarkProfileProvider"},
+                                           InstanceProvider{&GlimmarkCapabilitiesProvider_Create_InstanceMI,
+                                                            "instanceGlimmarkCapabilitiesProvider"},
+                                           InstanceProvider{
+                                               &GlimmarkElementCapabilitiesProvider_Create_InstanceMI,
+                                               "instanceGlimmarkElementCapabilitiesProvider"},
+                                           InstanceProvider{&GlimmarkSystemDeviceProvider_Create_InstanceMI,
+                                                            "instanceGlimmarkSystemDeviceProvider"}));
 
 INSTANTIATE_TEST_SUITE_P(
     Every, AssociationProviders,
@@ -81,7 +81,8 @@ TEST_P(InstanceProviders, HaveATableOfVersion200WithTheirName)
 TEST_P(InstanceProviders, AreMadeWithoutACallAndWithoutAWord)
 {
     CMPIStatus status = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
-    EXPECT_EQ(GetParam().create(host.cmpiBroker(), ctx(), &status), mi) << "one record, whenever it is asked for";
+    EXPECT_EQ(GetParam().create(host.cmpiBroker(), ctx(), &status), mi)
+        << "one record, whenever it is asked for";
     EXPECT_EQ(status.rc, CMPI_RC_ERR_ACCESS_DENIED);
     EXPECT_THAT(broker.calls(), IsEmpty());
     EXPECT_THAT(Logged::lines(), IsEmpty());
@@ -105,7 +106,8 @@ TEST_P(InstanceProviders, AnswerWhatChangesSomethingWhateverTheArguments)
     const CMPIInstanceMIFT& table = *mi->ft;
     const auto notSupported = CMPI_RC_ERR_NOT_SUPPORTED;
     expectFixedAnswer(table.createInstance(nullptr, nullptr, nullptr, nullptr, nullptr), notSupported);
-    expectFixedAnswer(table.modifyInstance(nullptr, nullptr, nullptr, nullptr, nullptr, nullptr), notSupported);
+    expectFixedAnswer(table.modifyInstance(nullptr, nullptr, nullptr, nullptr, nullptr, nullptr),
+                      notSupported);
     expectFixedAnswer(table.deleteInstance(nullptr, nullptr, nullptr, nullptr), notSupported);
     expectFixedAnswer(table.execQuery(nullptr, nullptr, nullptr, nullptr, nullptr, nullptr), notSupported);
 }

@@ -3,6 +3,8 @@
 #include "EntryPoints.h"
 #include "support/ProviderFixture.h"
 
+#include <Tavro/Common.h>
+
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
@@ -85,15 +87,13 @@ TEST_F(GlimmarkProviderTest, NamesAreTraced)
     const CMPIObjectPath* const path = ref(glimmark);
     enumerateNames(path);
     const std::string function = "Glimmark_EnumInstanceNames";
-    const auto parameters =
-        Logged::parameters(" mi=", mi, " ctx=", ctx(), " result=", rslt(), " ref=", path);
+    const auto parameters = Logged::parameters(" mi=", mi, " ctx=", ctx(), " result=", rslt(), " ref=", path);
     EXPECT_THAT(Logged::linesOf(function),
                 ElementsAre(Logged::line("GlimmarkProvider", "ENTERING", function, parameters),
                             Logged::line("GlimmarkProvider", "EXITING", function, parameters)));
-    EXPECT_THAT(Logged::flow(),
-                ElementsAre("ENTERING " + function, "ENTERING setVector", "EXITING setVector",
-                            "ENTERING getAllGlimmarkCMPIObjPaths", "EXITING getAllGlimmarkCMPIObjPaths",
-                            "EXITING " + function));
+    EXPECT_THAT(Logged::flow(), ElementsAre("ENTERING " + function, "ENTERING setVector", "EXITING setVector",
+                                            "ENTERING getAllGlimmarkCMPIObjPaths",
+                                            "EXITING getAllGlimmarkCMPIObjPaths", "EXITING " + function));
 }
 
 TEST_F(GlimmarkProviderTest, NamesOfAnEmptyInventoryEndWithoutDoneAndExit)
@@ -102,9 +102,8 @@ TEST_F(GlimmarkProviderTest, NamesOfAnEmptyInventoryEndWithoutDoneAndExit)
     const CMPIStatus status = enumerateNames(ref(glimmark));
     EXPECT_EQ(status.rc, CMPI_RC_OK);
     EXPECT_EQ(message(status), std::nullopt);
-    EXPECT_THAT(
-        broker.calls(),
-        ElementsAre("trace(1, \"GlimmarkProfileProvider\", \"***No instance found***\", null)"));
+    EXPECT_THAT(broker.calls(),
+                ElementsAre("trace(1, \"GlimmarkProfileProvider\", \"***No instance found***\", null)"));
     EXPECT_THAT(Logged::flow(),
                 ElementsAre("ENTERING Glimmark_EnumInstanceNames", "ENTERING getAllGlimmarkCMPIObjPaths"));
 }
@@ -154,9 +153,8 @@ TEST_F(GlimmarkProviderTest, InstancesCarryTheKeysAndThePropertiesAskedFor)
     PropertyNames properties{"AlarmState", "caption", "NoSuchProperty"};
     const auto instances = answer(enumerate(ref(glimmark), properties)).instances;
     ASSERT_THAT(instances, SizeIs(3));
-    EXPECT_THAT(
-        namesOf(instances[0]),
-        ElementsAre("CreationClassName", "DeviceID", "SystemCreationClassName", "SystemName", "AlarmState"));
+    EXPECT_THAT(namesOf(instances[0]), ElementsAre("CreationClassName", "DeviceID", "SystemCreationClassName",
+                                                   "SystemName", "AlarmState"));
 }
 
 TEST_F(GlimmarkProviderTest, InstancesAreTraced)
@@ -172,11 +170,10 @@ TEST_F(GlimmarkProviderTest, InstancesAreTraced)
     EXPECT_THAT(Logged::linesOf(function),
                 ElementsAre(Logged::line("GlimmarkProvider", "ENTERING", function, parameters),
                             Logged::line("GlimmarkProvider", "EXITING", function, parameters)));
-    EXPECT_THAT(Logged::flow(),
-                ElementsAre("ENTERING " + function, "ENTERING setVector", "EXITING setVector",
-                            "ENTERING getAllGlimmarkCMPIInstances", "ENTERING makeGlimmarkInstance",
-                            "EXITING makeGlimmarkInstance", "EXITING getAllGlimmarkCMPIInstances",
-                            "EXITING " + function));
+    EXPECT_THAT(Logged::flow(), ElementsAre("ENTERING " + function, "ENTERING setVector", "EXITING setVector",
+                                            "ENTERING getAllGlimmarkCMPIInstances",
+                                            "ENTERING makeGlimmarkInstance", "EXITING makeGlimmarkInstance",
+                                            "EXITING getAllGlimmarkCMPIInstances", "EXITING " + function));
 }
 
 TEST_F(GlimmarkProviderTest, InstancesOfAnEmptyInventoryAreNoneAndDone)
@@ -194,9 +191,8 @@ TEST_F(GlimmarkProviderTest, InstancesThatCouldNotBeMadeAreHandedOn)
     broker.fail("newInstance", 2, Failure::nullResult);
     const CMPIStatus status = enumerate(ref(glimmark));
     EXPECT_EQ(status.rc, CMPI_RC_OK);
-    EXPECT_THAT(broker.calls(resultServices),
-                ElementsAre("returnInstance(instance1)", "returnInstance(null)", "returnInstance(instance2)",
-                            "returnDone()"));
+    EXPECT_THAT(broker.calls(resultServices), ElementsAre("returnInstance(instance1)", "returnInstance(null)",
+                                                          "returnInstance(instance2)", "returnDone()"));
 }
 
 // GetInstance
@@ -206,10 +202,11 @@ TEST_F(GlimmarkProviderTest, GetNeedsAKey)
     const CMPIStatus status = get(ref(glimmark));
     EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
     EXPECT_EQ(message(status), "At least one key should be passed");
-    EXPECT_THAT(broker.calls(),
-                ElementsAre("getKeyCount(ref, rc)", "newString(\"At least one key should be passed\", null)",
-                            "trace(2, \"GlimmarkProfileProvider\", \"At least one key should be passed\", null)",
-                            "returnDone()"));
+    EXPECT_THAT(
+        broker.calls(),
+        ElementsAre("getKeyCount(ref, rc)", "newString(\"At least one key should be passed\", null)",
+                    "trace(2, \"GlimmarkProfileProvider\", \"At least one key should be passed\", null)",
+                    "returnDone()"));
     EXPECT_THAT(Logged::flow(), ElementsAre("ENTERING Glimmark_GetInstance", "EXITING Glimmark_GetInstance"));
 }
 
@@ -243,17 +240,15 @@ TEST_F(GlimmarkProviderTest, GetIsTraced)
     const CMPIObjectPath* const path = ref(glimmark, {{"DeviceID", "b:/2"}});
     get(path);
     const std::string function = "Glimmark_GetInstance";
-    const auto parameters =
-        Logged::parameters(" mi=", mi, " ctx=", ctx(), " result=", rslt(), " cop=", path,
-                           " properties=", static_cast<const char**>(nullptr));
+    const auto parameters = Logged::parameters(" mi=", mi, " ctx=", ctx(), " result=", rslt(), " cop=", path,
+                                               " properties=", static_cast<const char**>(nullptr));
     EXPECT_THAT(Logged::linesOf(function),
                 ElementsAre(Logged::line("GlimmarkProvider", "ENTERING", function, parameters),
                             Logged::line("GlimmarkProvider", "EXITING", function, parameters)));
-    EXPECT_THAT(Logged::flow(),
-                ElementsAre("ENTERING " + function, "ENTERING setVector", "EXITING setVector",
-                            "ENTERING getOneGlimmarkCMPIInstance", "ENTERING makeGlimmarkInstance",
-                            "EXITING makeGlimmarkInstance", "EXITING getOneGlimmarkCMPIInstance",
-                            "EXITING " + function));
+    EXPECT_THAT(Logged::flow(), ElementsAre("ENTERING " + function, "ENTERING setVector", "EXITING setVector",
+                                            "ENTERING getOneGlimmarkCMPIInstance",
+                                            "ENTERING makeGlimmarkInstance", "EXITING makeGlimmarkInstance",
+                                            "EXITING getOneGlimmarkCMPIInstance", "EXITING " + function));
 }
 
 TEST_F(GlimmarkProviderTest, GetOfAnUnknownDeviceIDEndsWithoutDoneAndExit)
@@ -284,11 +279,11 @@ TEST_F(GlimmarkProviderTest, GetWithoutDeviceIDAnswersTheFirstEqualPath)
 
 TEST_F(GlimmarkProviderTest, GetWithANullDeviceIDSearchesAndStopsAtTheFirstMatch)
 {
-    // A null DeviceID beside otherwise equal keys would never be equal; let the broker answer no key only when
-    // the operation asks for it.
+    // A null DeviceID beside otherwise equal keys would never be equal; let the broker answer no key only
+    // when the operation asks for it.
     cimhost::cim::ObjectPath wanted = answer(enumerate(ref(glimmark))).instances.at(1).path;
     ASSERT_EQ(valueOf(wanted, "DeviceID"), "b:/2");
-    request = std::make_unique<cimhost::Request>(host);
+    newRequest();
     broker.clear();
     for (const Failure failure : {Failure::nullResult, Failure::errorStatus, Failure::wrongValue}) {
         broker.clear();
@@ -298,8 +293,7 @@ TEST_F(GlimmarkProviderTest, GetWithANullDeviceIDSearchesAndStopsAtTheFirstMatch
                     ElementsAre("getObjectPath(instance1, rc)", "getObjectPath(instance2, rc)"));
         EXPECT_THAT(broker.calls(resultServices), ElementsAre("returnInstance(instance2)", "returnDone()"));
     }
-    EXPECT_THAT(valuesOf(answer({CMPI_RC_OK, nullptr}).instances, "DeviceID"),
-                ElementsAre("b:/2"));
+    EXPECT_THAT(valuesOf(answer({CMPI_RC_OK, nullptr}).instances, "DeviceID"), ElementsAre("b:/2"));
 }
 
 TEST_F(GlimmarkProviderTest, GetOnTheSearchWayPassesOverWhatCouldNotBeMade)
@@ -327,6 +321,6 @@ TEST_F(GlimmarkProviderTest, NothingIsKeptBetweenRequests)
 {
     EXPECT_THAT(answer(enumerateNames(ref(glimmark))).paths, SizeIs(3));
     MadeInventory::set({{"new", "9"}});
-    request = std::make_unique<cimhost::Request>(host);
+    newRequest();
     EXPECT_THAT(valuesOf(answer(enumerateNames(ref(glimmark))).paths, "DeviceID"), ElementsAre("new:/9"));
 }

@@ -190,6 +190,14 @@ ProviderFixture::ProviderFixture()
     RecordedLog::clear();
 }
 
+void ProviderFixture::newRequest()
+{
+    request.reset(); // requests nest: the old one ends before the new one begins
+    request = std::make_unique<cimhost::Request>(host);
+    broker.clear();
+    broker.name(request->context(), "ctx");
+}
+
 ProviderFixture::~ProviderFixture()
 {
     request.reset();

@@ -81,6 +81,9 @@ protected:
                         const std::vector<std::pair<std::string, std::string>>& keys = {},
                         const std::string& nameSpace = "root/test");
 
+    /// Ends the open request with all of its objects, and opens another.
+    void newRequest();
+
     /// What the operation answered. \param status  what it returned
     cimhost::cim::Answer answer(const CMPIStatus& status) const { return request->answer(status); }
 
