@@ -34,7 +34,7 @@ function(add_support_library_tests name)
     add_executable(${name}-tests ${ARGN})
     target_link_libraries(${name}-tests PRIVATE ${name} GTest::gmock GTest::gtest_main glimmark::settings)
     target_include_directories(${name}-tests PRIVATE ${PROJECT_SOURCE_DIR}/platform)
-    gtest_discover_tests(${name}-tests TEST_PREFIX ${name}.)
+    gtest_discover_tests(${name}-tests TEST_PREFIX ${name}. NO_PRETTY_VALUES)
 
     add_test(
         NAME ${name}.SharedObject

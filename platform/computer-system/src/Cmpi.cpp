@@ -11,28 +11,28 @@ Object* unconst(const Object* object)
 }
 
 /// A service that may be called.
-template <class Table, class Service>
-Service usable(const Table* table, Service Table::*service, const char* name)
+template <class Table, class Function>
+Function usable(const Table* table, Function Table::*slot, const char* service)
 {
-    if (table == nullptr || table->*service == nullptr)
-        throw Failure(CMPI_RC_ERR_INVALID_HANDLE, std::string("There is no ") + name + " to call");
-    return table->*service;
+    if (table == nullptr || table->*slot == nullptr)
+        throw Failure(CMPI_RC_ERR_INVALID_HANDLE, std::string("There is no ") + service + " to call");
+    return table->*slot;
 }
 
 /// Calls a service of an encapsulated object.
-template <class Object, class Table, class Service, class... Arguments>
-auto call(const Object* object, Service Table::*service, const char* name, Arguments... arguments)
+template <class Object, class Table, class Function, class... Arguments>
+auto call(const Object* object, Function Table::*slot, const char* service, Arguments... arguments)
 {
     const Table* const table = object != nullptr && object->hdl != nullptr ? object->ft : nullptr;
-    return usable(table, service, name)(unconst(object), arguments...);
+    return usable(table, slot, service)(unconst(object), arguments...);
 }
 
 /// Calls a factory service of the broker.
-template <class Service, class... Arguments>
-auto call(const CMPIBroker* broker, Service CMPIBrokerEncFT::*service, const char* name,
+template <class Function, class... Arguments>
+auto call(const CMPIBroker* broker, Function CMPIBrokerEncFT::*slot, const char* service,
           Arguments... arguments)
 {
-    return usable(broker != nullptr ? broker->eft : nullptr, service, name)(broker, arguments...);
+    return usable(broker != nullptr ? broker->eft : nullptr, slot, service)(broker, arguments...);
 }
 
 void require(const CMPIStatus& status, const char* service)

@@ -18,7 +18,7 @@ class Failure : public std::runtime_error
 {
 public:
     Failure(CMPIrc code, const std::string& message) : std::runtime_error(message), code_(code) {}
-    CMPIrc code() const { return code_; }
+    [[nodiscard]] CMPIrc code() const { return code_; }
 
 private:
     CMPIrc code_;

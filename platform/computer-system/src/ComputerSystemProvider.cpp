@@ -8,6 +8,7 @@
 #include "Cmpi.h"
 #include "SystemNames.h"
 
+#include <array>
 #include <atomic>
 #include <exception>
 #include <string>
@@ -17,7 +18,7 @@
 namespace Tavro::ComputerSystem {
 namespace {
 
-constexpr char className[] = "TAVRO_ComputerSystem";
+constexpr const char* className = "TAVRO_ComputerSystem";
 
 // Values of the CIM schema.
 constexpr CMPIUint16 operationalStatusOk = 2;
@@ -41,8 +42,8 @@ CMPIObjectPath* pathOf(const std::string& name, const std::string& nameSpace)
 CMPIInstance* instanceAt(const CMPIObjectPath* path, const std::string& name, const char** properties)
 {
     CMPIInstance* const instance = Cmpi::newInstance(theBroker, path);
-    const char* keys[] = {"CreationClassName", "Name", nullptr};
-    Cmpi::setPropertyFilter(instance, properties, keys);
+    std::array<const char*, 3> keys = {"CreationClassName", "Name", nullptr};
+    Cmpi::setPropertyFilter(instance, properties, keys.data());
 
     Cmpi::setProperty(instance, "CreationClassName", className);
     Cmpi::setProperty(instance, "Name", name);

@@ -11,8 +11,6 @@ using cimhost::FunctionTables;
 using cimhost::Request;
 using cimhost::cim::Answer;
 using testing::HasSubstr;
-using testing::IsEmpty;
-using testing::SizeIs;
 
 using FactoryFunction = CMPIInstanceMI* (*)(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
 
@@ -140,7 +138,7 @@ void PrintTo(const Fault& fault, std::ostream* stream)
     *stream << fault.service;
 }
 
-const Fault faultsOfPaths[] = {
+const std::vector<Fault> faultsOfPaths = {
     {"newObjectPath",
      [](FunctionTables& tables) {
          tables.enc.newObjectPath = [](const CMPIBroker*, const char*, const char*, CMPIStatus* rc) {
@@ -172,7 +170,7 @@ const Fault faultsOfPaths[] = {
      [](FunctionTables& tables) { tables.result.returnDone = nullptr; }},
 };
 
-const Fault faultsOfInstances[] = {
+const std::vector<Fault> faultsOfInstances = {
     {"newInstance",
      [](FunctionTables& tables) {
          tables.enc.newInstance = [](const CMPIBroker*, const CMPIObjectPath*, CMPIStatus* rc) {
