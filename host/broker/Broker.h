@@ -91,10 +91,10 @@ public:
                            const cim::PropertyList& properties = {});
     cim::Answer referenceNames(const cim::ObjectPath& path, const Traversal& traversal);
 
-    const Registration& registration() const;
+    [[nodiscard]] const Registration& registration() const;
 
     /// The broker as a provider sees it, for driving a provider's function tables by hand.
-    const CMPIBroker* cmpiBroker() const;
+    [[nodiscard]] const CMPIBroker* cmpiBroker() const;
 
     /// The tables that this broker and all its objects answer through. A layer over the broker, one
     /// that records calls or lets them fail, puts its own functions into them before the first request.
@@ -124,9 +124,9 @@ public:
 
     /// What the provider has returned through `result()` so far, with the provider's own status read
     /// into it. \param status  what the operation returned; its message is read while the request lives
-    cim::Answer answer(const CMPIStatus& status) const;
+    [[nodiscard]] cim::Answer answer(const CMPIStatus& status) const;
     /// How often the provider has called returnDone.
-    int doneCount() const;
+    [[nodiscard]] int doneCount() const;
 
 private:
     class Implementation;

@@ -59,10 +59,10 @@ public:
     /// The same, and leaves the service. \throws Refusal  always
     [[noreturn]] static void leave(CMPIrc code) { throw Refusal{code}; }
     void answerWith(const CMPIStatus& status) { status_ = status; }
-    const CMPIStatus& status() const { return status_; }
+    [[nodiscard]] const CMPIStatus& status() const { return status_; }
 
     /// The broker of the objects in this call; for services that have resolved one.
-    Core& core() const { return *core_; }
+    [[nodiscard]] Core& core() const { return *core_; }
 
     /// A new object for the provider.
     template <class Object, class... Arguments>

@@ -17,8 +17,8 @@ public:
     /// \param shared  not null
     explicit CopyOnWrite(std::shared_ptr<const T> shared) : value_(std::move(shared)) {}
 
-    const T& read() const { return *value_; }
-    std::shared_ptr<const T> share() const { return value_; }
+    [[nodiscard]] const T& read() const { return *value_; }
+    [[nodiscard]] std::shared_ptr<const T> share() const { return value_; }
     T& edit()
     {
         if (own_ == nullptr || value_.use_count() > 1)

@@ -48,6 +48,9 @@ CMPIString* newString(const CMPIBroker* broker, const char* text, CMPIStatus* rc
     });
 }
 
+/// More elements than any answer carries; a larger size is one that was never set.
+constexpr CMPICount mostElements = CMPICount{1} << 22U;
+
 /// All elements are null at first.
 CMPIArray* newArray(const CMPIBroker* broker, CMPICount size, CMPIType type, CMPIStatus* rc)
 {
@@ -55,6 +58,10 @@ CMPIArray* newArray(const CMPIBroker* broker, CMPICount size, CMPIType type, CMP
         call.broker(broker);
         if (!isScalarType(type))
             call.refuse(CMPI_RC_ERR_INVALID_DATA_TYPE, "no array has elements of " + cim::typeName(type));
+        if (size > mostElements)
+            call.refuse(CMPI_RC_ERR_INVALID_PARAMETER, "an array of " + std::to_string(size) +
+                                                           " elements; there may be " +
+                                                           std::to_string(mostElements));
         return call.make<ArrayObject>(keptType(type), std::vector<cim::Value::Scalar>(size));
     });
 }
@@ -153,7 +160,7 @@ CMPIString* getMessage(const CMPIBroker* broker, const char* /*id*/, const char*
     return defaultMessage("CMPIBrokerEncFT.getMessage", broker, message, rc);
 }
 
-CMPIString* getMessage2(const CMPIBroker* broker, const char* /*id*/, const CMPIMsgFileHandle /*file*/,
+CMPIString* getMessage2(const CMPIBroker* broker, const char* /*id*/, CMPIMsgFileHandle /*file*/,
                         const char* message, CMPIStatus* rc, CMPICount /*count*/, ...)
 {
     return defaultMessage("CMPIBrokerEncFT.getMessage2", broker, message, rc);
@@ -217,7 +224,7 @@ CMPIStatus openMessageFile(const CMPIBroker* broker, const char* /*file*/, CMPIM
     });
 }
 
-CMPIStatus closeMessageFile(const CMPIBroker* broker, const CMPIMsgFileHandle /*handle*/)
+CMPIStatus closeMessageFile(const CMPIBroker* broker, CMPIMsgFileHandle /*handle*/)
 {
     return perform("CMPIBrokerEncFT.closeMessageFile", [&](Call& call) {
         call.broker(broker);

@@ -30,7 +30,7 @@ public:
     Handle& add(std::unique_ptr<Object> content);
 
     /// How many objects were made so far: the place that a mark remembers.
-    std::size_t count() const { return blocks_.size() * HandleSpace::blockSize - free_; }
+    [[nodiscard]] std::size_t count() const { return blocks_.size() * HandleSpace::blockSize - free_; }
     /// Releases every object made since `count()` was `ordinal`.
     void releaseFrom(std::size_t ordinal) noexcept;
 
@@ -41,7 +41,7 @@ public:
 
 private:
     Handle& next();
-    Handle& at(std::size_t ordinal) const;
+    [[nodiscard]] Handle& at(std::size_t ordinal) const;
 
     Core& core_;
     std::vector<Handle*> blocks_;

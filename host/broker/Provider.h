@@ -30,7 +30,7 @@ template <class MI>
 class ManagementInterface
 {
 public:
-    /// \param create  calls the factory function, or throws ProviderError
+    /// \param create  calls the factory function, or throws
     template <class Create>
     MI& get(const Create& create)
     {
@@ -39,7 +39,7 @@ public:
             try {
                 mi_ = create();
                 state_ = State::ready;
-            } catch (const ProviderError& error) {
+            } catch (const std::exception& error) {
                 error_ = error.what();
                 state_ = State::failed;
             }
@@ -52,7 +52,7 @@ public:
     }
 
     /// Null when there is none.
-    MI* made() const { return mi_; }
+    [[nodiscard]] MI* made() const { return mi_; }
 
 private:
     enum class State

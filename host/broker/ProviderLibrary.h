@@ -29,7 +29,7 @@ public:
 
     /// The function of that name. \throws ProviderError  when there is none
     template <class Function>
-    Function* function(const std::string& name) const
+    [[nodiscard]] Function* function(const std::string& name) const
     {
         return reinterpret_cast<Function*>(symbol(name));
     }
@@ -37,10 +37,8 @@ public:
     /// Leaves it loaded when this object goes.
     void keepLoaded() { keepLoaded_ = true; }
 
-    const std::string& fileName() const { return fileName_; }
-
 private:
-    void* symbol(const std::string& name) const;
+    [[nodiscard]] void* symbol(const std::string& name) const;
 
     std::string fileName_;
     void* handle_ = nullptr;

@@ -8,8 +8,8 @@
 #include <cstdio>
 #include <cstring>
 #include <fstream>
-#include <iterator>
 #include <set>
+#include <sstream>
 #include <string_view>
 #include <utility>
 
@@ -235,10 +235,12 @@ Registration parseRegistration(const std::string& text, const std::string& name)
 Registration readRegistrationFile(const std::string& fileName)
 {
     std::ifstream file(fileName, std::ios::binary);
-    const std::string text((std::istreambuf_iterator<char>(file)), std::istreambuf_iterator<char>());
+    file.peek(); // a folder can be opened, but not read
     if (!file.is_open() || file.bad())
         throw RegistrationError(fileName + ": cannot be read: " + std::strerror(errno));
-    return parseRegistration(text, fileName);
+    std::ostringstream text;
+    text << file.rdbuf();
+    return parseRegistration(text.str(), fileName);
 }
 
 } // namespace cimhost

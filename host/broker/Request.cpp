@@ -40,7 +40,7 @@ public:
           resultHandle(scope.store().add(std::make_unique<ResultObject>()))
     {}
 
-    ResultObject& content() const { return contentOf<ResultObject>(resultHandle); }
+    [[nodiscard]] ResultObject& content() const { return contentOf<ResultObject>(resultHandle); }
 
     Core& core;
     Scope scope;
@@ -86,8 +86,10 @@ cim::Answer Request::answer(const CMPIStatus& status) const
         });
     }
     const ResultObject& content = implementation_->content();
+    answer.paths.reserve(content.paths.size());
     for (const auto& path : content.paths)
         answer.paths.push_back(*path);
+    answer.instances.reserve(content.instances.size());
     for (const auto& instance : content.instances)
         answer.instances.push_back(*instance);
     return answer;

@@ -22,7 +22,7 @@ class RoutingError : public std::runtime_error
 {
 public:
     RoutingError(CMPIrc code, const std::string& message) : std::runtime_error(message), code_(code) {}
-    CMPIrc code() const { return code_; }
+    [[nodiscard]] CMPIrc code() const { return code_; }
 
 private:
     CMPIrc code_;
@@ -34,7 +34,7 @@ class Router
 public:
     Router(Core& core, Registration registration, std::vector<std::string> directories);
 
-    const Registration& registration() const { return registration_; }
+    [[nodiscard]] const Registration& registration() const { return registration_; }
 
     /// Who serves the instances of a class in a namespace. \throws RoutingError
     Provider& instanceProvider(const std::string& className, const std::string& nameSpace);

@@ -25,9 +25,9 @@ public:
 
     ObjectStore& store() { return store_; }
     /// The next scope around this one for the same broker; null when there is none.
-    Scope* outer() const;
+    [[nodiscard]] Scope* outer() const;
     /// How many scopes of any broker this one is nested in.
-    int depth() const { return depth_; }
+    [[nodiscard]] int depth() const { return depth_; }
 
     /// The innermost scope of this thread for that broker; null when there is none.
     static Scope* innermost(const Core& core);

@@ -13,6 +13,13 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+/// Equal to a code is a status with that code and no message. In the status's own namespace, where the
+/// test macros look for it.
+inline bool operator==(const CMPIStatus& status, CMPIrc code)
+{
+    return status.rc == code && status.msg == nullptr;
+}
+
 namespace cimhost {
 
 constexpr const char* testNameSpace = "root/test";
@@ -111,11 +118,6 @@ protected:
         return written;
     }
 };
-
-inline bool operator==(const CMPIStatus& status, CMPIrc code)
-{
-    return status.rc == code && status.msg == nullptr;
-}
 
 } // namespace cimhost
 
