@@ -2,6 +2,7 @@
 
 #include <cstdlib>
 #include <strings.h>
+#include <utility>
 
 namespace cim = cimhost::cim;
 
@@ -115,7 +116,10 @@ namespace {
 
 cimhost::Registration computerSystemOnly()
 {
-    return cimhost::readRegistrationFile(TEST_COMPUTER_SYSTEM_REGISTRATION);
+    auto registration = cimhost::readRegistrationFile(TEST_COMPUTER_SYSTEM_REGISTRATION);
+    // Not the usual one, so that a test sees where a namespace comes from.
+    registration.classes.at(0).nameSpaces = {"root/test"};
+    return registration;
 }
 
 std::string textOf(const cim::Value& value);
@@ -180,8 +184,10 @@ cim::Value textValue(const std::string& text)
 
 } // namespace
 
-ProviderFixture::ProviderFixture()
-    : host(computerSystemOnly(), {TEST_PROVIDER_DIRECTORY}),
+ProviderFixture::ProviderFixture() : ProviderFixture(computerSystemOnly()) {}
+
+ProviderFixture::ProviderFixture(cimhost::Registration registration)
+    : host(std::move(registration), {TEST_PROVIDER_DIRECTORY}),
       request(std::make_unique<cimhost::Request>(host))
 {
     setComputerSystems({"alpha"});

@@ -65,11 +65,14 @@ std::string line(const std::string& module, const std::string& kind, const std::
 
 } // namespace Logged
 
-/// A test with a broker that serves TAVRO_ComputerSystem from a stand-in, and one open request.
+/// A test with a broker and one open request.
 class ProviderFixture : public ::testing::Test
 {
 protected:
+    /// A broker that serves TAVRO_ComputerSystem in root/test from a stand-in.
     ProviderFixture();
+    /// A broker that serves what a registration names.
+    explicit ProviderFixture(cimhost::Registration registration);
     ~ProviderFixture() override;
 
     /// The computer systems that the broker knows, by their names.

@@ -211,6 +211,21 @@ void dropHandle(const Object* object, Rest...)
     const_cast<Object*>(object)->hdl = nullptr;
 }
 
+/// While it lives, this thread is inside an up-call: its calls are those of other providers.
+class UpCall
+{
+public:
+    UpCall() { ++depth; }
+    ~UpCall() { --depth; }
+    UpCall(const UpCall&) = delete;
+    UpCall& operator=(const UpCall&) = delete;
+
+    static bool isRunning() { return depth > 0; }
+
+private:
+    static inline thread_local int depth = 0;
+};
+
 /// Stands in a slot of a function table.
 template <auto Slot>
 struct Layer;
@@ -223,17 +238,29 @@ struct Layer<Slot>
 
     static Result call(Arguments... arguments)
     {
+        if (UpCall::isRunning())
+            return original(arguments...);
         const auto failure = active->record(service, showAll(arguments...));
         if (!failure)
-            return original(arguments...);
+            return serve(arguments...);
         if (*failure == Failure::lostHandle) {
-            const Result result = original(arguments...);
+            const Result result = serve(arguments...);
             dropHandle(arguments...);
             return result;
         }
         if (*failure == Failure::errorStatus)
             (fillStatus(arguments), ...);
         return failed<Result>(*failure);
+    }
+
+    static Result serve(Arguments... arguments)
+    {
+        if constexpr (std::is_same_v<Table, CMPIBrokerFT>) {
+            const UpCall running;
+            return original(arguments...);
+        } else {
+            return original(arguments...);
+        }
     }
 
     static void install(Table& table, const char* name)

@@ -28,7 +28,8 @@ enum class Failure
 /// One at a time may exist. Calls are written as the service's name with its arguments in parentheses:
 /// the broker, the object's own table and out-parameters are left out, texts are quoted, objects have
 /// the names given by name() or else "path1", "instance1" and so on in the order in which they were made;
-/// a status pointer is "rc", a null pointer "null", a value is followed by its type.
+/// a status pointer is "rc", a null pointer "null", a value is followed by its type. What other providers
+/// call while they answer an up-call is neither written down nor counted.
 class RecordingBroker
 {
 public:

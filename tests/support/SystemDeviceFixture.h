@@ -1,0 +1,137 @@
+/// \file
+/// What the tests of the association TAVRO_GlimmarkSystemDevice share.
+#ifndef TESTS_SUPPORT_SYSTEMDEVICEFIXTURE_H
+#define TESTS_SUPPORT_SYSTEMDEVICEFIXTURE_H
+
+#include "EntryPoints.h"
+#include "ProviderFixture.h"
+
+#include <Tavro/Common.h>
+
+#include <memory>
+#include <string>
+#include <utility>
+#include <variant>
+#include <vector>
+
+namespace SystemDevice {
+
+inline constexpr auto association = "TAVRO_GlimmarkSystemDevice";
+inline constexpr auto module = "GlimmarkSystemDeviceProvider";
+
+/// The line of a failed enumeration of the computer systems, as Logged::lines() gives it.
+inline const std::string enumerationFailed =
+    "6000 Mavrel.GlimmarkSystemDeviceProvider MESSAGE [File: GlimmarkSystemDeviceProvider.cpp, Line]: "
+    "Call to CBEnumInstances of target Class Failed.";
+
+/// The broker's trace of a failure.
+inline std::string warning(const std::string& text)
+{
+    return "trace(2, \"GlimmarkSystemDeviceProvider\", \"" + text + "\", null)";
+}
+
+/// The making of a status message.
+inline std::string statusText(const std::string& text)
+{
+    return "newString(\"" + text + "\", null)";
+}
+
+/// The path that a key or property of one of the types refers to; fails the test where there is none.
+template <class Items>
+cimhost::cim::ObjectPath referenceAmong(const Items& items, const std::string& name)
+{
+    using Reference = std::shared_ptr<const cimhost::cim::ObjectPath>;
+    for (const auto& item : items) {
+        if (item.name != name || item.value.type != CMPI_ref || item.value.isNull)
+            continue;
+        return *std::get<Reference>(item.value.items.at(0));
+    }
+    ADD_FAILURE() << "no reference " << name;
+    return {};
+}
+
+/// Both ends as "SYSTEM DEVICE", the first by its Name and the second by its DeviceID.
+template <class Items>
+std::string pairAmong(const Items& items)
+{
+    return valueOf(referenceAmong(items, "GroupComponent"), "Name") + " " +
+           valueOf(referenceAmong(items, "PartComponent"), "DeviceID");
+}
+
+inline std::vector<std::string> pairsOf(const std::vector<cimhost::cim::ObjectPath>& paths)
+{
+    std::vector<std::string> pairs;
+    for (const auto& path : paths)
+        pairs.push_back(pairAmong(path.keys));
+    return pairs;
+}
+
+inline std::vector<std::string> pairsOf(const std::vector<cimhost::cim::Instance>& instances)
+{
+    std::vector<std::string> pairs;
+    for (const auto& instance : instances)
+        pairs.push_back(pairAmong(instance.properties));
+    return pairs;
+}
+
+/// A registration that says nothing.
+inline cimhost::Registration nobody()
+{
+    return {};
+}
+
+/// One that names a library for TAVRO_ComputerSystem that cannot be loaded.
+inline cimhost::Registration unloadable()
+{
+    cimhost::RegisteredClass entry;
+    entry.className = "TAVRO_ComputerSystem";
+    entry.provider = "TavroComputerSystemProvider";
+    entry.location = "NoSuchLibrary";
+    entry.instance = true;
+    entry.nameSpaces = {"root/test"};
+    return {{entry}};
+}
+
+/// With two indicators unless a test makes others.
+class Fixture : public ProviderFixture
+{
+protected:
+    Fixture() { MadeInventory::set({{"b", "2"}, {"a", "1"}}); }
+    explicit Fixture(cimhost::Registration registration) : ProviderFixture(std::move(registration))
+    {
+        MadeInventory::set({{"b", "2"}, {"a", "1"}});
+    }
+
+    /// What makes and fills in the path of the only indicator, once its factory function was entered.
+    /// \param path  the recording's name of that path
+    std::vector<std::string> makingOfTheDevicePath(const std::string& path) const
+    {
+        return {"getNameSpace(ref, rc)",
+                R"(getCharPtr("root/test", rc))",
+                R"(newObjectPath("root/test", "TAVRO_Glimmark", rc))",
+                "getNameSpace(ref, rc)",
+                R"(getCharPtr("root/test", rc))",
+                "setNameSpace(" + path + R"(, "root/test"))",
+                "setHostname(" + path + ", " + quotedHost + ")",
+                "addKey(" + path + R"(, "CreationClassName", "TAVRO_Glimmark", chars))",
+                "addKey(" + path + R"(, "DeviceID", "a:/1", chars))",
+                "addKey(" + path + R"(, "SystemCreationClassName", "TAVRO_ComputerSystem", chars))",
+                "addKey(" + path + R"(, "SystemName", )" + quotedHost + ", chars)"};
+    }
+
+    const std::string quotedHost = '"' + Tavro::getSystemName() + '"';
+    const std::vector<std::string> resultServices{"returnObjectPath", "returnInstance", "returnDone"};
+};
+
+/// Lists of calls and lines, one after the other.
+template <class... Lists>
+std::vector<std::string> joined(const std::vector<std::string>& first, const Lists&... others)
+{
+    std::vector<std::string> all = first;
+    (all.insert(all.end(), others.begin(), others.end()), ...);
+    return all;
+}
+
+} // namespace SystemDevice
+
+#endif
