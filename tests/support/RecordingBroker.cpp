@@ -385,11 +385,12 @@ std::optional<Failure> RecordingBroker::record(const std::string& service,
     const std::lock_guard lock(mutex);
     recorded.push_back(call + ")");
     linesBefore.push_back(RecordedLog::count());
+    std::optional<Failure> failure;
     for (Plan& plan : plans) {
         if (plan.service == service && --plan.remaining == 0)
-            return plan.failure;
+            failure = plan.failure;
     }
-    return std::nullopt;
+    return failure;
 }
 
 std::string RecordingBroker::nameOf(const void* object, const std::string& kind)
