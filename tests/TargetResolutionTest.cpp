@@ -42,9 +42,8 @@ protected:
     /// Both functions' parameter list, with the fixture's status.
     std::string parameters(const CMPIObjectPath* from, const char* assocClass, const char* resultClass)
     {
-        return Logged::parameters(" broker=", host.cmpiBroker(), " ref=", from,
-                                  " _RefLeftClass=", assocClass, " _RefRightClass=", resultClass,
-                                  " rc=", &rc);
+        return Logged::parameters(" broker=", host.cmpiBroker(), " ref=", from, " _RefLeftClass=", assocClass,
+                                  " _RefRightClass=", resultClass, " rc=", &rc);
     }
 
     // Without any record: the resolution reads none.
@@ -77,22 +76,21 @@ protected:
 
 INSTANTIATE_TEST_SUITE_P(
     , KnownWays,
-    ::testing::Values(Way{"SystemToDevice", "TAVRO_ComputerSystem", "TAVRO_GlimmarkSystemDevice",
-                          "TAVRO_Glimmark", 1,
-                          R"(trace(1, "GlimmarkSystemDeviceProvider", "Target Class is GlimmarkClass", null))"},
-                      Way{"DeviceToSystem", "TAVRO_Glimmark", "TAVRO_GlimmarkSystemDevice",
-                          "TAVRO_ComputerSystem", 2,
-                          R"(trace(1, "GlimmarkSystemDeviceProvider", )"
-                          R"("Target Class is ComputerSystemClass", null))"},
-                      Way{"DeviceToCapabilities", "TAVRO_Glimmark", "TAVRO_GlimmarkElementCapabilities",
-                          "TAVRO_GlimmarkCapabilities", 3,
-                          R"(trace(1, "GlimmarkElementCapabilitiesProvider", )"
-                          R"("Target Class is GlimmarkCapabilitiesClass", null))"},
-                      Way{"CapabilitiesToDevice", "TAVRO_GlimmarkCapabilities",
-                          "TAVRO_GlimmarkElementCapabilities", "TAVRO_Glimmark", 4,
-                          R"(trace(1, "GlimmarkElementCapabilitiesProvider", )"
-                          R"("Target Class is GlimmarkClass", null))"}),
-    [](const auto& info) { return info.param.name; });
+    ::testing::Values(
+        Way{"SystemToDevice", "TAVRO_ComputerSystem", "TAVRO_GlimmarkSystemDevice", "TAVRO_Glimmark", 1,
+            R"(trace(1, "GlimmarkSystemDeviceProvider", "Target Class is GlimmarkClass", null))"},
+        Way{"DeviceToSystem", "TAVRO_Glimmark", "TAVRO_GlimmarkSystemDevice", "TAVRO_ComputerSystem", 2,
+            R"(trace(1, "GlimmarkSystemDeviceProvider", )"
+            R"("Target Class is ComputerSystemClass", null))"},
+        Way{"DeviceToCapabilities", "TAVRO_Glimmark", "TAVRO_GlimmarkElementCapabilities",
+            "TAVRO_GlimmarkCapabilities", 3,
+            R"(trace(1, "GlimmarkElementCapabilitiesProvider", )"
+            R"("Target Class is GlimmarkCapabilitiesClass", null))"},
+        Way{"CapabilitiesToDevice", "TAVRO_GlimmarkCapabilities", "TAVRO_GlimmarkElementCapabilities",
+            "TAVRO_Glimmark", 4,
+            R"(trace(1, "GlimmarkElementCapabilitiesProvider", )"
+            R"("Target Class is GlimmarkClass", null))"}),
+    [](const auto& test) { return test.param.name; });
 
 /// A class and an association that does not start from it.
 struct NoWay
@@ -112,22 +110,20 @@ class UnknownWays : public TargetResolution, public ::testing::WithParamInterfac
 
 INSTANTIATE_TEST_SUITE_P(
     , UnknownWays,
-    ::testing::Values(NoWay{"CapabilitiesToSystem", "TAVRO_GlimmarkCapabilities",
-                            "TAVRO_GlimmarkSystemDevice"},
-                      NoWay{"SystemToCapabilities", "TAVRO_ComputerSystem",
-                            "TAVRO_GlimmarkElementCapabilities"},
-                      NoWay{"SourceInSmallLetters", "tavro_glimmark", "TAVRO_GlimmarkSystemDevice"},
-                      NoWay{"SourceInCapitals", "TAVRO_GLIMMARK", "TAVRO_GlimmarkElementCapabilities"},
-                      NoWay{"BaseOfTheDevice", "CIM_AlarmDevice", "TAVRO_GlimmarkElementCapabilities"},
-                      NoWay{"BaseOfTheSystem", "CIM_ComputerSystem", "TAVRO_GlimmarkSystemDevice"},
-                      NoWay{"LongerSource", "TAVRO_GlimmarkX", "TAVRO_GlimmarkSystemDevice"},
-                      NoWay{"ShorterSource", "TAVRO_Glimmar", "TAVRO_GlimmarkSystemDevice"},
-                      NoWay{"AssociationItself", "TAVRO_GlimmarkSystemDevice", "TAVRO_GlimmarkSystemDevice"},
-                      NoWay{"AssociationInSmallLetters", "TAVRO_Glimmark", "tavro_glimmarksystemdevice"},
-                      NoWay{"BaseOfTheAssociation", "TAVRO_Glimmark", "CIM_SystemDevice"},
-                      NoWay{"EmptyAssociation", "TAVRO_Glimmark", ""},
-                      NoWay{"NoAssociation", "TAVRO_Glimmark", nullptr}),
-    [](const auto& info) { return info.param.name; });
+    ::testing::Values(
+        NoWay{"CapabilitiesToSystem", "TAVRO_GlimmarkCapabilities", "TAVRO_GlimmarkSystemDevice"},
+        NoWay{"SystemToCapabilities", "TAVRO_ComputerSystem", "TAVRO_GlimmarkElementCapabilities"},
+        NoWay{"SourceInSmallLetters", "tavro_glimmark", "TAVRO_GlimmarkSystemDevice"},
+        NoWay{"SourceInCapitals", "TAVRO_GLIMMARK", "TAVRO_GlimmarkElementCapabilities"},
+        NoWay{"BaseOfTheDevice", "CIM_AlarmDevice", "TAVRO_GlimmarkElementCapabilities"},
+        NoWay{"BaseOfTheSystem", "CIM_ComputerSystem", "TAVRO_GlimmarkSystemDevice"},
+        NoWay{"LongerSource", "TAVRO_GlimmarkX", "TAVRO_GlimmarkSystemDevice"},
+        NoWay{"ShorterSource", "TAVRO_Glimmar", "TAVRO_GlimmarkSystemDevice"},
+        NoWay{"AssociationItself", "TAVRO_GlimmarkSystemDevice", "TAVRO_GlimmarkSystemDevice"},
+        NoWay{"AssociationInSmallLetters", "TAVRO_Glimmark", "tavro_glimmarksystemdevice"},
+        NoWay{"BaseOfTheAssociation", "TAVRO_Glimmark", "CIM_SystemDevice"},
+        NoWay{"EmptyAssociation", "TAVRO_Glimmark", ""}, NoWay{"NoAssociation", "TAVRO_Glimmark", nullptr}),
+    [](const auto& test) { return test.param.name; });
 
 } // namespace
 
@@ -190,9 +186,8 @@ TEST_P(KnownWays, EndTheParameterListAtANullResultClass)
 TEST_P(KnownWays, NeedNoStatus)
 {
     const CMPIObjectPath* const from = ref(GetParam().from);
-    EXPECT_STREQ(
-        factory.get_assoc_targetClass_Name(host.cmpiBroker(), from, assocClass, nullptr, nullptr),
-        GetParam().to);
+    EXPECT_STREQ(factory.get_assoc_targetClass_Name(host.cmpiBroker(), from, assocClass, nullptr, nullptr),
+                 GetParam().to);
     EXPECT_THAT(broker.calls({"getClassName"}), Each("getClassName(ref, null)"));
 }
 
@@ -222,8 +217,8 @@ TEST_F(TargetResolution, ANullAssociationClassEndsTheParameterList)
 {
     const CMPIObjectPath* const from = ref("TAVRO_Glimmark");
     nameFrom(from, nullptr, "CIM_LogicalElement");
-    const std::string list = Logged::parameters(" broker=", host.cmpiBroker(), " ref=", from,
-                                                " _RefLeftClass=");
+    const std::string list =
+        Logged::parameters(" broker=", host.cmpiBroker(), " ref=", from, " _RefLeftClass=");
     EXPECT_THAT(Logged::linesOf(forName), ElementsAre(Logged::line(module, "ENTERING", forName, list)));
 }
 

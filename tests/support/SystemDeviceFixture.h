@@ -102,6 +102,15 @@ protected:
         MadeInventory::set({{"b", "2"}, {"a", "1"}});
     }
 
+    /// Ends the request and opens another, with nothing recorded so far.
+    void startAnew()
+    {
+        request.reset();
+        request = std::make_unique<cimhost::Request>(host);
+        clearRecords();
+        broker.name(request->context(), "ctx");
+    }
+
     /// What makes and fills in the path of the only indicator, once its factory function was entered.
     /// \param path  the recording's name of that path
     std::vector<std::string> makingOfTheDevicePath(const std::string& path) const
