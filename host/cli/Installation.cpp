@@ -4,10 +4,10 @@
 #include "cli/Arguments.h"
 
 #include <algorithm>
-#include <array>
 #include <cerrno>
 #include <cstdlib>
 #include <fstream>
+#include <initializer_list>
 #include <sstream>
 #include <system_error>
 
@@ -33,10 +33,17 @@ std::vector<std::string> splitAtColons(const std::string& list)
     return parts;
 }
 
-bool isDirectory(const fs::path& path)
+/// The first of these directories, given from the program's, that there is.
+std::optional<fs::path> findDirectory(const fs::path& programDirectory,
+                                      std::initializer_list<const char*> candidates)
 {
-    std::error_code ignored;
-    return fs::is_directory(path, ignored);
+    for (const char* candidate : candidates) {
+        std::error_code ignored;
+        const fs::path directory = (programDirectory / candidate).lexically_normal();
+        if (fs::is_directory(directory, ignored))
+            return directory;
+    }
+    return std::nullopt;
 }
 
 std::vector<std::string> registrationFilesIn(const fs::path& directory)
@@ -79,12 +86,9 @@ std::vector<std::string> findProviderDirectories(const Settings& settings, const
         return settings.providerDirectories;
     if (surroundings.providerDirs)
         return splitAtColons(*surroundings.providerDirs);
-    for (const char* directory : {CIMHOST_PROVIDERDIR_FROM_BIN, "../lib"}) {
-        const fs::path path = (surroundings.programDirectory / directory).lexically_normal();
-        if (isDirectory(path))
-            return {path.string()};
-    }
-    return {};
+    const std::optional<fs::path> directory =
+        findDirectory(surroundings.programDirectory, {CIMHOST_PROVIDERDIR_FROM_BIN, "../lib"});
+    return directory ? std::vector<std::string>{directory->string()} : std::vector<std::string>{};
 }
 
 std::vector<std::string> findRegistrationFiles(const Settings& settings, const Surroundings& surroundings)
@@ -93,11 +97,12 @@ std::vector<std::string> findRegistrationFiles(const Settings& settings, const S
         return settings.registrationFiles;
     if (surroundings.registrationFiles)
         return splitAtColons(*surroundings.registrationFiles);
-    const fs::path directory = (surroundings.programDirectory / CIMHOST_DATADIR_FROM_BIN).lexically_normal();
-    std::vector<std::string> files = registrationFilesIn(directory);
+    const std::optional<fs::path> directory =
+        findDirectory(surroundings.programDirectory, {CIMHOST_SCHEMADIR_FROM_BIN, "../schema"});
+    std::vector<std::string> files = directory ? registrationFilesIn(*directory) : std::vector<std::string>{};
     if (files.empty())
-        throw UsageError("no registration of providers: " + directory.string() +
-                         " has no .reg file; name one with --registration or CIMHOST_REGISTRATION");
+        throw UsageError("no registration of providers is installed beside the program; name a file with "
+                         "--registration or CIMHOST_REGISTRATION");
     return files;
 }
 

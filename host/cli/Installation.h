@@ -30,7 +30,7 @@ Surroundings readSurroundings();
 std::vector<std::string> findProviderDirectories(const Settings& settings, const Surroundings& surroundings);
 
 /// The files of the command line; without any, those of the environment; without these, every .reg
-/// file, by name, in the data directory of the tree that the executable stands in, installed or built.
+/// file, by name, in the schema directory of the tree that the executable stands in, installed or built.
 /// \throws UsageError  there is none
 std::vector<std::string> findRegistrationFiles(const Settings& settings, const Surroundings& surroundings);
 

@@ -8,8 +8,8 @@
 #include "cli/ValueWords.h"
 
 #include <algorithm>
-#include <array>
 #include <functional>
+#include <iterator>
 #include <string_view>
 
 namespace cimhost::cli {
@@ -84,8 +84,8 @@ std::vector<std::string> keyNames(const std::vector<cim::ObjectPath>& paths)
 std::vector<cim::ObjectPath> pathsOf(const std::vector<cim::Instance>& instances)
 {
     std::vector<cim::ObjectPath> paths;
-    for (const cim::Instance& instance : instances)
-        paths.push_back(instance.path);
+    std::transform(instances.begin(), instances.end(), std::back_inserter(paths),
+                   [](const cim::Instance& instance) { return instance.path; });
     return paths;
 }
 

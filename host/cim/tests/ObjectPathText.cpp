@@ -162,7 +162,7 @@ TEST(ObjectPathWriter, writesEveryPart)
     const ObjectPath path{"srv:5988",
                           "root/cimv2",
                           "CIM_A",
-                          {{"S", textValue("a \"b\" \\c")},
+                          {{"S", textValue(R"(a "b" \c)")},
                            {"U", unsignedValue(UINT64_MAX)},
                            {"I", signedValue(INT64_MIN)},
                            {"R", realValue(5)},

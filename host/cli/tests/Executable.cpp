@@ -41,7 +41,7 @@ protected:
     }
 
     /// Runs a line of the shell, in which $CIMHOST is the program. \return its exit status
-    int shell(const std::string& line) const
+    [[nodiscard]] int shell(const std::string& line) const
     {
         const std::string out = (directory.path() / "out").string();
         const std::string err = (directory.path() / "err").string();
@@ -49,8 +49,8 @@ protected:
         return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
     }
 
-    std::string out() const { return readFile(directory.path() / "out"); }
-    std::string err() const { return readFile(directory.path() / "err"); }
+    [[nodiscard]] std::string out() const { return readFile(directory.path() / "out"); }
+    [[nodiscard]] std::string err() const { return readFile(directory.path() / "err"); }
 
     TemporaryDirectory directory;
 };
@@ -110,9 +110,9 @@ TEST_F(Executable, findsProvidersAndRegistrationsBesideItself)
     std::filesystem::create_directory_symlink(SAMPLE_PROVIDER_DIRECTORY, directory.path() / "lib");
     const std::string program = directory.folder("bin") + "/cimhost";
     std::filesystem::copy_file(CIMHOST_EXECUTABLE, program);
-    std::filesystem::create_directories(directory.path() / "bin" / CIMHOST_DATADIR_FROM_BIN);
+    std::filesystem::create_directories(directory.path() / "bin" / CIMHOST_SCHEMADIR_FROM_BIN);
     std::filesystem::copy_file(SAMPLE_REGISTRATION,
-                               directory.path() / "bin" / CIMHOST_DATADIR_FROM_BIN / "sample.reg");
+                               directory.path() / "bin" / CIMHOST_SCHEMADIR_FROM_BIN / "sample.reg");
     TearDown();
     EXPECT_EQ(shell(program + " ein CIMT_RackSystem"), 0);
     EXPECT_EQ(out(), "root/cimv2:CIMT_RackSystem.Name=\"rack-1\"\n");

@@ -16,11 +16,19 @@ using testing::IsEmpty;
 
 namespace {
 
+std::string normal(const std::string& file)
+{
+    return std::filesystem::path(file).lexically_normal().string();
+}
+
 /// A tree with a program in its folder bin.
 class Installation : public testing::Test
 {
 protected:
-    Surroundings surroundings() const { return {tree.folder("bin"), std::nullopt, std::nullopt}; }
+    [[nodiscard]] Surroundings surroundings() const
+    {
+        return {tree.folder("bin"), std::nullopt, std::nullopt};
+    }
 
     TemporaryDirectory tree;
     Settings settings;
@@ -47,8 +55,7 @@ TEST_F(Installation, providersAreInTheInstalledTree)
     const std::string built = tree.folder("x/../lib");
     Surroundings around = surroundings();
     around.programDirectory = tree.folder("x");
-    EXPECT_THAT(findProviderDirectories(settings, around),
-                ElementsAre(std::filesystem::path(directory).lexically_normal().string()));
+    EXPECT_THAT(findProviderDirectories(settings, around), ElementsAre(normal(directory)));
 }
 
 TEST_F(Installation, providersAreInTheBuildTree)
@@ -77,27 +84,33 @@ TEST_F(Installation, theEnvironmentListsRegistrations)
     EXPECT_THAT(findRegistrationFiles(settings, around), ElementsAre("b.reg", "c.reg"));
 }
 
-TEST_F(Installation, registrationsAreInTheDataDirectory)
+TEST_F(Installation, registrationsAreInTheInstalledTree)
 {
-    const std::string data = "bin/" CIMHOST_DATADIR_FROM_BIN "/";
     const Surroundings around = surroundings();
-    const std::string second = tree.file(data + "b.reg", "");
-    const std::string first = tree.file(data + "a.reg", "");
-    const std::string other = tree.file(data + "a.mof", "");
-    const auto normal = [](const std::string& file) {
-        return std::filesystem::path(file).lexically_normal().string();
-    };
+    const std::string second = tree.file("bin/" CIMHOST_SCHEMADIR_FROM_BIN "/b.reg", "");
+    const std::string first = tree.file("bin/" CIMHOST_SCHEMADIR_FROM_BIN "/a.reg", "");
+    const std::string other = tree.file("bin/" CIMHOST_SCHEMADIR_FROM_BIN "/a.mof", "");
+    const std::string built = tree.file("schema/c.reg", "");
     EXPECT_THAT(findRegistrationFiles(settings, around), ElementsAre(normal(first), normal(second)));
+}
+
+TEST_F(Installation, registrationsAreInTheBuildTree)
+{
+    const std::string file = tree.file("schema/c.reg", "");
+    EXPECT_THAT(findRegistrationFiles(settings, surroundings()), ElementsAre(normal(file)));
 }
 
 TEST_F(Installation, withoutRegistrationsNothingCanBeDone)
 {
-    try {
-        findRegistrationFiles(settings, surroundings());
-        FAIL();
-    } catch (const UsageError& error) {
-        EXPECT_THAT(error.what(), HasSubstr("no registration of providers: " + tree.path().string()));
-        EXPECT_THAT(error.what(), HasSubstr("--registration or CIMHOST_REGISTRATION"));
+    for (const bool hasEmptyDirectory : {false, true}) {
+        if (hasEmptyDirectory)
+            EXPECT_NE(tree.folder("schema"), "");
+        try {
+            findRegistrationFiles(settings, surroundings());
+            FAIL();
+        } catch (const UsageError& error) {
+            EXPECT_THAT(error.what(), HasSubstr("--registration or CIMHOST_REGISTRATION"));
+        }
     }
 }
 

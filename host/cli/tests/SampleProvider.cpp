@@ -4,10 +4,13 @@
 #include <cmpidt.h>
 #include <cmpift.h>
 
+#include <array>
 #include <cstdlib>
+#include <initializer_list>
 #include <string>
-#include <strings.h>
 #include <vector>
+
+#include <strings.h>
 
 namespace {
 
@@ -88,9 +91,9 @@ CMPIObjectPath* lampPath(const CMPIObjectPath* request, const Lamp& lamp)
 
 CMPIInstance* rackInstance(const CMPIObjectPath* request, const char** properties)
 {
-    static const char* keys[] = {"Name", nullptr};
+    std::array<const char*, 2> keys{"Name", nullptr};
     CMPIInstance* instance = broker->eft->newInstance(broker, rackPath(request), nullptr);
-    instance->ft->setPropertyFilter(instance, properties, keys);
+    instance->ft->setPropertyFilter(instance, properties, keys.data());
     instance->ft->setProperty(instance, "Name", chars(rackName), CMPI_chars);
     instance->ft->setProperty(instance, "ElementName", chars("Rack <1> & \"co\""), CMPI_chars);
     CMPIValue enabled{};
@@ -108,9 +111,9 @@ void setNumber(CMPIInstance* instance, const char* name, CMPIUint16 number)
 
 CMPIInstance* lampInstance(const CMPIObjectPath* request, const char** properties, const Lamp& lamp)
 {
-    static const char* keys[] = {"CreationClassName", "DeviceID", nullptr};
+    std::array<const char*, 3> keys{"CreationClassName", "DeviceID", nullptr};
     CMPIInstance* instance = broker->eft->newInstance(broker, lampPath(request, lamp), nullptr);
-    instance->ft->setPropertyFilter(instance, properties, keys);
+    instance->ft->setPropertyFilter(instance, properties, keys.data());
     instance->ft->setProperty(instance, "CreationClassName", chars("CIMT_Lamp"), CMPI_chars);
     instance->ft->setProperty(instance, "DeviceID", chars(lamp.deviceId), CMPI_chars);
     instance->ft->setProperty(instance, "Name", chars(lamp.name), CMPI_chars);
