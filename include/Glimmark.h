@@ -33,16 +33,16 @@ public:
     Glimmark() = default;
 
     /// The identifier without leading and trailing blanks; the stored one keeps them.
-    std::string getDeviceID() const;
+    [[nodiscard]] std::string getDeviceID() const;
     /// The name without leading and trailing blanks; the stored one keeps them.
-    std::string getElementName() const;
-    unsigned int getRequestedState() const;
-    unsigned int getHealthState() const;
-    std::vector<std::uint16_t> getOperationalStatus() const;
-    bool getAudibleAlarm() const;
-    bool getVisibleAlarm() const;
-    bool getMotionAlarm() const;
-    std::uint16_t getAlarmState() const;
+    [[nodiscard]] std::string getElementName() const;
+    [[nodiscard]] unsigned int getRequestedState() const;
+    [[nodiscard]] unsigned int getHealthState() const;
+    [[nodiscard]] std::vector<std::uint16_t> getOperationalStatus() const;
+    [[nodiscard]] bool getAudibleAlarm() const;
+    [[nodiscard]] bool getVisibleAlarm() const;
+    [[nodiscard]] bool getMotionAlarm() const;
+    [[nodiscard]] std::uint16_t getAlarmState() const;
 
     /// \return false for an empty identifier, which is stored all the same
     bool setDeviceID(const std::string& deviceID);

@@ -45,7 +45,7 @@ public:
     GlimmarkFactory& operator=(const GlimmarkFactory&) = delete;
 
     /// Number of indicators with different identifiers.
-    int getNumberOfInstances() const;
+    [[nodiscard]] int getNumberOfInstances() const;
 
     // Alarm devices: TAVRO_Glimmark.
 

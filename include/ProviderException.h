@@ -13,14 +13,14 @@ namespace Tavro {
 class ProviderException : public std::exception
 {
 public:
-    /// \param message  copied; not null
-    explicit ProviderException(const char* message);
+    /// \param text  the message; copied; not null
+    explicit ProviderException(const char* text);
     ProviderException(const ProviderException& other);
     ProviderException& operator=(const ProviderException&) = delete;
     ~ProviderException() override;
 
     /// The message; lives as long as the exception.
-    const char* what() const noexcept override;
+    [[nodiscard]] const char* what() const noexcept override;
 
 private:
     std::string message;

@@ -161,7 +161,7 @@ struct TypedValue
     CMPIValue value;
     const char* text; ///< only for CMPI_chars
 
-    const CMPIValue* pointer() const
+    [[nodiscard]] const CMPIValue* pointer() const
     {
         return type == CMPI_chars ? reinterpret_cast<const CMPIValue*>(text) : &value;
     }
