@@ -5,15 +5,12 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-using ::testing::AllOf;
-using ::testing::Contains;
 using ::testing::Each;
 using ::testing::ElementsAre;
 using ::testing::ElementsAreArray;
 using ::testing::EndsWith;
 using ::testing::HasSubstr;
 using ::testing::IsEmpty;
-using ::testing::Not;
 using ::testing::SizeIs;
 using ::testing::StartsWith;
 
@@ -36,10 +33,10 @@ const std::string forBuilder = "glimmarkSystemDeviceCMPIInstances";
 const std::string forPaths = "getAllGlimmarkCMPIObjPaths";
 const std::string noKeys = "At least one key should be passed";
 
-std::string blanks(std::size_t number)
-{
-    return std::string(number, ' ');
-}
+// Runs of blanks that are parts of texts.
+const std::string twelveBlanks(12, ' ');
+const std::string thirteenBlanks(13, ' ');
+const std::string twentyOneBlanks(21, ' ');
 
 class SystemDeviceInstances : public SystemDevice::Fixture
 {
@@ -377,9 +374,9 @@ TEST_F(SystemDeviceInstances, NamesEndAtADevicePathWithoutAHandle)
 TEST_F(SystemDeviceInstances, NamesEndAtAnAssociationPathThatCannotBeMade)
 {
     const std::string text =
-        "Create CMPIObjectPath failed" + blanks(21) + "for GlimmarkSystemDeviceProvider.";
+        "Create CMPIObjectPath failed" + twentyOneBlanks + "for GlimmarkSystemDeviceProvider.";
     const std::string traceText =
-        "Create CMPIObjectPath failed for" + blanks(21) + "GlimmarkSystemDeviceClass.";
+        "Create CMPIObjectPath failed for" + twentyOneBlanks + "GlimmarkSystemDeviceClass.";
     for (const Failure failure : {Failure::nullResult, Failure::noHandle, Failure::errorStatus}) {
         clearRecords();
         broker.fail("newObjectPath", 5, failure); // the second association's
@@ -509,7 +506,8 @@ TEST_F(SystemDeviceInstances, InstancesWithoutSystemsAreNoneAndTheBuildIsComplet
 
 TEST_F(SystemDeviceInstances, InstancesNeedTheClassPathOfTheSystems)
 {
-    const std::string traceText = "Create CMPIObjectPath failed for" + blanks(13) + "ComputerSystemClass.";
+    const std::string traceText =
+        "Create CMPIObjectPath failed for" + thirteenBlanks + "ComputerSystemClass.";
     for (const Failure failure : {Failure::nullResult, Failure::noHandle, Failure::errorStatus}) {
         startAnew();
         broker.fail("newObjectPath", 1, failure);
@@ -518,7 +516,7 @@ TEST_F(SystemDeviceInstances, InstancesNeedTheClassPathOfTheSystems)
                     ElementsAre("ENTERING " + forInstances, "ENTERING " + forBuilder, "ENTERING setVector",
                                 "EXITING setVector", "getNameSpace(ref, rc)", "getCharPtr(\"root/test\", rc)",
                                 "newObjectPath(\"root/test\", \"TAVRO_ComputerSystem\", rc)",
-                                statusText("Create CMPIObjectPath" + blanks(12) + "failed."),
+                                statusText("Create CMPIObjectPath" + twelveBlanks + "failed."),
                                 warning(traceText), "EXITING " + forInstances, "returnDone()"));
     }
 }
@@ -588,7 +586,7 @@ TEST_F(SystemDeviceInstances, InstancesAreNoneAtADevicePathWithoutAHandle)
 
 TEST_F(SystemDeviceInstances, AnAssociationPathThatCannotBeMadeIsReportedAndLeavesANullInstance)
 {
-    const std::string traceText = "Create CMPIObjectPath failed for" + blanks(21) + "HostedAccessPoint.";
+    const std::string traceText = "Create CMPIObjectPath failed for" + twentyOneBlanks + "HostedAccessPoint.";
     for (const Failure failure : {Failure::nullResult, Failure::noHandle, Failure::errorStatus}) {
         startAnew();
         broker.fail("newObjectPath", 4, failure); // the first association's

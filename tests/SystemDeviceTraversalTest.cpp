@@ -251,7 +251,7 @@ protected:
                         IsEmpty());
         }
     }
-    Asked asked() const
+    static Asked asked()
     {
         Asked arguments;
         arguments.resultClass = GetParam().resultClass;

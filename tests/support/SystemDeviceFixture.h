@@ -27,13 +27,13 @@ inline const std::string enumerationFailed =
 /// The broker's trace of a failure.
 inline std::string warning(const std::string& text)
 {
-    return "trace(2, \"GlimmarkSystemDeviceProvider\", \"" + text + "\", null)";
+    return R"(trace(2, "GlimmarkSystemDeviceProvider", ")" + text + R"(", null))";
 }
 
 /// The making of a status message.
 inline std::string statusText(const std::string& text)
 {
-    return "newString(\"" + text + "\", null)";
+    return R"(newString(")" + text + R"(", null))";
 }
 
 /// The path that a key or property of one of the types refers to; fails the test where there is none.
@@ -61,6 +61,7 @@ std::string pairAmong(const Items& items)
 inline std::vector<std::string> pairsOf(const std::vector<cimhost::cim::ObjectPath>& paths)
 {
     std::vector<std::string> pairs;
+    pairs.reserve(paths.size());
     for (const auto& path : paths)
         pairs.push_back(pairAmong(path.keys));
     return pairs;
@@ -69,6 +70,7 @@ inline std::vector<std::string> pairsOf(const std::vector<cimhost::cim::ObjectPa
 inline std::vector<std::string> pairsOf(const std::vector<cimhost::cim::Instance>& instances)
 {
     std::vector<std::string> pairs;
+    pairs.reserve(instances.size());
     for (const auto& instance : instances)
         pairs.push_back(pairAmong(instance.properties));
     return pairs;
