@@ -2,6 +2,8 @@
 # older ones without any `const`, and newer ones with more slots at the end of each table. Run as
 #   cmake -DCOMPILER=... -DSOURCE_DIR=DIR -DWORK_DIR=DIR -DFLAGS="-I...;..." -P THIS
 
+cmake_minimum_required(VERSION 3.20)
+
 file(STRINGS ${SOURCE_DIR}/src/CMakeLists.txt lines REGEX "^ +[a-z]+/[A-Za-z]+\\.cpp\\)?$")
 list(TRANSFORM lines REPLACE "[ )]" "")
 list(TRANSFORM lines PREPEND ${SOURCE_DIR}/src/ OUTPUT_VARIABLE sources)

@@ -1,6 +1,8 @@
 # Holds the built provider library to what brokers and makers rely on. Run as
 #   cmake -DLIBRARY=FILE -DREADELF=... -DNM=... -P THIS
 
+cmake_minimum_required(VERSION 3.20)
+
 function(run output)
     execute_process(COMMAND ${ARGN} OUTPUT_VARIABLE text COMMAND_ERROR_IS_FATAL ANY)
     set(${output} "${text}" PARENT_SCOPE)

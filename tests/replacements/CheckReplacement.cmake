@@ -1,6 +1,8 @@
 # Runs a request with the libraries of a directory first on the loader's path, and without. Run as
 #   cmake -DCIMHOST=FILE -DDIRECTORY=DIR -DEXPECTED=TEXT -DINVENTORY=FILE -P THIS
 
+cmake_minimum_required(VERSION 3.20)
+
 function(ask output)
     execute_process(
         COMMAND ${CMAKE_COMMAND} -E env ${ARGN} ${CIMHOST} --inventory ${INVENTORY} ei TAVRO_Glimmark --format json
