@@ -7,41 +7,17 @@
 #include "cli/ValueWords.h"
 
 #include <algorithm>
-#include <array>
 #include <optional>
 #include <ostream>
 #include <string_view>
-#include <utility>
 #include <vector>
 
 namespace cimhost::cli {
 
 namespace {
 
-/// A line that the reader of the graph should know of: an error, something left out.
-using Remarks = std::vector<std::string>;
-
-struct End
-{
-    std::string role;
-    cim::ObjectPath path;
-};
-
-struct Edge
-{
-    std::string className;
-    End from;
-    End to;
-};
-
-/// What the providers answered.
-struct Picture
-{
-    std::vector<cim::Instance> nodes;
-    std::vector<Edge> edges;
-    Remarks remarks;
-    bool anyAnswer = false;
-};
+using End = Picture::End;
+using Edge = Picture::Edge;
 
 // Asking the providers
 
@@ -61,16 +37,22 @@ std::vector<RegisteredClass> instanceClasses(const Registration& registration, c
     return classes;
 }
 
+/// The one item of a scalar that holds such an item; null: it does not.
+template <typename Item>
+const Item* soleItem(const cim::Value& value)
+{
+    return value.items.size() == 1 && !cim::isArray(value) ? std::get_if<Item>(&value.items.front())
+                                                           : nullptr;
+}
+
 template <typename Named>
 std::vector<End> endsAmong(const std::vector<Named>& values)
 {
     std::vector<End> ends;
     for (const Named& item : values) {
-        if (item.value.type != CMPI_ref || item.value.isNull)
-            continue;
-        const auto& path = std::get<std::shared_ptr<const cim::ObjectPath>>(item.value.items.front());
-        if (path)
-            ends.push_back({item.name, *path});
+        const auto* path = soleItem<std::shared_ptr<const cim::ObjectPath>>(item.value);
+        if (path != nullptr && *path)
+            ends.push_back({item.name, **path});
     }
     return ends;
 }
@@ -79,33 +61,6 @@ std::vector<End> endsOf(const cim::Instance& instance)
 {
     std::vector<End> ends = endsAmong(instance.properties);
     return ends.empty() ? endsAmong(instance.path.keys) : ends;
-}
-
-void add(const cim::Instance& instance, const RegisteredClass& entry, Picture& picture)
-{
-    const std::vector<End> ends = endsOf(instance);
-    if (ends.size() >= 2)
-        picture.edges.push_back({instance.path.className, ends[0], ends[1]});
-    else if (entry.association)
-        picture.remarks.push_back(entry.className + ": an instance that does not refer to two objects");
-    else
-        picture.nodes.push_back(instance);
-}
-
-Picture askProviders(const std::string& nameSpace, Broker& broker)
-{
-    Picture picture;
-    for (const RegisteredClass& entry : instanceClasses(broker.registration(), nameSpace)) {
-        const cim::Answer answer = broker.enumerateInstances({"", nameSpace, entry.className, {}});
-        if (answer.status.code != CMPI_RC_OK) {
-            picture.remarks.push_back(entry.className + ": " + statusLine(answer.status));
-            continue;
-        }
-        picture.anyAnswer = true;
-        for (const cim::Instance& instance : answer.instances)
-            add(instance, entry, picture);
-    }
-    return picture;
 }
 
 // Matching references and nodes
@@ -178,31 +133,23 @@ std::string label(const std::vector<std::string>& lines)
     return '"' + text + '"';
 }
 
-std::optional<std::string> textOf(const cim::Instance& instance, std::string_view property)
+template <typename Item>
+std::optional<Item> propertyOf(const cim::Instance& instance, std::string_view property)
 {
     const cim::Value* value = cim::findProperty(instance, property);
-    if (value == nullptr || value->isNull || value->type != CMPI_string)
-        return std::nullopt;
-    const auto& text = std::get<std::string>(value->items.front());
-    return text.empty() ? std::nullopt : std::optional(text);
+    const Item* item = value != nullptr ? soleItem<Item>(*value) : nullptr;
+    return item != nullptr ? std::optional(*item) : std::nullopt;
 }
 
 /// What a person calls the instance.
 std::string nameOf(const cim::Instance& instance)
 {
-    for (const char* property : {"ElementName", "Name", "InstanceID"})
-        if (const auto text = textOf(instance, property))
+    for (const char* property : {"ElementName", "Name", "InstanceID"}) {
+        const auto text = propertyOf<std::string>(instance, property);
+        if (text && !text->empty())
             return *text;
+    }
     return cim::toText(instance.path);
-}
-
-std::optional<std::uint64_t> healthOf(const cim::Instance& instance)
-{
-    const cim::Value* value = cim::findProperty(instance, "HealthState");
-    if (value == nullptr || value->isNull || value->items.size() != 1)
-        return std::nullopt;
-    const auto* number = std::get_if<std::uint64_t>(&value->items.front());
-    return number != nullptr ? std::optional(*number) : std::nullopt;
 }
 
 std::string_view colourOf(std::optional<std::uint64_t> health)
@@ -240,7 +187,7 @@ std::string nodeLine(std::size_t index, const std::vector<std::string>& lines, c
 
 std::string nodeLine(std::size_t index, const cim::Instance& instance)
 {
-    const std::optional<std::uint64_t> health = healthOf(instance);
+    const auto health = propertyOf<std::uint64_t>(instance, "HealthState");
     const auto word = health ? valueWord("HealthState", *health) : std::nullopt;
     std::vector<std::string> lines{nameOf(instance), instance.path.className};
     if (word)
@@ -257,40 +204,64 @@ std::string edgeLine(const Edge& edge, Nodes& nodes)
            " [label=" + label({edge.className, edge.from.role + " \u2192 " + edge.to.role}) + "];\n";
 }
 
-void writeDot(const std::string& nameSpace, const Picture& picture, std::ostream& out)
+} // namespace
+
+void addInstance(const cim::Instance& instance, bool isAssociation, Picture& picture)
+{
+    const std::vector<End> ends = endsOf(instance);
+    const std::string& className = instance.path.className;
+    if (ends.size() >= 2)
+        picture.edges.push_back({className, ends[0], ends[1]});
+    else if (isAssociation)
+        picture.remarks.push_back(className + ": an instance that does not refer to two objects");
+    else
+        picture.nodes.push_back(instance);
+}
+
+std::string dot(const std::string& nameSpace, const Picture& picture)
 {
     Nodes nodes(picture.nodes);
     std::string edges;
     for (const Edge& edge : picture.edges)
         edges += edgeLine(edge, nodes);
 
-    out << "digraph " << label({nameSpace}) << " {\n"
-        << "    rankdir=LR;\n"
-        << "    node [fontname=\"sans-serif\", style=filled];\n"
-        << "    edge [fontname=\"sans-serif\", fontsize=9];\n";
+    std::string text = "digraph " + label({nameSpace}) +
+                       " {\n"
+                       "    rankdir=LR;\n"
+                       "    node [fontname=\"sans-serif\", style=filled];\n"
+                       "    edge [fontname=\"sans-serif\", fontsize=9];\n";
     for (const std::string& remark : picture.remarks)
-        out << "    // " << cim::printable(remark) << '\n';
+        text += "    // " + cim::printable(remark) + '\n';
     std::size_t index = 0;
     for (const cim::Instance& instance : nodes.instances())
-        out << nodeLine(index++, instance);
+        text += nodeLine(index++, instance);
     for (const cim::ObjectPath& path : nodes.missing())
-        out << nodeLine(index++, {cim::toText(path)}, "shape=box, style=dashed");
-    out << edges << "}\n";
+        text += nodeLine(index++, {cim::toText(path)}, "shape=box, style=dashed");
+    return text + edges + "}\n";
 }
-
-} // namespace
 
 ExitStatus writeGraph(const std::string& nameSpace, Broker& broker, std::ostream& out, std::ostream& err)
 {
-    const Picture picture = askProviders(nameSpace, broker);
+    Picture picture;
+    bool anyAnswer = false;
+    for (const RegisteredClass& entry : instanceClasses(broker.registration(), nameSpace)) {
+        const cim::Answer answer = broker.enumerateInstances({"", nameSpace, entry.className, {}});
+        if (answer.status.code != CMPI_RC_OK) {
+            picture.remarks.push_back(entry.className + ": " + statusLine(answer.status));
+            continue;
+        }
+        anyAnswer = true;
+        for (const cim::Instance& instance : answer.instances)
+            addInstance(instance, entry.association, picture);
+    }
+
     for (const std::string& remark : picture.remarks)
         err << "cimhost: " << cim::printable(remark) << '\n';
-    if (!picture.anyAnswer) {
+    if (anyAnswer)
+        out << dot(nameSpace, picture);
+    else
         err << "cimhost: no class of the namespace " << cim::printable(nameSpace) << " answered\n";
-        return exitError;
-    }
-    writeDot(nameSpace, picture, out);
-    return exitAnswered;
+    return anyAnswer ? exitAnswered : exitError;
 }
 
 } // namespace cimhost::cli

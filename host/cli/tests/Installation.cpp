@@ -104,13 +104,10 @@ TEST_F(Installation, withoutRegistrationsNothingCanBeDone)
 {
     EXPECT_THROW(findRegistrationFiles(settings, surroundings()), UsageError);
     const std::string empty = tree.folder("schema");
-    try
-    {
+    try {
         findRegistrationFiles(settings, surroundings());
         FAIL() << empty;
-    }
-    catch (const UsageError& error)
-    {
+    } catch (const UsageError& error) {
         EXPECT_THAT(error.what(), HasSubstr("--registration or CIMHOST_REGISTRATION"));
     }
 }
