@@ -1,0 +1,159 @@
+// The project's MOF against the rules, and against what the providers answer.
+
+#include "Answers.h"
+#include "ProjectClasses.h"
+#include "Rules.h"
+
+#include "broker/Broker.h"
+#include "testing/Environment.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+namespace {
+
+using cimhost::cim::Answer;
+using cimhost::cim::Instance;
+using cimhost::cim::ObjectPath;
+using PlatformTesting::Environment;
+using schema::Class;
+using schema::Classes;
+using testing::IsEmpty;
+using testing::Not;
+using testing::UnorderedElementsAre;
+
+std::vector<std::string> classNames()
+{
+    std::vector<std::string> names;
+    for (const Class& declaration : schema::projectClasses())
+        names.push_back(declaration.name);
+    return names;
+}
+
+TEST(Schema, HasTheClassesServed)
+{
+    EXPECT_THAT(classNames(), UnorderedElementsAre("TAVRO_Glimmark", "TAVRO_GlimmarkCapabilities",
+                                                   "TAVRO_GlimmarkElementCapabilities",
+                                                   "TAVRO_GlimmarkSystemDevice", "TAVRO_ComputerSystem"));
+}
+
+TEST(Schema, BuildsOnTheRightSuperclasses)
+{
+    const Classes classes = schema::allClasses();
+    EXPECT_EQ(classes.find("TAVRO_Glimmark")->superclass, "CIM_AlarmDevice");
+    EXPECT_EQ(classes.find("TAVRO_GlimmarkCapabilities")->superclass, "CIM_AlarmDeviceCapabilities");
+    EXPECT_EQ(classes.find("TAVRO_GlimmarkElementCapabilities")->superclass, "CIM_ElementCapabilities");
+    EXPECT_EQ(classes.find("TAVRO_GlimmarkSystemDevice")->superclass, "CIM_SystemDevice");
+    EXPECT_EQ(classes.find("TAVRO_ComputerSystem")->superclass, "CIM_ComputerSystem");
+}
+
+/// Each file is compiled with the DMTF schema loaded and nothing else, the stand-in's perhaps never.
+TEST(Schema, RefersOnlyToClassesOfItsFileAndOfDmtf)
+{
+    std::vector<Class> known = schema::readMofFile(SCHEMA_DIRECTORY "/tests/dmtf-superclasses.mof");
+    const std::vector<Class> own = schema::readMofFile(SCHEMA_DIRECTORY "/TAVRO_Glimmark.mof");
+    known.insert(known.end(), own.begin(), own.end());
+    const Classes classes(known);
+    for (const Class& declaration : own) {
+        for (const schema::Property& property : declaration.properties) {
+            const bool isKnown = !property.isReference || classes.find(property.type) != nullptr;
+            EXPECT_TRUE(isKnown) << declaration.name << '.' << property.name;
+        }
+    }
+}
+
+class SchemaClass : public testing::TestWithParam<std::string>
+{
+protected:
+    const Classes classes = schema::allClasses();
+    const Class& declaration = *classes.find(GetParam());
+};
+
+TEST_P(SchemaClass, KeepsTheRules)
+{
+    EXPECT_THAT(breaches(declaration, classes), IsEmpty());
+}
+
+/// The real providers and support libraries, on a sample inventory.
+class SchemaAnswers : public SchemaClass
+{
+protected:
+    SchemaAnswers() : broker(registration(), {PROVIDER_DIRECTORY}) {}
+
+    void useInventory(const std::string& fileName) const
+    {
+        inventory.set(INVENTORY_DIRECTORY "/" + fileName);
+    }
+
+    std::vector<ObjectPath> paths()
+    {
+        Answer answer = broker.enumerateInstanceNames(classPath());
+        EXPECT_EQ(answer.status.code, CMPI_RC_OK) << answer.status.message.value_or("");
+        EXPECT_THAT(answer.paths, Not(IsEmpty()));
+        return answer.paths;
+    }
+
+    std::vector<Instance> instances()
+    {
+        Answer answer = broker.enumerateInstances(classPath());
+        EXPECT_EQ(answer.status.code, CMPI_RC_OK) << answer.status.message.value_or("");
+        EXPECT_THAT(answer.instances, Not(IsEmpty()));
+        return answer.instances;
+    }
+
+    void expectAnswersAsDeclared()
+    {
+        for (const ObjectPath& path : paths()) {
+            EXPECT_THAT(departures(path, declaration, classes), IsEmpty());
+            const Answer answer = broker.getInstance(path);
+            ASSERT_EQ(answer.instances.size(), 1U);
+            EXPECT_THAT(departures(answer.instances.front(), declaration, classes), IsEmpty());
+        }
+        for (const Instance& instance : instances())
+            EXPECT_THAT(departures(instance, declaration, classes), IsEmpty());
+    }
+
+private:
+    static cimhost::Registration registration()
+    {
+        cimhost::Registration all = cimhost::readRegistrationFile(SCHEMA_DIRECTORY "/glimmark.reg");
+        for (auto& entry : cimhost::readRegistrationFile(SCHEMA_DIRECTORY "/computer-system.reg").classes)
+            all.classes.push_back(std::move(entry));
+        return all;
+    }
+
+    static ObjectPath classPath() { return {"", "root/cimv2", GetParam(), {}}; }
+
+    Environment inventory{"TAVRO_INVENTORY", std::nullopt};
+    Environment systems{"TAVRO_COMPUTER_SYSTEMS", std::nullopt};
+    cimhost::Broker broker;
+};
+
+TEST_P(SchemaAnswers, AreAsDeclaredOnASmallServer)
+{
+    useInventory("small-server.json");
+    expectAnswersAsDeclared();
+}
+
+TEST_P(SchemaAnswers, AreAsDeclaredInEdgeCases)
+{
+    useInventory("edge-cases-readable.json");
+    expectAnswersAsDeclared();
+}
+
+TEST_P(SchemaAnswers, HaveEveryValueOfTheValueMaps)
+{
+    // Has indicators of every status and alarm state.
+    useInventory("small-server.json");
+    EXPECT_THAT(unusedValues(instances(), declaration), IsEmpty());
+}
+
+std::string nameOf(const testing::TestParamInfo<std::string>& info)
+{
+    return info.param;
+}
+
+INSTANTIATE_TEST_SUITE_P(Mof, SchemaClass, testing::ValuesIn(classNames()), nameOf);
+INSTANTIATE_TEST_SUITE_P(Mof, SchemaAnswers, testing::ValuesIn(classNames()), nameOf);
+
+} // namespace
