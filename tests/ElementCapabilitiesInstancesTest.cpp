@@ -4,6 +4,8 @@
 #include "support/ElementCapabilitiesFixture.h"
 #include "support/RecordedComparisons.h"
 
+#include <algorithm>
+
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
@@ -12,10 +14,7 @@ using ::testing::Contains;
 using ::testing::Each;
 using ::testing::ElementsAre;
 using ::testing::ElementsAreArray;
-using ::testing::EndsWith;
 using ::testing::IsEmpty;
-using ::testing::IsSupersetOf;
-using ::testing::Not;
 using ::testing::SizeIs;
 using ::testing::StartsWith;
 
@@ -50,15 +49,11 @@ protected:
     /// A path that enumerating the names answered, as that of a request of its own.
     CMPIObjectPath* refToName(std::size_t index)
     {
+        newRequest();
         const cim::ObjectPath path = answer(enumerateNames(ref(association))).paths.at(index);
-        return refTo(path);
-    }
-    CMPIObjectPath* refTo(const cim::ObjectPath& path)
-    {
         newRequest();
         clearRecords();
         RecordedComparisons::clear();
-        broker.name(request->context(), "ctx");
         CMPIObjectPath* const handle = request->path(path);
         broker.name(handle, "ref");
         return handle;
@@ -511,7 +506,7 @@ TEST_F(ElementCapabilitiesInstances, GetComparesTheRequestsPathWithEachInReferen
         EXPECT_EQ(comparison.first, path);
         EXPECT_TRUE(comparison.deep);
     }
-    EXPECT_EQ(comparisons[1].equal, true);
+    EXPECT_TRUE(comparisons[1].equal);
 }
 
 TEST_F(ElementCapabilitiesInstances, GetTakesThePropertyList)

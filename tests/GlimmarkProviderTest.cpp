@@ -265,9 +265,8 @@ TEST_F(GlimmarkProviderTest, GetOfAnUnknownDeviceIDEndsWithoutDoneAndExit)
     }
 }
 
-TEST_F(GlimmarkProviderTest, GetWithoutDeviceIDAnswersTheFirstEqualPath)
+TEST_F(GlimmarkProviderTest, GetWithoutDeviceIDComparesWholePaths)
 {
-    // Every returned instance lacks the DeviceID among its keys: all are equal to each other.
     const CMPIStatus status = get(refWithoutDeviceID());
     EXPECT_EQ(status.rc, CMPI_RC_OK);
     EXPECT_THAT(broker.calls({"getObjectPath"}),
@@ -293,7 +292,9 @@ TEST_F(GlimmarkProviderTest, GetWithANullDeviceIDSearchesAndStopsAtTheFirstMatch
                     ElementsAre("getObjectPath(instance1, rc)", "getObjectPath(instance2, rc)"));
         EXPECT_THAT(broker.calls(resultServices), ElementsAre("returnInstance(instance2)", "returnDone()"));
     }
-    EXPECT_THAT(valuesOf(answer({CMPI_RC_OK, nullptr}).instances, "DeviceID"), ElementsAre("b:/2"));
+    const auto found = answer({CMPI_RC_OK, nullptr}).instances;
+    ASSERT_THAT(valuesOf(found, "DeviceID"), ElementsAre("b:/2"));
+    EXPECT_THAT(found[0].properties, SizeIs(15)) << "a full instance";
 }
 
 TEST_F(GlimmarkProviderTest, GetOnTheSearchWayPassesOverWhatCouldNotBeMade)
@@ -315,6 +316,42 @@ TEST_F(GlimmarkProviderTest, GetOnTheSearchWayInAnEmptyInventoryLeavesTheStatusO
     EXPECT_THAT(broker.calls({"trace", "newString"}), IsEmpty());
     EXPECT_THAT(broker.calls(resultServices), ElementsAre("returnDone()"));
     EXPECT_EQ(Logged::flow().back(), "EXITING Glimmark_GetInstance");
+}
+
+TEST_F(GlimmarkProviderTest, GetReadsNoKeyThatSaysItHasNoValue)
+{
+    // Brokers differ in what they leave in the value of such a key: here, a string that must not be taken for
+    // one.
+    for (const CMPIValueState state : {CMPI_nullValue, CMPI_notFound, CMPI_badValue}) {
+        static CMPIData noValue;
+        noValue = CMPIData();
+        noValue.type = CMPI_string;
+        noValue.state = state;
+        noValue.value.string = host.cmpiBroker()->eft->newString(host.cmpiBroker(), "b:/2", nullptr);
+        host.tables().objectPath.getKey = [](const CMPIObjectPath*, const char*, CMPIStatus*) {
+            return noValue;
+        };
+        get(ref(glimmark, {{"DeviceID", "b:/2"}}));
+        EXPECT_THAT(Logged::flow(), ::testing::Contains("ENTERING getAllGlimmarkCMPIInstances")) << state;
+        RecordedLog::clear();
+    }
+}
+
+TEST_F(GlimmarkProviderTest, TheStatusOfAFailureInTheFactoryIsTheOperations)
+{
+    const std::string text = "Create Array for Property" + std::string(25, ' ') + "OperationalStatus failed.";
+    for (int operation = 0; operation < 3; ++operation) {
+        broker.clear();
+        broker.fail("newArray", 1, Failure::nullResult);
+        const CMPIStatus status = operation == 0   ? enumerate(ref(glimmark))
+                                  : operation == 1 ? get(ref(glimmark, {{"DeviceID", "b:/2"}}))
+                                                   : get(refWithoutDeviceID());
+        // Later calls of the broker write their own status over that of the first of three instances.
+        EXPECT_EQ(status.rc, operation == 1 ? CMPI_RC_ERR_FAILED : CMPI_RC_OK) << operation;
+        EXPECT_EQ(message(status), operation == 1 ? std::optional(text) : std::nullopt) << operation;
+        EXPECT_THAT(broker.calls({"newString"}), ElementsAre("newString(\"" + text + "\", null)"))
+            << operation;
+    }
 }
 
 TEST_F(GlimmarkProviderTest, NothingIsKeptBetweenRequests)

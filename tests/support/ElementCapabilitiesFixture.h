@@ -8,6 +8,7 @@
 
 #include <Tavro/Common.h>
 
+#include <cstddef>
 #include <string>
 #include <vector>
 
