@@ -45,7 +45,7 @@ CMPIData getElementAt(const CMPIArray* array, CMPICount index, CMPIStatus* rc)
 CMPIStatus setElementAt(const CMPIArray* array, CMPICount index, const CMPIValue* value, CMPIType type)
 {
     return perform("CMPIArrayFT.setElementAt", [&](Call& call) {
-        ArrayObject& content = call.use<ArrayObject>(array, "the array");
+        auto& content = call.use<ArrayObject>(array, "the array");
         if (index >= content.elements.size())
             Call::leave(CMPI_RC_ERR_NO_SUCH_PROPERTY);
         if (type != CMPI_null && keptType(type) != content.elementType)

@@ -3,6 +3,8 @@
 #include "broker/Names.h"
 
 #include <cstdlib>
+#include <iterator>
+#include <utility>
 
 namespace cimhost {
 
@@ -13,28 +15,36 @@ bool isReference(const cim::Property& property)
     return property.value.type == CMPI_ref && !property.value.isNull;
 }
 
-/// Adds the keys that the path lacks; false when there was none.
-bool addKeys(cim::ObjectPath& path, const InstanceObject& instance)
+/// The keys that the instance's path lacks.
+std::vector<cim::Key> missingKeys(const InstanceObject& instance)
 {
     const cim::Instance& content = instance.content.read();
-    const std::size_t before = path.keys.size();
-    const bool keyless = content.path.keys.empty();
+    std::vector<cim::Key> missing;
+    const auto add = [&](const cim::Property& property) {
+        if (findNamed(content.path.keys, property.name) == nullptr &&
+            findNamed(missing, property.name) == nullptr)
+            missing.push_back({property.name, property.value});
+    };
 
     for (const std::string& name : instance.keyNames) {
         const cim::Property* const property = findNamed(content.properties, name);
-        if (property != nullptr && !property->value.isNull && findNamed(path.keys, name) == nullptr)
-            path.keys.push_back({property->name, property->value});
+        if (property != nullptr && !property->value.isNull)
+            add(*property);
     }
-    const auto addReferences = [&](const std::vector<cim::Property>& properties) {
-        for (const cim::Property& property : properties)
-            if (isReference(property) && findNamed(path.keys, property.name) == nullptr)
-                path.keys.push_back({property.name, property.value});
-    };
-    if (keyless) {
-        addReferences(content.properties);
-        addReferences(instance.hiddenReferences);
-    }
-    return path.keys.size() != before;
+    if (!content.path.keys.empty())
+        return missing;
+    for (const auto* const properties : {&content.properties, &instance.hiddenReferences})
+        for (const cim::Property& property : *properties)
+            if (isReference(property))
+                add(property);
+    return missing;
+}
+
+cim::ObjectPath withKeys(cim::ObjectPath path, std::vector<cim::Key> keys)
+{
+    path.keys.insert(path.keys.end(), std::make_move_iterator(keys.begin()),
+                     std::make_move_iterator(keys.end()));
+    return path;
 }
 
 template <class Object>
@@ -77,18 +87,17 @@ void destroy(Kind kind, void* payload) noexcept
 
 cim::ObjectPath completedPath(const InstanceObject& instance)
 {
-    cim::ObjectPath path = instance.content.read().path;
-    addKeys(path, instance);
-    return path;
+    return withKeys(instance.content.read().path, missingKeys(instance));
 }
 
 std::shared_ptr<const cim::Instance> completed(const InstanceObject& instance)
 {
-    cim::ObjectPath path = instance.content.read().path;
-    if (!addKeys(path, instance))
+    std::vector<cim::Key> missing = missingKeys(instance);
+    if (missing.empty())
         return instance.content.share();
+    const cim::Instance& content = instance.content.read();
     return std::make_shared<const cim::Instance>(
-        cim::Instance{std::move(path), instance.content.read().properties});
+        cim::Instance{withKeys(content.path, std::move(missing)), content.properties});
 }
 
 MemoryObject::~MemoryObject()

@@ -164,7 +164,7 @@ private:
             section_.provider = value;
         } else if (entry == "location") {
             if (!isLocation(value))
-                expected("the name of a library without \"lib\" and \".so\"", value);
+                expected(R"(the name of a library without "lib" and ".so")", value);
             section_.location = value;
         } else if (entry == "type") {
             readTypes(value);

@@ -64,7 +64,7 @@ protected:
         : broker_(std::move(registration), std::move(directories), listeners())
     {}
 
-    const CMPIBroker* mb() const { return broker_.cmpiBroker(); }
+    [[nodiscard]] const CMPIBroker* mb() const { return broker_.cmpiBroker(); }
 
     CMPIObjectPath* newPath(const char* className = "TEST_Thing", const char* nameSpace = testNameSpace)
     {

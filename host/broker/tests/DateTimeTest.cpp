@@ -63,7 +63,7 @@ TEST(DateTimeTest, KnowsNow)
 {
     const std::string now = currentDateTime();
     EXPECT_TRUE(isDateTime(now));
-    EXPECT_GT(toMicroseconds(now), 50 * 365 * day);
+    EXPECT_GT(toMicroseconds(now), 50 * (365 * day));
 }
 
 } // namespace

@@ -36,7 +36,7 @@ protected:
             names.push_back(property.name);
         return names;
     }
-    cim::ObjectPath pathOf(const CMPIInstance* instance)
+    cim::ObjectPath pathOf(const CMPIInstance* instance) const
     {
         return *read(ft_.getObjectPath(instance, nullptr));
     }

@@ -6,8 +6,6 @@ namespace cimhost {
 
 namespace {
 
-using testing::StartsWith;
-
 class ObjectsTest : public RequestFixture
 {};
 

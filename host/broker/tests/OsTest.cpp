@@ -7,6 +7,8 @@
 #include <chrono>
 #include <cstdlib>
 
+#include <pthread.h>
+
 namespace cimhost {
 
 namespace {
@@ -54,10 +56,12 @@ TEST_F(OsTest, EndsThreads)
     EXPECT_EQ(xft_.joinThread(leaving, &result), 0);
     EXPECT_EQ(result, this);
 
+    // Its functions keep nothing on the stack: a cancelled thread leaves the address sanitizer's marks
+    // of such things behind.
     void* const waiting = xft_.newThread(
         [](void*) -> void* {
             for (;;)
-                services->threadSleep(1000);
+                pthread_testcancel();
         },
         nullptr, 0);
     EXPECT_EQ(xft_.cancelThread(waiting), 0);

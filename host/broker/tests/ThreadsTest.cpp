@@ -15,6 +15,7 @@ TEST(ThreadsTest, RequestsRunSideBySide)
     Broker broker(sampleRegistration({"Thing", "Asking", "Refusing"}), {SAMPLE_DIRECTORY},
                   {[&](const TraceRecord&) { ++traces; }, {}, {}});
     std::vector<std::thread> threads;
+    threads.reserve(4);
     for (int i = 0; i < 4; ++i)
         threads.emplace_back([&] {
             for (int j = 0; j < 200; ++j) {
@@ -34,6 +35,7 @@ TEST(ThreadsTest, ListenersAreCalledOneAtATime)
     int misuses = 0;
     Broker broker({}, {}, {{}, {}, [&](const std::string&) { ++misuses; }});
     std::vector<std::thread> threads;
+    threads.reserve(4);
     for (int i = 0; i < 4; ++i)
         threads.emplace_back([&] {
             const Request request(broker);
@@ -51,6 +53,7 @@ TEST(ThreadsTest, LastingObjectsMayBeMadeAndReadAnywhere)
     const CMPIBroker* const mb = broker.cmpiBroker();
     CMPIObjectPath* const shared = mb->eft->newObjectPath(mb, testNameSpace, "TEST_Thing", nullptr);
     std::vector<std::thread> threads;
+    threads.reserve(4);
     for (int i = 0; i < 4; ++i)
         threads.emplace_back([&] {
             for (int j = 0; j < 500; ++j) {

@@ -49,7 +49,7 @@ protected:
         return found;
     }
 
-    const CMPIBrokerFT& bft() const { return *mb()->bft; }
+    [[nodiscard]] const CMPIBrokerFT& bft() const { return *mb()->bft; }
 
     Request request_{broker_};
     const CMPIContext* context_ = request_.context();
