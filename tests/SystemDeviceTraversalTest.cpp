@@ -948,6 +948,18 @@ TEST_P(ReferenceOperations, SkipAnInstanceThatCouldNotBeMade)
     }
 }
 
+TEST_P(ReferenceOperations, ReferToADevicePathThatLostItsHandle)
+{
+    MadeInventory::set({{"a", "1"}});
+    broker.fail("addKey", 4, Failure::lostHandle);
+    traverse(refToSystem());
+    EXPECT_THAT(broker.calls({"setProperty"}),
+                ElementsAre("setProperty(instance1, \"GroupComponent\", ref, ref)",
+                            "setProperty(instance1, \"PartComponent\", path3, ref)"));
+    EXPECT_THAT(broker.calls(resultServices), SizeIs(1));
+    EXPECT_THAT(Logged::linesOf(function), SizeIs(2));
+}
+
 TEST_P(ReferenceOperations, KeepTheStatusThatTheBrokersCallsLeave)
 {
     MadeInventory::set({{"a", "1"}});

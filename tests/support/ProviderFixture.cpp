@@ -117,8 +117,8 @@ namespace {
 cimhost::Registration computerSystemOnly()
 {
     auto registration = cimhost::readRegistrationFile(TEST_COMPUTER_SYSTEM_REGISTRATION);
-    // Not the usual one, so that a test sees where a namespace comes from.
-    registration.classes.at(0).nameSpaces = {"root/test"};
+    // One besides the usual, so that a test sees where a namespace comes from.
+    registration.classes.at(0).nameSpaces.emplace_back("root/test");
     return registration;
 }
 

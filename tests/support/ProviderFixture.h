@@ -69,7 +69,7 @@ std::string line(const std::string& module, const std::string& kind, const std::
 class ProviderFixture : public ::testing::Test
 {
 protected:
-    /// A broker that serves TAVRO_ComputerSystem in root/test from a stand-in.
+    /// A broker that serves TAVRO_ComputerSystem in root/cimv2 and root/test from a stand-in.
     ProviderFixture();
     /// A broker that serves what a registration names.
     explicit ProviderFixture(cimhost::Registration registration);
