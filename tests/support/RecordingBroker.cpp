@@ -211,6 +211,12 @@ void dropHandle(const Object* object, Rest...)
     const_cast<Object*>(object)->hdl = nullptr;
 }
 
+template <class... Rest>
+void dropHandle(const CMPIBroker*, Rest...)
+{
+    // The broker outlives the request, with its handle.
+}
+
 /// While it lives, this thread is inside an up-call: its calls are those of other providers.
 class UpCall
 {
@@ -387,7 +393,7 @@ std::optional<Failure> RecordingBroker::record(const std::string& service,
     linesBefore.push_back(RecordedLog::count());
     std::optional<Failure> failure;
     for (Plan& plan : plans) {
-        if (plan.service == service && --plan.remaining == 0)
+        if ((plan.service.empty() || plan.service == service) && --plan.remaining == 0)
             failure = plan.failure;
     }
     return failure;

@@ -52,7 +52,8 @@ public:
     /// Those calls that begin with one of the services' names.
     std::vector<std::string> calls(const std::vector<std::string>& services) const;
 
-    /// Lets the nth call (from 1, counted from now on) of a service fail. May be said for several.
+    /// Lets the nth call (from 1, counted from now on) of a service fail; without a name, that of any
+    /// service. May be said for several.
     void fail(const std::string& service, int nth, Failure failure);
 
     // What the layer's functions in the tables use.
