@@ -322,11 +322,11 @@ TEST_F(GlimmarkProviderTest, GetReadsNoKeyThatSaysItHasNoValue)
 {
     // Brokers differ in what they leave in the value of such a key: here, a string that must not be taken for
     // one.
-    for (const CMPIValueState state : {CMPI_nullValue, CMPI_notFound, CMPI_badValue}) {
+    for (const int state : {CMPI_nullValue, CMPI_notFound, CMPI_badValue}) {
         static CMPIData noValue;
         noValue = CMPIData();
         noValue.type = CMPI_string;
-        noValue.state = state;
+        noValue.state = static_cast<CMPIValueState>(state);
         noValue.value.string = host.cmpiBroker()->eft->newString(host.cmpiBroker(), "b:/2", nullptr);
         host.tables().objectPath.getKey = [](const CMPIObjectPath*, const char*, CMPIStatus*) {
             return noValue;
