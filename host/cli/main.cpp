@@ -27,7 +27,7 @@ int main(int argc, char* argv[])
 {
     using namespace cimhost::cli;
 
-    // Writing to a pipe that nobody reads is an error like any other.
+    // Writing to a pipe that nobody reads any more ends in an exit status, not in a signal.
     std::signal(SIGPIPE, SIG_IGN);
 
     std::ostringstream out;
@@ -35,7 +35,9 @@ int main(int argc, char* argv[])
                                   readSurroundings(), isatty(STDOUT_FILENO) != 0, out, std::cerr);
     if (writeToStandardOutput(out.str()))
         return status;
-    std::cerr << "cimhost: cannot write to standard output: " << std::generic_category().message(errno)
-              << '\n';
+    // A reader that has seen enough, such as head, needs no message.
+    if (const int reason = errno; reason != EPIPE)
+        std::cerr << "cimhost: cannot write to standard output: " << std::generic_category().message(reason)
+                  << '\n';
     return exitError;
 }

@@ -90,7 +90,7 @@ TEST_F(Executable, saysIfNobodyReadsItsOutput)
     EXPECT_EQ(
         shell("mkfifo " + pipe + "; exec 3<>" + pipe + " 4>" + pipe + " 3<&-; $CIMHOST ein CIMT_Lamp >&4"),
         1);
-    EXPECT_EQ(err(), "cimhost: cannot write to standard output: Broken pipe\n");
+    EXPECT_EQ(err(), "") << "a reader that has seen enough needs no message";
 }
 
 TEST_F(Executable, saysIfItsOutputDoesNotFit)
