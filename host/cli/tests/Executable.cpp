@@ -84,7 +84,7 @@ TEST_F(Executable, answersWrongUsageWithStatusTwo)
     EXPECT_THAT(err(), HasSubstr("cimhost: "));
 }
 
-TEST_F(Executable, saysIfNobodyReadsItsOutput)
+TEST_F(Executable, endsQuietlyIfNobodyReadsItsOutput)
 {
     const std::string pipe = (directory.path() / "pipe").string();
     EXPECT_EQ(
