@@ -112,7 +112,7 @@ struct BadText
 
 void PrintTo(const BadText& bad, std::ostream* stream)
 {
-    *stream << bad.text;
+    *stream << testing::PrintToString(bad.text); // escapes what is not to be printed
 }
 
 class MofReaderRefuses : public testing::TestWithParam<BadText>

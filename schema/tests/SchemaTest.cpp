@@ -47,6 +47,18 @@ TEST(Schema, BuildsOnTheRightSuperclasses)
     EXPECT_EQ(classes.find("TAVRO_ComputerSystem")->superclass, "CIM_ComputerSystem");
 }
 
+TEST(Schema, AssociatesTheRightClasses)
+{
+    const Classes classes = schema::allClasses();
+    const auto typeOf = [&](const char* association, const char* end) {
+        return typeText(*findProperty(*classes.find(association), end));
+    };
+    EXPECT_EQ(typeOf("TAVRO_GlimmarkElementCapabilities", "ManagedElement"), "TAVRO_Glimmark REF");
+    EXPECT_EQ(typeOf("TAVRO_GlimmarkElementCapabilities", "Capabilities"), "TAVRO_GlimmarkCapabilities REF");
+    EXPECT_EQ(typeOf("TAVRO_GlimmarkSystemDevice", "GroupComponent"), "CIM_ComputerSystem REF");
+    EXPECT_EQ(typeOf("TAVRO_GlimmarkSystemDevice", "PartComponent"), "TAVRO_Glimmark REF");
+}
+
 /// Each file is compiled with the DMTF schema loaded and nothing else, the stand-in's perhaps never.
 TEST(Schema, RefersOnlyToClassesOfItsFileAndOfDmtf)
 {

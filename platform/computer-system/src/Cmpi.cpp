@@ -1,38 +1,44 @@
 #include "Cmpi.h"
 
+#include <type_traits>
+
 namespace Tavro::ComputerSystem::Cmpi {
 namespace {
 
-/// Older CMPI headers declare objects and values without const.
-template <class Object>
-Object* unconst(const Object* object)
+/// Hands an argument to a service. Older CMPI headers leave out a `const` here and there; no service writes
+/// through such a pointer.
+template <class Parameter, class Argument>
+Parameter adapt(Argument argument)
 {
-    return const_cast<Object*>(object);
+    if constexpr (std::is_convertible_v<Argument, Parameter>)
+        return argument;
+    else
+        return const_cast<Parameter>(argument);
 }
 
-/// A service that may be called.
-template <class Table, class Function>
-Function usable(const Table* table, Function Table::*slot, const char* service)
+/// Calls a service with all its arguments, the object itself among them.
+template <class Table, class Result, class... Parameters, class... Arguments>
+Result callSlot(const char* service, const Table* table, Result (*Table::*slot)(Parameters...),
+                Arguments... arguments)
 {
     if (table == nullptr || table->*slot == nullptr)
         throw Failure(CMPI_RC_ERR_INVALID_HANDLE, std::string("There is no ") + service + " to call");
-    return table->*slot;
+    return (table->*slot)(adapt<Parameters>(arguments)...);
 }
 
 /// Calls a service of an encapsulated object.
-template <class Object, class Table, class Function, class... Arguments>
-auto call(const Object* object, Function Table::*slot, const char* service, Arguments... arguments)
+template <class Object, class Slot, class... Arguments>
+auto call(const Object* object, Slot slot, const char* service, Arguments... arguments)
 {
-    const Table* const table = object != nullptr && object->hdl != nullptr ? object->ft : nullptr;
-    return usable(table, slot, service)(unconst(object), arguments...);
+    const auto* const table = object != nullptr && object->hdl != nullptr ? object->ft : nullptr;
+    return callSlot(service, table, slot, object, arguments...);
 }
 
 /// Calls a factory service of the broker.
-template <class Function, class... Arguments>
-auto call(const CMPIBroker* broker, Function CMPIBrokerEncFT::*slot, const char* service,
-          Arguments... arguments)
+template <class Slot, class... Arguments>
+auto call(const CMPIBroker* broker, Slot slot, const char* service, Arguments... arguments)
 {
-    return usable(broker != nullptr ? broker->eft : nullptr, slot, service)(broker, arguments...);
+    return callSlot(service, broker != nullptr ? broker->eft : nullptr, slot, broker, arguments...);
 }
 
 void require(const CMPIStatus& status, const char* service)
@@ -53,9 +59,9 @@ Object* require(Object* object, const CMPIStatus& status, const char* service)
 
 /// A text as the value of a CMPI_chars: the character pointer itself, in the place of the pointer to a
 /// value.
-CMPIValue* asValue(const std::string& text)
+const CMPIValue* asValue(const std::string& text)
 {
-    return reinterpret_cast<CMPIValue*>(unconst(text.c_str()));
+    return reinterpret_cast<const CMPIValue*>(text.c_str());
 }
 
 } // namespace
@@ -85,8 +91,7 @@ CMPIInstance* newInstance(const CMPIBroker* broker, const CMPIObjectPath* path)
 {
     constexpr const char* service = "newInstance";
     CMPIStatus status{CMPI_RC_OK, nullptr};
-    CMPIInstance* const instance =
-        call(broker, &CMPIBrokerEncFT::newInstance, service, unconst(path), &status);
+    CMPIInstance* const instance = call(broker, &CMPIBrokerEncFT::newInstance, service, path, &status);
     return require(instance, status, service);
 }
 
@@ -128,7 +133,7 @@ void setPropertyFilter(const CMPIInstance* instance, const char** properties, co
 
 namespace {
 
-void set(const CMPIInstance* instance, const char* name, CMPIValue* value, CMPIType type)
+void set(const CMPIInstance* instance, const char* name, const CMPIValue* value, CMPIType type)
 {
     require(call(instance, &CMPIInstanceFT::setProperty, "setProperty", name, value, type), "setProperty");
 }
@@ -156,14 +161,12 @@ void setProperty(const CMPIInstance* instance, const char* name, CMPIArray* arra
 
 void returnInstance(const CMPIResult* result, const CMPIInstance* instance)
 {
-    require(call(result, &CMPIResultFT::returnInstance, "returnInstance", unconst(instance)),
-            "returnInstance");
+    require(call(result, &CMPIResultFT::returnInstance, "returnInstance", instance), "returnInstance");
 }
 
 void returnObjectPath(const CMPIResult* result, const CMPIObjectPath* path)
 {
-    require(call(result, &CMPIResultFT::returnObjectPath, "returnObjectPath", unconst(path)),
-            "returnObjectPath");
+    require(call(result, &CMPIResultFT::returnObjectPath, "returnObjectPath", path), "returnObjectPath");
 }
 
 void returnDone(const CMPIResult* result)
@@ -173,9 +176,12 @@ void returnDone(const CMPIResult* result)
 
 CMPIStatus failed(const CMPIBroker* broker, CMPIrc code, const char* message) noexcept
 {
-    const bool makesStrings =
-        broker != nullptr && broker->eft != nullptr && broker->eft->newString != nullptr;
-    return {code, makesStrings ? broker->eft->newString(broker, message, nullptr) : nullptr};
+    try {
+        constexpr CMPIStatus* ignored = nullptr;
+        return {code, call(broker, &CMPIBrokerEncFT::newString, "newString", message, ignored)};
+    } catch (const std::exception&) {
+        return {code, nullptr};
+    }
 }
 
 } // namespace Tavro::ComputerSystem::Cmpi

@@ -100,25 +100,32 @@ CMPIStatus statusOf(Operation operation) noexcept
     }
 }
 
-// The function table. The argument types are left to it, since they differ between CMPI headers in const.
+// The function table. Its argument types are left to the CMPI headers in use, whose older ones leave out a
+// `const` here and there.
+
+template <class Name>
+const char** listOf(Name** properties)
+{
+    return const_cast<const char**>(properties);
+}
 
 constexpr auto notSupported = [](auto...) { return CMPIStatus{CMPI_RC_ERR_NOT_SUPPORTED, nullptr}; };
 
-const CMPIInstanceMIFT functions = {
+CMPIInstanceMIFT functions = {
     CMPIVersion200,
     CMPIVersion200,
-    "TavroComputerSystemProvider",
+    const_cast<char*>("TavroComputerSystemProvider"),
     [](auto...) { // cleanup
         return CMPIStatus{CMPI_RC_OK, nullptr};
     },
     [](auto*, auto*, auto* result, auto* classPath) {
         return statusOf([&] { enumerateInstanceNames(result, classPath); });
     },
-    [](auto*, auto*, auto* result, auto* classPath, const char** properties) {
-        return statusOf([&] { enumerateInstances(result, classPath, properties); });
+    [](auto*, auto*, auto* result, auto* classPath, auto** properties) {
+        return statusOf([&] { enumerateInstances(result, classPath, listOf(properties)); });
     },
-    [](auto*, auto*, auto* result, auto* instancePath, const char** properties) {
-        return statusOf([&] { getInstance(result, instancePath, properties); });
+    [](auto*, auto*, auto* result, auto* instancePath, auto** properties) {
+        return statusOf([&] { getInstance(result, instancePath, listOf(properties)); });
     },
     notSupported, // createInstance
     notSupported, // modifyInstance
