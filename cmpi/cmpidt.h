@@ -235,23 +235,28 @@ typedef enum _CMPIPredOp
 #define CMPI_MB_Tracing 0x20000
 #define CMPI_MB_PropertyFiltering 0x40001
 
-// The error object's enumerations: only their width, that of an int, matters to a function table.
+// The error object's enumerations: only their width, that of an int, matters to a function table. The last
+// value is there so that every int is one of theirs.
 
 typedef enum _CMPIErrorType
 {
-    CMPI_ErrorType_Unknown = 0
+    CMPI_ErrorType_Unknown = 0,
+    CMPI_ErrorType_AsWideAsAnInt = 0x7fffffff
 } CMPIErrorType;
 typedef enum _CMPIErrorSeverity
 {
-    CMPI_ErrorSeverity_Unknown = 0
+    CMPI_ErrorSeverity_Unknown = 0,
+    CMPI_ErrorSeverity_AsWideAsAnInt = 0x7fffffff
 } CMPIErrorSeverity;
 typedef enum _CMPIErrorProbableCause
 {
-    CMPI_ErrorProbableCause_Unknown = 0
+    CMPI_ErrorProbableCause_Unknown = 0,
+    CMPI_ErrorProbableCause_AsWideAsAnInt = 0x7fffffff
 } CMPIErrorProbableCause;
 typedef enum _CMPIErrorSrcFormat
 {
-    CMPI_ErrorSrcFormat_Unknown = 0
+    CMPI_ErrorSrcFormat_Unknown = 0,
+    CMPI_ErrorSrcFormat_AsWideAsAnInt = 0x7fffffff
 } CMPIErrorSrcFormat;
 
 /// A block of memory with its length in bytes.

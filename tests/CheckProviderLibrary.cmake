@@ -49,6 +49,12 @@ if(NOT plain STREQUAL expected)
     message(SEND_ERROR "Entry points:\n${plain}\nexpected:\n${expected}")
 endif()
 
+# It can be unloaded: no symbol is unique in the process.
+string(REGEX MATCHALL "[^ \n]+ u " unique "${symbols}")
+if(unique)
+    message(SEND_ERROR "Symbols that keep the library loaded: ${unique}")
+endif()
+
 # Every other function keeps default visibility: one of each kind stands for them.
 foreach(name IN ITEMS
         _ZN5Tavro16GlimmarkProvider22Glimmark_EnumInstancesEP15_CMPIInstanceMIPK12_CMPIContextPK11_CMPIResultPK15_CMPIObjectPathPPKc
