@@ -10,7 +10,6 @@
 
 using Tavro::GlimmarkProvider::GlimmarkCapabilities;
 using Tavro::GlimmarkProvider::GlimmarkFactory;
-using ::testing::Contains;
 using ::testing::ElementsAre;
 using ::testing::EndsWith;
 using ::testing::IsEmpty;

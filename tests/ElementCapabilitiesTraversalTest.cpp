@@ -16,8 +16,6 @@ using ::testing::IsEmpty;
 using ::testing::SizeIs;
 using ::testing::StartsWith;
 
-namespace cim = cimhost::cim;
-
 namespace {
 
 constexpr auto systemDevice = "TAVRO_GlimmarkSystemDevice";
@@ -71,7 +69,7 @@ protected:
         Texts reading;
         for (std::size_t i = 0; i < routes; ++i)
             reading =
-                joined(reading, Texts{"getClassName(ref, rc)", "getCharPtr(\"" + nearClass + "\", rc)"});
+                joined(reading, Texts{"getClassName(ref, rc)", R"(getCharPtr(")" + nearClass + R"(", rc))"});
         return joined(
             Texts{"ENTERING get_assoc_targetClass_ObjectPath", "ENTERING get_assoc_targetClass_Name"},
             reading,

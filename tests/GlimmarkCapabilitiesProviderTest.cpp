@@ -14,8 +14,6 @@ using ::testing::IsEmpty;
 using ::testing::Not;
 using ::testing::SizeIs;
 
-namespace cim = cimhost::cim;
-
 namespace {
 
 constexpr auto capabilities = "TAVRO_GlimmarkCapabilities";

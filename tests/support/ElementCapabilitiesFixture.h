@@ -24,7 +24,7 @@ using Texts = std::vector<std::string>;
 /// A run of blanks inside a text.
 inline std::string blanks(std::size_t count)
 {
-    return std::string(count, ' ');
+    return std::string().append(count, ' ');
 }
 
 /// The broker's trace of a failure, as the recording writes it.
@@ -74,7 +74,8 @@ protected:
     /// A new path of the request's.
     Texts makingOfAPath(const std::string& className, const std::string& path) const
     {
-        return joined(readingOfTheNamespace, Texts{"newObjectPath(\"root/test\", \"" + className + "\", rc)"},
+        return joined(readingOfTheNamespace,
+                      Texts{R"(newObjectPath("root/test", ")" + className + R"(", rc))"},
                       settingOfTheNamespace(path), Texts{"setHostname(" + path + ", " + quotedHost + ")"});
     }
 
