@@ -73,7 +73,7 @@ protected:
         return joined(
             Texts{"ENTERING get_assoc_targetClass_ObjectPath", "ENTERING get_assoc_targetClass_Name"},
             reading,
-            Texts{"trace(1, \"GlimmarkElementCapabilitiesProvider\", \"" + text + "\", null)",
+            Texts{R"(trace(1, "GlimmarkElementCapabilitiesProvider", ")" + text + R"(", null))",
                   "EXITING get_assoc_targetClass_Name"},
             makingOfAPath(farClass, "path1"),
             Texts{"EXITING get_assoc_targetClass_ObjectPath", "getClassName(path1, rc)",
