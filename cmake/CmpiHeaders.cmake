@@ -1,28 +1,47 @@
-# The CMPI headers: glimmark::cmpi carries their include directory.
+# The CMPI headers: glimmark::cmpi carries their include directory, for what a broker or a maker loads.
 #
 # A broker's development package has them in a folder cmpi/ of the include path or, rarely, on the
 # include path itself. Where there is none, the project's own serve; they describe the same tables.
 # Naming a directory outright: -DGLIMMARK_CMPI_INCLUDE_DIR=/path/with/cmpift.h
+#
+# glimmark::cmpi-own carries the project's own headers whatever the machine has, for cimhost and the tests.
 
-find_path(
-    GLIMMARK_CMPI_INCLUDE_DIR cmpift.h
-    PATH_SUFFIXES cmpi
-    DOC "Directory of the CMPI headers cmpidt.h and cmpift.h")
+function(glimmark_add_cmpi_headers name directory)
+    add_library(glimmark_${name} INTERFACE)
+    add_library(glimmark::${name} ALIAS glimmark_${name})
+    target_include_directories(glimmark_${name} ${ARGN} INTERFACE ${directory})
+    # The brokers' headers ask for the platform by name.
+    target_compile_definitions(glimmark_${name} INTERFACE CMPI_PLATFORM_LINUX_GENERIC_GNU)
+endfunction()
 
-if(GLIMMARK_CMPI_INCLUDE_DIR)
-    if(NOT EXISTS ${GLIMMARK_CMPI_INCLUDE_DIR}/cmpift.h OR NOT EXISTS ${GLIMMARK_CMPI_INCLUDE_DIR}/cmpidt.h)
-        message(FATAL_ERROR "GLIMMARK_CMPI_INCLUDE_DIR is ${GLIMMARK_CMPI_INCLUDE_DIR}, which has no cmpidt.h and cmpift.h")
-    endif()
-    set(glimmark_cmpi_directory ${GLIMMARK_CMPI_INCLUDE_DIR})
-    set(glimmark_cmpi_kind SYSTEM)
+glimmark_add_cmpi_headers(cmpi-own ${PROJECT_SOURCE_DIR}/cmpi)
+
+if(DEFINED GLIMMARK_CMPI_INCLUDE_DIR AND GLIMMARK_CMPI_INCLUDE_DIR)
+    foreach(header IN ITEMS cmpidt.h cmpift.h)
+        if(NOT EXISTS ${GLIMMARK_CMPI_INCLUDE_DIR}/${header})
+            message(FATAL_ERROR "GLIMMARK_CMPI_INCLUDE_DIR is ${GLIMMARK_CMPI_INCLUDE_DIR}, which has no ${header}")
+        endif()
+    endforeach()
+    set(directory ${GLIMMARK_CMPI_INCLUDE_DIR})
 else()
-    set(glimmark_cmpi_directory ${PROJECT_SOURCE_DIR}/cmpi)
-    set(glimmark_cmpi_kind "")
+    find_path(glimmark_cmpidt_directory cmpidt.h PATH_SUFFIXES cmpi)
+    find_path(glimmark_cmpift_directory cmpift.h PATH_SUFFIXES cmpi)
+    mark_as_advanced(glimmark_cmpidt_directory glimmark_cmpift_directory)
+    # Half a set of headers is none.
+    if(glimmark_cmpidt_directory AND glimmark_cmpidt_directory STREQUAL glimmark_cmpift_directory)
+        set(directory ${glimmark_cmpift_directory})
+    endif()
 endif()
-message(STATUS "CMPI headers: ${glimmark_cmpi_directory}")
 
-add_library(glimmark_cmpi INTERFACE)
-add_library(glimmark::cmpi ALIAS glimmark_cmpi)
-target_include_directories(glimmark_cmpi ${glimmark_cmpi_kind} INTERFACE ${glimmark_cmpi_directory})
-# The brokers' headers ask for the platform by name.
-target_compile_definitions(glimmark_cmpi INTERFACE CMPI_PLATFORM_LINUX_GENERIC_GNU)
+if(directory)
+    glimmark_add_cmpi_headers(cmpi ${directory} SYSTEM)
+else()
+    set(directory ${PROJECT_SOURCE_DIR}/cmpi)
+    glimmark_add_cmpi_headers(cmpi ${directory})
+endif()
+message(STATUS "CMPI headers: ${directory}")
+unset(directory)
+
+set(GLIMMARK_CMPI_INCLUDE_DIR
+    ""
+    CACHE PATH "Directory of the CMPI headers cmpidt.h and cmpift.h; empty: search, or the project's own")

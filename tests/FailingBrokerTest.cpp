@@ -178,7 +178,7 @@ TEST_P(FailingBroker, BringsNoOperationDown)
     ASSERT_THAT(whole, ::testing::Not(IsEmpty()));
     int runs = 0;
     for (const Failure failure : {Failure::nullResult, Failure::noHandle, Failure::errorStatus,
-                                  Failure::wrongValue, Failure::lostHandle}) {
+                                  Failure::wrongValue, Failure::nullState, Failure::lostHandle}) {
         for (std::size_t nth = 1; nth <= whole.size(); ++nth) {
             newRequest();
             RecordedLog::clear();

@@ -331,7 +331,7 @@ TEST_F(SystemDeviceInstances, NamesOfNoEnumerationAreNone)
 
 TEST_F(SystemDeviceInstances, NamesSkipASystemThatIsNone)
 {
-    for (const Failure failure : {Failure::nullResult, Failure::wrongValue}) {
+    for (const Failure failure : {Failure::nullResult, Failure::wrongValue, Failure::nullState}) {
         startAnew();
         setComputerSystems({"two"});
         broker.fail("getNext", 1, failure);
@@ -550,7 +550,7 @@ TEST_F(SystemDeviceInstances, InstancesOfNoEnumerationAreNoneAndTheBuildIsComple
 
 TEST_F(SystemDeviceInstances, InstancesSkipASystemThatIsNone)
 {
-    for (const Failure failure : {Failure::nullResult, Failure::wrongValue}) {
+    for (const Failure failure : {Failure::nullResult, Failure::wrongValue, Failure::nullState}) {
         startAnew();
         setComputerSystems({"two"});
         broker.fail("getNext", 1, failure);

@@ -619,6 +619,15 @@ TEST_P(AssociatorOperations, GoToTheEndWhereTheTargetsClassCannotBeRead)
     EXPECT_THAT(Logged::linesOf(function), SizeIs(2));
 }
 
+TEST_P(AssociatorOperations, SkipASystemThatSaysItIsNull)
+{
+    // Whatever its value points to.
+    broker.fail("getNext", 1, Failure::nullState);
+    const CMPIStatus status = traverse(refToDevice());
+    EXPECT_EQ(status.rc, CMPI_RC_OK);
+    EXPECT_EQ(answered(status) + 1, broker.calls({"getNext"}).size());
+}
+
 TEST_P(AssociatorOperations, SkipASystemThatIsNone)
 {
     for (const Failure failure : {Failure::nullResult, Failure::wrongValue}) {

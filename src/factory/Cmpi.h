@@ -141,14 +141,18 @@ inline CMPICount keyCountOf(const CMPIObjectPath* path, CMPIStatus* rc)
     return call(path, &CMPIObjectPathFT::getKeyCount, rc);
 }
 
+/// Whether data holds a value of a type. Brokers differ in what they leave in the value of other data.
+inline bool holds(const CMPIData& data, CMPIType type)
+{
+    constexpr unsigned int noValue = CMPI_nullValue | CMPI_notFound | CMPI_badValue;
+    return data.type == type && (data.state & noValue) == 0;
+}
+
 /// The value of a key where it is a string; null where it is missing, null or something else.
 inline CMPIString* stringKeyOf(const CMPIObjectPath* path, const char* name, CMPIStatus* rc)
 {
-    constexpr unsigned int noValue = CMPI_nullValue | CMPI_notFound | CMPI_badValue;
     const CMPIData key = call(path, &CMPIObjectPathFT::getKey, name, rc);
-    if (key.type != CMPI_string || (key.state & noValue) != 0 || !exists(key.value.string))
-        return nullptr;
-    return key.value.string;
+    return holds(key, CMPI_string) && exists(key.value.string) ? key.value.string : nullptr;
 }
 
 // Values, each with its CMPI type. A text is passed as the character pointer itself in the place of
@@ -280,14 +284,14 @@ inline bool hasNext(const CMPIEnumeration* enumeration)
 inline CMPIObjectPath* nextPath(const CMPIEnumeration* enumeration)
 {
     const CMPIData item = call(enumeration, &CMPIEnumerationFT::getNext, static_cast<CMPIStatus*>(nullptr));
-    return item.type == CMPI_ref ? item.value.ref : nullptr;
+    return holds(item, CMPI_ref) ? item.value.ref : nullptr;
 }
 
 /// The next item as an instance; null where it is none.
 inline CMPIInstance* nextInstance(const CMPIEnumeration* enumeration)
 {
     const CMPIData item = call(enumeration, &CMPIEnumerationFT::getNext, static_cast<CMPIStatus*>(nullptr));
-    return item.type == CMPI_instance ? item.value.inst : nullptr;
+    return holds(item, CMPI_instance) ? item.value.inst : nullptr;
 }
 
 } // namespace Tavro::GlimmarkProvider::Cmpi

@@ -254,6 +254,13 @@ struct Layer<Slot>
             dropHandle(arguments...);
             return result;
         }
+        if constexpr (std::is_same_v<Result, CMPIData>) {
+            if (*failure == Failure::nullState) {
+                CMPIData data = serve(arguments...);
+                data.state = static_cast<CMPIValueState>(data.state | CMPI_nullValue);
+                return data;
+            }
+        }
         if (*failure == Failure::errorStatus)
             (fillStatus(arguments), ...);
         return failed<Result>(*failure);

@@ -22,6 +22,7 @@ enum class Failure
     noHandle,    ///< an object with a null handle
     errorStatus, ///< a null pointer or a zero, and code 1 with the message "injected" in the status argument
     wrongValue,  ///< getNext: an item that is no reference; hasNext: false
+    nullState,   ///< data that is served but says that it is null
     lostHandle   ///< the call is served, but the object it is made on has a null handle from then on
 };
 
