@@ -354,6 +354,68 @@ TEST_F(GlimmarkProviderTest, TheStatusOfAFailureInTheFactoryIsTheOperations)
     }
 }
 
+TEST_F(GlimmarkProviderTest, DoneComesBeforeTheExitLineInEveryOperation)
+{
+    const auto lastTwo = [this] {
+        const std::vector<std::string> all = timeline();
+        return std::vector<std::string>(all.end() - 2, all.end());
+    };
+    enumerateNames(ref(glimmark));
+    EXPECT_THAT(lastTwo(), ElementsAre("returnDone()", "EXITING Glimmark_EnumInstanceNames"));
+    enumerate(ref(glimmark));
+    EXPECT_THAT(lastTwo(), ElementsAre("returnDone()", "EXITING Glimmark_EnumInstances"));
+    for (const CMPIObjectPath* path :
+         {ref(glimmark), ref(glimmark, {{"DeviceID", "b:/2"}}), refWithoutDeviceID()}) {
+        clearRecords();
+        get(path);
+        EXPECT_THAT(lastTwo(), ElementsAre("returnDone()", "EXITING Glimmark_GetInstance"));
+    }
+}
+
+TEST_F(GlimmarkProviderTest, AMissingKeyIsReportedBetweenEntryAndExit)
+{
+    const std::string text = "At least one key should be passed";
+    get(ref(glimmark));
+    EXPECT_THAT(timeline(), ElementsAre("ENTERING Glimmark_GetInstance", "getKeyCount(ref, rc)",
+                                        "newString(\"" + text + "\", null)",
+                                        "trace(2, \"GlimmarkProfileProvider\", \"" + text + "\", null)",
+                                        "returnDone()", "EXITING Glimmark_GetInstance"));
+}
+
+TEST_F(GlimmarkProviderTest, InstancesAreReturnedAsTheFactoryMadeThem)
+{
+    MadeInventory::set({{"a", "1"}});
+    enumerate(ref(glimmark));
+    const auto calls = broker.calls();
+    ASSERT_GE(calls.size(), 3U);
+    EXPECT_THAT(std::vector<std::string>(calls.end() - 3, calls.end()),
+                ElementsAre("setProperty(instance1, \"AlarmState\", 0, uint16)", "returnInstance(instance1)",
+                            "returnDone()"));
+}
+
+TEST_F(GlimmarkProviderTest, GetHandsOnAnInstanceThatCouldNotBeMade)
+{
+    broker.fail("newInstance", 1, Failure::nullResult);
+    get(ref(glimmark, {{"DeviceID", "b:/2"}}));
+    EXPECT_THAT(broker.calls(resultServices), ElementsAre("returnInstance(null)", "returnDone()"));
+}
+
+TEST_F(GlimmarkProviderTest, GetReadsNoKeyWithoutAString)
+{
+    static CMPIString withoutHandle;
+    withoutHandle = {nullptr, &host.tables().string};
+    static CMPIData key;
+    for (CMPIString* const string : {static_cast<CMPIString*>(nullptr), &withoutHandle}) {
+        key = CMPIData();
+        key.type = CMPI_string;
+        key.value.string = string;
+        host.tables().objectPath.getKey = [](const CMPIObjectPath*, const char*, CMPIStatus*) { return key; };
+        RecordedLog::clear();
+        get(ref(glimmark, {{"DeviceID", "b:/2"}}));
+        EXPECT_THAT(Logged::flow(), ::testing::Contains("ENTERING getAllGlimmarkCMPIInstances"));
+    }
+}
+
 TEST_F(GlimmarkProviderTest, NothingIsKeptBetweenRequests)
 {
     EXPECT_THAT(answer(enumerateNames(ref(glimmark))).paths, SizeIs(3));

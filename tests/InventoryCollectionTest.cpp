@@ -4,6 +4,7 @@
 #include "MadeInventory.h"
 #include "ProviderException.h"
 #include "RecordedLog.h"
+#include "support/Allocations.h"
 #include "support/ProviderFixture.h"
 
 #include <Tavro/Instrumentation.h>
@@ -251,6 +252,20 @@ TEST_F(InventoryCollection, CapabilitiesNeedNoInventory)
     MadeInventory::throwAt(0, std::make_exception_ptr(std::runtime_error("not to be read")));
     EXPECT_EQ(getGlimmarkCapabilitiesInstances(capabilities), 0);
     EXPECT_THAT(capabilities, SizeIs(1));
+}
+
+TEST_F(InventoryCollection, CapabilitiesWithoutMemoryAreReportedOnStandardError)
+{
+    // Long enough that no other allocation of the function is as large as the list's next one.
+    capabilities.resize(1000);
+    capabilities.shrink_to_fit();
+    testing::internal::CaptureStderr();
+    Allocations::failFrom(sizeof(GlimmarkCapabilities) * 1001);
+    EXPECT_EQ(getGlimmarkCapabilitiesInstances(capabilities), 1);
+    EXPECT_TRUE(Allocations::stop());
+    EXPECT_EQ(testing::internal::GetCapturedStderr(), std::string(std::bad_alloc().what()) + "\n");
+    EXPECT_THAT(capabilities, SizeIs(1000));
+    EXPECT_THAT(Logged::flow(), ElementsAre("ENTERING getGlimmarkCapabilitiesInstances"));
 }
 
 TEST_F(InventoryCollection, CapabilitiesAreTraced)

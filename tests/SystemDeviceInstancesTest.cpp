@@ -329,9 +329,20 @@ TEST_F(SystemDeviceInstances, NamesOfNoEnumerationAreNone)
     }
 }
 
+TEST_F(SystemDeviceInstances, ASystemThatSaysItIsNullIsSkippedWhateverItsValuePointsTo)
+{
+    setComputerSystems({"one", "two"});
+    broker.fail("getNext", 1, Failure::nullState);
+    EXPECT_THAT(pairsOf(answer(enumerateNames()).paths), ElementsAre("two a:/1", "two b:/2"));
+    startAnew();
+    setComputerSystems({"one", "two"});
+    broker.fail("getNext", 1, Failure::nullState);
+    EXPECT_THAT(pairsOf(answer(enumerate()).instances), ElementsAre("two a:/1", "two b:/2"));
+}
+
 TEST_F(SystemDeviceInstances, NamesSkipASystemThatIsNone)
 {
-    for (const Failure failure : {Failure::nullResult, Failure::wrongValue, Failure::nullState}) {
+    for (const Failure failure : {Failure::nullResult, Failure::wrongValue}) {
         startAnew();
         setComputerSystems({"two"});
         broker.fail("getNext", 1, failure);
@@ -550,7 +561,7 @@ TEST_F(SystemDeviceInstances, InstancesOfNoEnumerationAreNoneAndTheBuildIsComple
 
 TEST_F(SystemDeviceInstances, InstancesSkipASystemThatIsNone)
 {
-    for (const Failure failure : {Failure::nullResult, Failure::wrongValue, Failure::nullState}) {
+    for (const Failure failure : {Failure::nullResult, Failure::wrongValue}) {
         startAnew();
         setComputerSystems({"two"});
         broker.fail("getNext", 1, failure);

@@ -1,5 +1,7 @@
 #include "RecordingBroker.h"
 
+#include "Allocations.h"
+
 #include "RecordedLog.h"
 
 #include <algorithm>
@@ -244,6 +246,7 @@ struct Layer<Slot>
 
     static Result call(Arguments... arguments)
     {
+        const Allocations::Pause pause; // what the broker allocates is not the library's
         if (UpCall::isRunning())
             return original(arguments...);
         const auto failure = active->record(service, showAll(arguments...));

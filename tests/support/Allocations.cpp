@@ -1,0 +1,96 @@
+#include "Allocations.h"
+
+#include <cstdlib>
+#include <limits>
+#include <new>
+
+namespace Allocations {
+
+namespace {
+
+struct State
+{
+    std::size_t remaining = 0; ///< allocations until the one that fails; 0: none does
+    std::size_t bytes = std::numeric_limits<std::size_t>::max();
+    bool failed = false;
+    int pauses = 0;
+};
+
+thread_local State state;
+
+bool failsNow(std::size_t size)
+{
+    if (state.pauses > 0)
+        return false;
+    const bool nth = state.remaining > 0 && --state.remaining == 0;
+    if (!nth && size < state.bytes)
+        return false;
+    state = State();
+    state.failed = true;
+    return true;
+}
+
+void* allocate(std::size_t size)
+{
+    void* const memory = failsNow(size) ? nullptr : std::malloc(size > 0 ? size : 1);
+    if (memory == nullptr)
+        throw std::bad_alloc();
+    return memory;
+}
+
+} // namespace
+
+void failNth(std::size_t nth)
+{
+    state = State();
+    state.remaining = nth;
+}
+
+void failFrom(std::size_t bytes)
+{
+    state = State();
+    state.bytes = bytes;
+}
+
+bool stop()
+{
+    const bool failed = state.failed;
+    state = State();
+    return failed;
+}
+
+Pause::Pause()
+{
+    ++state.pauses;
+}
+Pause::~Pause()
+{
+    --state.pauses;
+}
+
+} // namespace Allocations
+
+void* operator new(std::size_t size)
+{
+    return Allocations::allocate(size);
+}
+void* operator new[](std::size_t size)
+{
+    return Allocations::allocate(size);
+}
+void operator delete(void* memory) noexcept
+{
+    std::free(memory);
+}
+void operator delete[](void* memory) noexcept
+{
+    std::free(memory);
+}
+void operator delete(void* memory, std::size_t) noexcept
+{
+    std::free(memory);
+}
+void operator delete[](void* memory, std::size_t) noexcept
+{
+    std::free(memory);
+}
