@@ -21,7 +21,6 @@ target_compile_options(
               -Wcast-qual
               -Wformat=2
               -Wimplicit-fallthrough
-              -Wnull-dereference
               -Wundef
               -Wunused
               -Werror

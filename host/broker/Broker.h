@@ -107,7 +107,8 @@ private:
 };
 
 /// A request in the broker's own terms, for driving a provider's function tables by hand: the objects
-/// that are made on this thread while it exists belong to it and end with it. Requests nest.
+/// that are made on this thread while it exists belong to it and end with it. Requests of a thread nest: the
+/// one made last ends first.
 class Request
 {
 public:

@@ -290,6 +290,24 @@ CMPIInstance* newReference(const CMPIObjectPath* path, FarEnd farEnd, const CMPI
     return instance;
 }
 
+/// Makes the association instance of the request's path with each object of the far end and hands it on, null
+/// where it could not be made.
+/// \param farPaths  filled with the paths of the far end
+/// \return whether the far end could be had; if not, the status is as the factory set it
+template <class HandOn>
+bool forEachReference(const GlimmarkFactory& factory, const CMPIObjectPath* target, const CMPIObjectPath* ref,
+                      std::vector<CMPIObjectPath*>& farPaths, CMPIStatus& status, HandOn handOn)
+{
+    const FarEnd farEnd = farEndOf(target, &status);
+    const CMPIObjectPath* const path = newAssociationPath(ref, &status);
+    setOrigin(path, ref, &status);
+    if (getFarPaths(factory, farEnd, ref, farPaths, &status) != 0)
+        return false;
+    forEach(farPaths,
+            [&](const CMPIObjectPath* far) { handOn(newReference(path, farEnd, ref, far, &status)); });
+    return true;
+}
+
 } // namespace
 
 // The traversals. None of them calls returnDone, and role, result role and result class filter nothing: all
@@ -317,15 +335,10 @@ CMPIStatus GlimmarkElementCapabilities_References(CMPIAssociationMI* mi, const C
         fail(status, "Object Path is NULL in References.", "Object Path is NULL in References.");
         return status;
     }
-    const FarEnd farEnd = farEndOf(target, &status);
-    const CMPIObjectPath* const path = newAssociationPath(ref, &status);
-    setOrigin(path, ref, &status);
-    if (getFarPaths(factory, farEnd, ref, farPaths, &status) != 0)
+    // An instance that could not be made is handed on as it is.
+    if (!forEachReference(factory, target, ref, farPaths, status,
+                          [&](const CMPIInstance* instance) { Cmpi::returnInstance(rslt, instance); }))
         return status;
-    forEach(farPaths, [&](const CMPIObjectPath* far) {
-        // An instance that could not be made is handed on as it is.
-        Cmpi::returnInstance(rslt, newReference(path, farEnd, ref, far, &status));
-    });
 
     // The last label differs from the ENTERING line's: meant, log filters know it so.
     flow.exiting(parameters(" p     roperties="));
@@ -353,16 +366,11 @@ CMPIStatus GlimmarkElementCapabilities_ReferenceNames(CMPIAssociationMI* mi, con
         fail(status, "Object Path is NULL in ReferenceNames.", "Object Path is NULL in ReferenceNames.");
         return status;
     }
-    const FarEnd farEnd = farEndOf(target, &status);
-    const CMPIObjectPath* const path = newAssociationPath(ref, &status);
-    setOrigin(path, ref, &status);
-    if (getFarPaths(factory, farEnd, ref, farPaths, &status) != 0)
+    if (!forEachReference(factory, target, ref, farPaths, status, [&](const CMPIInstance* instance) {
+            if (const CMPIObjectPath* name = Cmpi::objectPathOf(instance, &status))
+                returnObjectPathOf(rslt, name, ref, &status);
+        }))
         return status;
-    forEach(farPaths, [&](const CMPIObjectPath* far) {
-        const CMPIInstance* const instance = newReference(path, farEnd, ref, far, &status);
-        if (const CMPIObjectPath* name = Cmpi::objectPathOf(instance, &status))
-            returnObjectPathOf(rslt, name, ref, &status);
-    });
 
     flow.exiting(parameters());
     return status;
