@@ -85,17 +85,23 @@ template <class Result, class Body>
 Result serve(const char* service, CMPIStatus* rc, Result otherwise, const Body& body)
 {
     Call call(service);
-    Result result = otherwise;
+    const auto writeStatus = [&] {
+        if (rc != nullptr)
+            *rc = call.status();
+    };
+    // The result of the body is a variable of its own: assigned to one that holds `otherwise`, the compiler
+    // lets the body write into that one, and a body that throws leaves it half written.
     try {
-        result = body(call);
+        const Result result = body(call);
+        writeStatus();
+        return result;
     } catch (const Refusal& refusal) {
         call.answerWith(refusal.code);
     } catch (const std::exception&) {
         call.answerWith(CMPI_RC_ERR_FAILED);
     }
-    if (rc != nullptr)
-        *rc = call.status();
-    return result;
+    writeStatus();
+    return otherwise;
 }
 
 /// Runs a service that answers with its status.
