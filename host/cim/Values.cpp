@@ -79,6 +79,31 @@ bool sameKeyScalar(const Value::Scalar& a, const Value::Scalar& b)
     return equalScalars(a, b);
 }
 
+std::string lowerCase(std::string text)
+{
+    const auto lower = [](char byte) {
+        return byte >= 'A' && byte <= 'Z' ? static_cast<char>(byte - 'A' + 'a') : byte;
+    };
+    std::transform(text.begin(), text.end(), text.begin(), lower);
+    return text;
+}
+
+std::string lookupText(const Value& value)
+{
+    if (value.items.size() != 1)
+        return {};
+    const Value::Scalar& item = value.items.front();
+    if (const auto* text = std::get_if<std::string>(&item))
+        return *text;
+    if (const auto* flag = std::get_if<bool>(&item))
+        return *flag ? "TRUE" : "FALSE";
+    if (const auto integer = integerOf(item))
+        return (integer->first ? "-" : "") + std::to_string(integer->second);
+    if (const auto* path = std::get_if<std::shared_ptr<const ObjectPath>>(&item); path != nullptr && *path)
+        return cim::lookupText(**path);
+    return {};
+}
+
 bool sameOrMissing(const std::string& a, const std::string& b)
 {
     return a.empty() || b.empty() || sameName(a, b);
@@ -204,6 +229,20 @@ bool sameObject(const ObjectPath& a, const ObjectPath& b)
                const Value* other = findKey(b, key.name);
                return other != nullptr && sameKeyValue(key.value, *other);
            });
+}
+
+std::string lookupText(const ObjectPath& path)
+{
+    std::vector<std::string> keys;
+    keys.reserve(path.keys.size());
+    for (const Key& key : path.keys)
+        keys.push_back(lowerCase(key.name) + '=' + lookupText(key.value));
+    std::sort(keys.begin(), keys.end());
+
+    std::string text = lowerCase(path.className);
+    for (const std::string& key : keys)
+        text += '\n' + key;
+    return text;
 }
 
 const Value* findKey(const ObjectPath& path, std::string_view name)

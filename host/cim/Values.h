@@ -5,6 +5,7 @@
 
 #include "cim/Model.h"
 
+#include <string>
 #include <string_view>
 
 namespace cimhost::cim {
@@ -42,6 +43,10 @@ bool sameKeyValue(const Value& a, const Value& b);
 /// Whether both paths name the same object: the same class and keys, in any order and letter case of
 /// names. Hosts take no part, and a missing namespace is anyone's.
 bool sameObject(const ObjectPath& a, const ObjectPath& b);
+
+/// What to look paths up by: equal for paths that are sameObject(). Others may share it too, where they
+/// differ in the namespace or in keys that are real numbers, arrays or embedded instances.
+std::string lookupText(const ObjectPath& path);
 
 /// The value of that name; null: there is none.
 const Value* findKey(const ObjectPath& path, std::string_view name);

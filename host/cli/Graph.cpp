@@ -10,6 +10,7 @@
 #include <optional>
 #include <ostream>
 #include <string_view>
+#include <unordered_map>
 #include <vector>
 
 namespace cimhost::cli {
@@ -65,15 +66,16 @@ std::vector<End> endsOf(const cim::Instance& instance)
 
 // Matching references and nodes
 
-/// Whether the reference names the instance. Providers often give an instance a path without keys;
-/// its properties then say which one it is.
-bool names(const cim::ObjectPath& reference, const cim::Instance& instance)
+/// Whether the reference names the instance, whose path has no keys, as providers often give it: its
+/// properties then say which one it is.
+bool namesByProperties(const cim::ObjectPath& reference, const cim::Instance& instance)
 {
+    if (!cim::sameName(reference.className, instance.path.className))
+        return false;
     cim::ObjectPath path = instance.path;
-    if (path.keys.empty())
-        for (const cim::Key& key : reference.keys)
-            if (const cim::Value* value = cim::findProperty(instance, key.name))
-                path.keys.push_back({key.name, *value});
+    for (const cim::Key& key : reference.keys)
+        if (const cim::Value* value = cim::findProperty(instance, key.name))
+            path.keys.push_back({key.name, *value});
     return cim::sameObject(reference, path);
 }
 
@@ -81,31 +83,48 @@ bool names(const cim::ObjectPath& reference, const cim::Instance& instance)
 class Nodes
 {
 public:
-    explicit Nodes(const std::vector<cim::Instance>& instances) : instances_(instances) {}
+    explicit Nodes(const std::vector<cim::Instance>& instances) : instances_(instances)
+    {
+        for (std::size_t index = 0; index < instances.size(); ++index)
+            if (instances[index].path.keys.empty())
+                withoutKeys_.push_back(index);
+            else
+                byText_[cim::lookupText(instances[index].path)].push_back(index);
+    }
 
+    /// The first node that the reference names; a new one, if there is none.
     std::size_t indexOf(const cim::ObjectPath& reference)
     {
-        const auto instance =
-            std::find_if(instances_.begin(), instances_.end(),
-                         [&](const cim::Instance& candidate) { return names(reference, candidate); });
-        if (instance != instances_.end())
-            return static_cast<std::size_t>(instance - instances_.begin());
-        const auto missing =
-            std::find_if(missing_.begin(), missing_.end(), [&](const cim::ObjectPath& candidate) {
-                return cim::sameObject(reference, candidate);
-            });
-        const auto index = static_cast<std::size_t>(missing - missing_.begin());
-        if (missing == missing_.end())
+        const std::size_t next = instances_.size() + missing_.size();
+        std::vector<std::size_t>& sameText = byText_[cim::lookupText(reference)];
+        const auto byPath = std::find_if(sameText.begin(), sameText.end(), [&](std::size_t index) {
+            return cim::sameObject(reference, pathOf(index));
+        });
+        const auto byProperties =
+            std::find_if(withoutKeys_.begin(), withoutKeys_.end(),
+                         [&](std::size_t index) { return namesByProperties(reference, instances_[index]); });
+        const std::size_t found = std::min(byPath == sameText.end() ? next : *byPath,
+                                           byProperties == withoutKeys_.end() ? next : *byProperties);
+        if (found == next) {
+            sameText.push_back(next);
             missing_.push_back(reference);
-        return instances_.size() + index;
+        }
+        return found;
     }
 
     [[nodiscard]] const std::vector<cim::Instance>& instances() const { return instances_; }
     [[nodiscard]] const std::vector<cim::ObjectPath>& missing() const { return missing_; }
 
 private:
+    [[nodiscard]] const cim::ObjectPath& pathOf(std::size_t index) const
+    {
+        return index < instances_.size() ? instances_[index].path : missing_[index - instances_.size()];
+    }
+
     const std::vector<cim::Instance>& instances_;
     std::vector<cim::ObjectPath> missing_;
+    std::unordered_map<std::string, std::vector<std::size_t>> byText_; ///< by cim::lookupText(), ascending
+    std::vector<std::size_t> withoutKeys_;
 };
 
 // Writing DOT

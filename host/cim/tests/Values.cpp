@@ -122,6 +122,36 @@ TEST(Objects, areTheSameIfTheirReferencesNameTheSameObjects)
     EXPECT_FALSE(sameObject(link, {"", "", "CIM_Link", {{"Left", referenceValue(fan(unsignedValue(2)))}}}));
 }
 
+TEST(LookupTexts, areEqualForTheSameObject)
+{
+    const ObjectPath path = fan(unsignedValue(1));
+    EXPECT_EQ(
+        lookupText(path),
+        lookupText(
+            {"srv", "", "cim_FAN", {{"number", signedValue(1, CMPI_sint8)}, {"NAME", textValue("x")}}}));
+    const ObjectPath link{"", "", "CIM_Link", {{"Left", referenceValue(path)}}};
+    ObjectPath remote = path;
+    remote.host = "srv";
+    EXPECT_EQ(lookupText(link), lookupText({"", "", "CIM_Link", {{"Left", referenceValue(remote)}}}));
+    EXPECT_EQ(lookupText(fan(realValue(0.0))), lookupText(fan(realValue(-0.0))));
+}
+
+TEST(LookupTexts, differByClassAndKeys)
+{
+    const ObjectPath path = fan(unsignedValue(1));
+    ObjectPath other = path;
+    other.className = "CIM_Led";
+    EXPECT_NE(lookupText(path), lookupText(other));
+    other = path;
+    other.keys.pop_back();
+    EXPECT_NE(lookupText(path), lookupText(other));
+    EXPECT_NE(lookupText(path), lookupText(fan(unsignedValue(2))));
+    EXPECT_NE(lookupText(path), lookupText(fan(signedValue(-1))));
+    EXPECT_NE(lookupText(fan(booleanValue(true))), lookupText(fan(booleanValue(false))));
+    EXPECT_NE(lookupText(fan(textValue("a"))), lookupText(fan(textValue("A"))));
+    EXPECT_NE(lookupText(fan(referenceValue(path))), lookupText(fan(referenceValue(other))));
+}
+
 TEST(Names, findKeysAndProperties)
 {
     const ObjectPath path = fan(unsignedValue(1));

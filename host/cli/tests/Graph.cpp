@@ -170,4 +170,47 @@ TEST(Dot, showsAMissingObjectOnce)
     EXPECT_THAT(graph, Not(HasSubstr("n2")));
 }
 
+TEST(Dot, tellsNodesOfTheSameKeysInDifferentNamespacesApart)
+{
+    cim::Instance elsewhere = led("a", 5);
+    elsewhere.path.nameSpace = "root/other";
+    const cim::Value a = cim::referenceValue(pathOf("CIM_Led", "a"));
+    EXPECT_THAT(graphOf({elsewhere, led("a", 5), link(a, a)}), HasSubstr("\n    n1 -> n1 ["));
+}
+
+TEST(Dot, prefersTheFirstNodeHoweverItIsFound)
+{
+    cim::Instance bare = led("a", 5);
+    bare.path.keys.clear();
+    const cim::Value a = cim::referenceValue(pathOf("CIM_Led", "a"));
+    EXPECT_THAT(graphOf({bare, led("a", 5), link(a, a)}), HasSubstr("\n    n0 -> n0 ["));
+    EXPECT_THAT(graphOf({led("a", 5), bare, link(a, a)}), HasSubstr("\n    n0 -> n0 ["));
+}
+
+std::size_t count(const std::string& text, const std::string& part)
+{
+    std::size_t found = 0;
+    for (std::size_t at = text.find(part); at != std::string::npos; at = text.find(part, at + part.size()))
+        ++found;
+    return found;
+}
+
+// Comparing every end of an edge with every node would take minutes here.
+TEST(Dot, drawsManyNodesAndEdges)
+{
+    constexpr std::size_t most = 20000;
+    std::vector<cim::Instance> instances;
+    for (std::size_t i = 0; i < most; ++i) {
+        const std::string id = std::to_string(i);
+        instances.push_back(led(id, 5));
+        instances.push_back(
+            link(cim::referenceValue(pathOf("CIM_Led", id)), cim::referenceValue(pathOf("CIM_Gone", id))));
+    }
+    const std::string graph = graphOf(instances);
+    EXPECT_EQ(count(graph, " -> "), most);
+    EXPECT_EQ(count(graph, "fillcolor=palegreen"), most);
+    EXPECT_EQ(count(graph, "style=dashed"), most);
+    EXPECT_THAT(graph, HasSubstr("\n    n19999 -> n39999 ["));
+}
+
 } // namespace
