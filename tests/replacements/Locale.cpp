@@ -1,4 +1,4 @@
-// Another maker's locale library, which has one text for everything.
+// Another maker's locale library, whose texts say what they were asked for by.
 
 #include <Tavro/Locale.h>
 
@@ -10,26 +10,35 @@ std::string getLanguageId()
 {
     return "xx";
 }
-std::wstring getResourceLibrary(int, const std::string&)
+
+std::wstring getResourceLibrary(int library, const std::string& language)
 {
-    return L"replaced";
+    return std::to_wstring(library) + L" in " + std::wstring(language.begin(), language.end());
 }
 
 } // namespace Locale
 
 struct ResourceString::Implementation
-{};
+{
+    std::wstring text;
+};
 
-ResourceString::ResourceString(const std::wstring&, const std::wstring&) {}
+ResourceString::ResourceString(const std::wstring& library, const std::wstring& messageId)
+    : implementation_(new Implementation{L"replaced " + messageId + L" of " + library})
+{}
+
 ResourceString::~ResourceString() = default;
 ResourceString::operator std::wstring() const
 {
-    return L"replaced caption";
+    return implementation_->text;
 }
 
 std::string make_string(const std::wstring& text)
 {
-    return {text.begin(), text.end()};
+    std::string narrow;
+    for (const wchar_t character : text)
+        narrow += static_cast<char>(character);
+    return narrow;
 }
 
 } // namespace Tavro
