@@ -1,15 +1,13 @@
 #include "broker/Registration.h"
 
+#include "cim/RegularFile.h"
+#include "cim/Utf8.h"
 #include "cim/Values.h"
 
 #include <algorithm>
 #include <array>
-#include <cerrno>
-#include <cstdio>
 #include <cstring>
-#include <fstream>
 #include <set>
-#include <sstream>
 #include <string_view>
 #include <utility>
 
@@ -39,22 +37,10 @@ std::vector<std::string> words(std::string_view text)
     return found;
 }
 
-/// Text from a file as part of a message: in quotes, of bounded length, control characters escaped.
+/// Text from a file as part of a message.
 std::string shown(std::string_view text)
 {
-    constexpr std::size_t most = 60;
-    std::string result = "\"";
-    for (const char c : text.substr(0, most)) {
-        const auto byte = static_cast<unsigned char>(c);
-        if (byte >= 0x20 && byte != 0x7f) {
-            result += c;
-        } else {
-            std::array<char, 8> escaped{};
-            std::snprintf(escaped.data(), escaped.size(), "\\x%02x", static_cast<unsigned>(byte));
-            result += escaped.data();
-        }
-    }
-    return result + (text.size() > most ? "...\"" : "\"");
+    return '"' + cim::excerpt(text) + '"';
 }
 
 bool isLetter(char c)
@@ -93,7 +79,7 @@ bool isNameSpace(std::string_view text)
 class Parser
 {
 public:
-    explicit Parser(std::string name) : name_(std::move(name)) {}
+    explicit Parser(const std::string& name) : name_(cim::printable(name)) {}
 
     Registration parse(std::string_view text)
     {
@@ -234,13 +220,13 @@ Registration parseRegistration(const std::string& text, const std::string& name)
 
 Registration readRegistrationFile(const std::string& fileName)
 {
-    std::ifstream file(fileName, std::ios::binary);
-    file.peek(); // a folder can be opened, but not read
-    if (!file.is_open() || file.bad())
-        throw RegistrationError(fileName + ": cannot be read: " + std::strerror(errno));
-    std::ostringstream text;
-    text << file.rdbuf();
-    return parseRegistration(text.str(), fileName);
+    std::string text;
+    try {
+        text = cim::RegularFile(fileName).read(maxRegistrationLength);
+    } catch (const cim::FileError& error) {
+        throw RegistrationError(cim::printable(fileName) + ": cannot be read: " + error.what());
+    }
+    return parseRegistration(text, fileName);
 }
 
 } // namespace cimhost

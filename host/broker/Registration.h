@@ -13,13 +13,15 @@
 #ifndef CIMHOST_BROKER_REGISTRATION_H
 #define CIMHOST_BROKER_REGISTRATION_H
 
+#include <cstddef>
 #include <stdexcept>
 #include <string>
 #include <vector>
 
 namespace cimhost {
 
-/// A registration file that cannot be used; what() names the file, the line and what was expected.
+/// A registration file that cannot be used; what() names the file, the line and what was
+/// expected, and may go to a terminal.
 class RegistrationError : public std::runtime_error
 {
 public:
@@ -48,7 +50,11 @@ struct Registration
 /// unknown or repeated entry, a missing one, an unknown type, the same class and provider twice
 Registration parseRegistration(const std::string& text, const std::string& name);
 
-/// Reads a registration file. \throws RegistrationError  also when the file cannot be read
+/// The longest file read, in bytes.
+constexpr std::size_t maxRegistrationLength = 1048576;
+
+/// Reads a registration file. \throws RegistrationError  also when the file cannot be read, is no
+/// regular file or too long
 Registration readRegistrationFile(const std::string& fileName);
 
 } // namespace cimhost

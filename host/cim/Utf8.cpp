@@ -82,6 +82,15 @@ std::string printable(std::string_view text)
     return result;
 }
 
+std::string excerpt(std::string_view text, std::size_t most)
+{
+    std::string_view rest = text;
+    for (; most > 0 && !rest.empty(); --most)
+        takeCharacter(rest);
+    const std::string beginning = printable(text.substr(0, text.size() - rest.size()));
+    return rest.empty() ? beginning : beginning + "...";
+}
+
 std::string escaped(std::string_view text, std::string_view quoted)
 {
     std::string result;

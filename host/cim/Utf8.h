@@ -26,6 +26,9 @@ bool isControl(char32_t character);
 /// of each byte that is not UTF-8. Backslashes stay as they are: this is for reading, not for parsing.
 std::string printable(std::string_view text);
 
+/// The printable beginning of a text, for a message: after `most` characters stands "..." for the rest.
+std::string excerpt(std::string_view text, std::size_t most = 60);
+
 /// As printable(), with the characters of `quoted` and the backslash escaped by a backslash too: the
 /// inside of a MOF string or character literal.
 std::string escaped(std::string_view text, std::string_view quoted);

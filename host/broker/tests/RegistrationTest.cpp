@@ -2,12 +2,15 @@
 
 #include "broker/Registration.h"
 
+#include <filesystem>
 #include <fstream>
 #include <random>
 #include <string>
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
+#include <sys/stat.h>
+#include <unistd.h>
 
 namespace cimhost {
 
@@ -132,7 +135,9 @@ INSTANTIATE_TEST_SUITE_P(
                     "[test_thing]\nprovider: Thing\nlocation: B\ntype: association\nnamespace: root/x\n",
                 "test.reg:6: the class test_thing and the provider Thing are registered in line 1 already"},
         BadText{"ControlCharacters", std::string("a\0b\x1b[2J", 7),
-                R"(test.reg:1: expected a section [CLASS] first, found "a\x00b\x1b[2J")"},
+                R"(test.reg:1: expected a section [CLASS] first, found "a\x0000b\x001B[2J")"},
+        BadText{"NotUtf8", "\xff\xc3",
+                "test.reg:1: expected a section [CLASS] first, found \"\uFFFD\uFFFD\""},
         BadText{"LongLine", std::string(100, 'x'),
                 "test.reg:1: expected a section [CLASS] first, found \"" + std::string(60, 'x') + "...\""}),
     [](const auto& instance) { return instance.param.name; });
@@ -169,6 +174,48 @@ TEST(RegistrationTest, SaysWhyAFileCannotBeRead)
         } catch (const RegistrationError& error) {
             EXPECT_THAT(error.what(), HasSubstr(name + ": cannot be read: "));
         }
+    }
+}
+
+std::string errorOfFile(const std::string& name)
+{
+    try {
+        readRegistrationFile(name);
+        return "no error";
+    } catch (const RegistrationError& error) {
+        return error.what();
+    }
+}
+
+TEST(RegistrationTest, ReadsNoDeviceAndNoPipe)
+{
+    EXPECT_EQ(errorOfFile("/dev/zero"), "/dev/zero: cannot be read: expected a regular file, found a device");
+    const std::string pipe = testing::TempDir() + "cimhost-registration-test.pipe";
+    unlink(pipe.c_str());
+    ASSERT_EQ(mkfifo(pipe.c_str(), 0600), 0);
+    EXPECT_EQ(errorOfFile(pipe), pipe + ": cannot be read: expected a regular file, found a pipe");
+    unlink(pipe.c_str());
+}
+
+TEST(RegistrationTest, ReadsFilesUpToALimit)
+{
+    const std::string name = testing::TempDir() + "cimhost-registration-limit.reg";
+    const std::string start = thing + std::string("#");
+    std::ofstream(name) << start << std::string(maxRegistrationLength - start.size(), 'x');
+    EXPECT_EQ(readRegistrationFile(name).classes.size(), 1U);
+    std::ofstream(name, std::ios::app) << 'x';
+    EXPECT_EQ(errorOfFile(name), name + ": cannot be read: expected at most 1048576 bytes, found more");
+    std::filesystem::remove(name);
+}
+
+TEST(RegistrationTest, ShowsFileNamesPrintably)
+{
+    EXPECT_THAT(errorOfFile("/nowhere/\x1b[2J"), HasSubstr("/nowhere/\\x001B[2J: "));
+    try {
+        parseRegistration("x", "\x1b");
+        FAIL() << "no error";
+    } catch (const RegistrationError& error) {
+        EXPECT_THAT(error.what(), HasSubstr("\\x001B:1: "));
     }
 }
 

@@ -51,6 +51,15 @@ TEST(Printable, replacesWhatIsNoUtf8)
               "a\uFFFD\uFFFDb");
 }
 
+TEST(Excerpt, cutsAfterWholeCharacters)
+{
+    EXPECT_EQ(excerpt("L\u00fcfter", 6), "L\u00fcfter");
+    EXPECT_EQ(excerpt("L\u00fcfter", 2), "L\u00fc...");
+    EXPECT_EQ(excerpt("\xff\x1b!", 2), "\uFFFD\\x001B...");
+    EXPECT_EQ(excerpt("a", 0), "...");
+    EXPECT_EQ(excerpt("", 0), "");
+}
+
 TEST(Escaped, escapesBackslashAndQuotes)
 {
     EXPECT_EQ(escaped("a\"b\\c'd\n", "\""), R"(a\"b\\c'd\n)");
