@@ -1,12 +1,12 @@
 #include "cli/Installation.h"
 
+#include "cim/RegularFile.h"
+#include "cim/Utf8.h"
 #include "cim/Values.h"
 #include "cli/Arguments.h"
 
 #include <algorithm>
-#include <cerrno>
 #include <cstdlib>
-#include <fstream>
 #include <initializer_list>
 #include <sstream>
 #include <system_error>
@@ -65,8 +65,9 @@ void append(const Registration& added, const std::string& file, Registration& al
                 return cim::sameName(other.className, entry.className) && other.provider == entry.provider;
             });
         if (repeated)
-            throw RegistrationError(file + ": [" + entry.className + "] is registered with the provider " +
-                                    entry.provider + " in another file already");
+            throw RegistrationError(cim::printable(file) + ": [" + entry.className +
+                                    "] is registered with the provider " + entry.provider +
+                                    " in another file already");
     }
     all.classes.insert(all.classes.end(), added.classes.begin(), added.classes.end());
 }
@@ -109,18 +110,22 @@ std::vector<std::string> findRegistrationFiles(const Settings& settings, const S
 Registration readRegistrations(const std::vector<std::string>& files)
 {
     Registration all;
-    for (const std::string& file : files)
-        append(readRegistrationFile(file), file, all);
+    for (const std::string& file : files) {
+        const Registration added = readRegistrationFile(file);
+        if (added.classes.empty())
+            throw RegistrationError("no class is registered in " + cim::printable(file));
+        append(added, file, all);
+    }
     return all;
 }
 
 void useInventory(const std::string& file)
 {
-    errno = 0;
-    std::ifstream stream(file);
-    stream.peek(); // a directory opens as a file does; only reading it fails
-    if (errno != 0)
-        throw UsageError("cannot read the inventory " + file + ": " + std::generic_category().message(errno));
+    try {
+        const cim::RegularFile readable(file);
+    } catch (const cim::FileError& error) {
+        throw UsageError("cannot read the inventory " + cim::printable(file) + ": " + error.what());
+    }
     setenv("TAVRO_INVENTORY", file.c_str(), 1);
 }
 

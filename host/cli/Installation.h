@@ -35,11 +35,12 @@ std::vector<std::string> findProviderDirectories(const Settings& settings, const
 std::vector<std::string> findRegistrationFiles(const Settings& settings, const Surroundings& surroundings);
 
 /// The classes of all files.
-/// \throws RegistrationError  also for a class that two files register with the same provider
+/// \throws RegistrationError  also for a file without any class, and for a class that two files register
+/// with the same provider
 Registration readRegistrations(const std::vector<std::string>& files);
 
 /// Sets TAVRO_INVENTORY for the providers that will be loaded.
-/// \throws UsageError  the file cannot be read
+/// \throws UsageError  it is no regular file, or cannot be read; what it holds is the providers' concern
 void useInventory(const std::string& file);
 
 } // namespace cimhost::cli

@@ -7,6 +7,7 @@
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
+#include <sys/stat.h>
 
 using namespace cimhost;
 using namespace cimhost::cli;
@@ -118,6 +119,16 @@ std::string section(const std::string& className, const std::string& provider)
            "\n location: L\n type: instance\n namespace: root/cimv2\n#\n";
 }
 
+std::string errorOfRegistrations(const std::vector<std::string>& files)
+{
+    try {
+        readRegistrations(files);
+        return "no error";
+    } catch (const RegistrationError& error) {
+        return error.what();
+    }
+}
+
 TEST_F(Installation, registrationsOfSeveralFilesAddUp)
 {
     const Registration all =
@@ -133,13 +144,16 @@ TEST_F(Installation, aClassAndProviderMayNotBeInTwoFiles)
 {
     const std::string first = tree.file("a.reg", section("CIM_A", "P"));
     const std::string second = tree.file("b.reg", section("cim_a", "P"));
-    try {
-        readRegistrations({first, second});
-        FAIL();
-    } catch (const RegistrationError& error) {
-        EXPECT_EQ(error.what(),
-                  second + ": [cim_a] is registered with the provider P in another file already");
-    }
+    EXPECT_EQ(errorOfRegistrations({first, second}),
+              second + ": [cim_a] is registered with the provider P in another file already");
+}
+
+TEST_F(Installation, aRegistrationHasAClass)
+{
+    const std::string full = tree.file("a.reg", section("CIM_A", "P"));
+    const std::string empty = tree.file("b\x1b.reg", "# nothing\n");
+    EXPECT_EQ(errorOfRegistrations({full, empty}),
+              "no class is registered in " + tree.path().string() + "/b\\x001B.reg");
 }
 
 TEST_F(Installation, anInventoryIsHandedOnInTheEnvironment)
@@ -162,7 +176,37 @@ TEST_F(Installation, anInventoryMustBeReadable)
         }
         EXPECT_EQ(std::getenv("TAVRO_INVENTORY"), nullptr);
     }
-    EXPECT_THROW(useInventory(""), UsageError);
+}
+
+std::string errorOfInventory(const std::string& file)
+{
+    try {
+        useInventory(file);
+        unsetenv("TAVRO_INVENTORY");
+        return "no error";
+    } catch (const UsageError& error) {
+        return error.what();
+    }
+}
+
+TEST_F(Installation, anInventoryIsARegularFile)
+{
+    const std::string pipe = tree.path() / "pipe";
+    ASSERT_EQ(mkfifo(pipe.c_str(), 0600), 0);
+    EXPECT_EQ(errorOfInventory(pipe),
+              "cannot read the inventory " + pipe + ": expected a regular file, found a pipe");
+    for (const std::string device : {"/dev/null", "/dev/zero"})
+        EXPECT_EQ(errorOfInventory(device),
+                  "cannot read the inventory " + device + ": expected a regular file, found a device");
+}
+
+TEST_F(Installation, namesOfFilesAreShownPrintably)
+{
+    EXPECT_THAT(errorOfInventory("/nowhere/\x1b[2J"),
+                HasSubstr("the inventory /nowhere/\\x001B[2J: No such file"));
+    const std::string first = tree.file("a.reg", section("CIM_A", "P"));
+    const std::string second = tree.file("\x1b.reg", section("CIM_A", "P"));
+    EXPECT_THAT(errorOfRegistrations({first, second}), HasSubstr("/\\x001B.reg: [CIM_A]"));
 }
 
 } // namespace
