@@ -192,7 +192,7 @@ std::string Reader::readKeyName(const std::vector<Key>& keys)
     const bool repeated =
         std::any_of(keys.begin(), keys.end(), [&](const Key& key) { return sameName(key.name, name); });
     if (repeated)
-        fail(start, "the key " + name + " again", "each key once");
+        fail(start, "the key " + excerpt(name) + " again", "each key once");
     return name;
 }
 
@@ -230,7 +230,7 @@ Value Reader::readNumber()
         return integer < 0 ? signedValue(integer) : unsignedValue(0);
     if (!isInteger && isRead(real))
         return realValue(real);
-    fail(start, '"' + std::string(token) + '"', "a decimal number of 64 bits");
+    fail(start, '"' + excerpt(token) + '"', "a decimal number of 64 bits");
 }
 
 Value Reader::readBoolean()
@@ -241,7 +241,7 @@ Value Reader::readBoolean()
         return booleanValue(true);
     if (sameName(word, "FALSE"))
         return booleanValue(false);
-    fail(start, '"' + printable(word) + '"', "a quoted text, a number, TRUE or FALSE");
+    fail(start, '"' + excerpt(word) + '"', "a quoted text, a number, TRUE or FALSE");
 }
 
 Value Reader::readQuotedValue()

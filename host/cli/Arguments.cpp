@@ -58,7 +58,6 @@ struct Arguments
     std::string nameSpace = "root/cimv2";
     std::vector<std::string> properties;
     std::string format;
-    std::string inventory;
     Invocation invocation;
 };
 
@@ -115,11 +114,17 @@ const std::map<std::string, Format>& formats()
     return names;
 }
 
-/// The text in a line of its own with a mark under the place of the error.
-std::string markPlace(const std::string& text, const cim::ParseError& error)
+/// The text around the place of the error, in a line of its own with a mark under the place.
+std::string markPlace(std::string_view text, const cim::ParseError& error)
 {
-    const std::string before = cim::printable(std::string_view(text).substr(0, error.offset()));
-    return "\n  " + cim::printable(text) + "\n  " + std::string(cim::displayWidth(before), ' ') + '^';
+    constexpr std::size_t most = 60; // characters on either side
+    std::string_view before = text.substr(0, error.offset());
+    const std::size_t excess = error.column() > most ? error.column() - 1 - most : 0;
+    for (std::size_t i = 0; i < excess; ++i)
+        cim::takeCharacter(before);
+    const std::string shown = (excess > 0 ? "..." : "") + cim::printable(before);
+    return "\n  " + shown + cim::excerpt(text.substr(error.offset()), most) + "\n  " +
+           std::string(cim::displayWidth(shown), ' ') + '^';
 }
 
 cim::ObjectPath readTarget(const std::string& text, const std::string& nameSpace)
@@ -134,6 +139,17 @@ cim::ObjectPath readTarget(const std::string& text, const std::string& nameSpace
     }
 }
 
+/// The check of an option's value. An empty one is a shell's variable that was not set, more often than not.
+CLI::Validator named(const char* what)
+{
+    return CLI::Validator(
+        [what](const std::string& value) {
+            return value.empty() ? std::string("expected the name of a ") + what + ", found nothing"
+                                 : std::string();
+        },
+        "");
+}
+
 void addCommonOptions(CLI::App& app, Arguments& arguments)
 {
     Settings& settings = arguments.invocation.settings;
@@ -143,13 +159,15 @@ void addCommonOptions(CLI::App& app, Arguments& arguments)
     app.add_option("--provider-dir", settings.providerDirectories,
                    "Directory of provider libraries; repeatable")
         ->type_name("DIR")
+        ->check(named("directory"))
         ->allow_extra_args(false);
     app.add_option("--registration", settings.registrationFiles, "Registration of providers; repeatable")
         ->type_name("FILE")
+        ->check(named("file"))
         ->allow_extra_args(false);
-    app.add_option("--inventory", arguments.inventory,
-                   "Hardware inventory for the providers, TAVRO_INVENTORY")
-        ->type_name("FILE");
+    app.add_option("--inventory", settings.inventory, "Hardware inventory for the providers, TAVRO_INVENTORY")
+        ->type_name("FILE")
+        ->check(named("file"));
     app.add_flag("--trace", settings.trace, "Show what providers trace and log, on standard error");
     app.add_option("-f,--format", arguments.format,
                    "How answers are shown; without it as text, and instances on a terminal as a table")
@@ -209,8 +227,6 @@ void finish(Arguments& arguments)
                      [&](const CommandEntry& candidate) { return candidate.operation == command.operation; });
     if (!arguments.format.empty())
         command.format = formats().at(arguments.format);
-    if (!arguments.inventory.empty())
-        arguments.invocation.settings.inventory = arguments.inventory;
     if (!arguments.properties.empty())
         command.properties = arguments.properties;
 
@@ -229,10 +245,9 @@ void finish(Arguments& arguments)
 std::string describe(const CLI::App& app, const CLI::ParseError& error)
 {
     if (!app.get_subcommands().empty())
-        return error.what();
+        return cim::printable(error.what());
     const std::vector<std::string> unknown = app.remaining();
-    return unknown.empty() ? "a command is required"
-                           : "there is no command " + cim::printable(unknown.front());
+    return unknown.empty() ? "a command is required" : "there is no command " + cim::excerpt(unknown.front());
 }
 
 /// The help or version that was asked for, or the error.

@@ -288,6 +288,20 @@ INSTANTIATE_TEST_SUITE_P(
         Wrong{"CIM_A.K=\"\xe2\x82\"", 10, "a byte that is not UTF-8", "text in UTF-8"},
         Wrong{"CIM_A.K=\x1b", 9, "\"\\x001B\"", aValue}));
 
+TEST(ObjectPathReader, cutsWhatItQuotes)
+{
+    const std::string name(100, 'x');
+    for (const std::string& text :
+         {"C.K=" + name, "C.K=7" + std::string(100, '7'), "C." + name + "=1," + name + "=2"})
+        try {
+            parseObjectPath(text);
+            FAIL() << text;
+        } catch (const ParseError& error) {
+            EXPECT_LT(error.found().size(), 90U) << text;
+            EXPECT_NE(error.found().find("..."), std::string::npos) << text;
+        }
+}
+
 TEST(ObjectPathReader, refusesANullCharacter)
 {
     EXPECT_THROW(parseObjectPath(std::string("CIM_A.K=\"a\0b\"", 13)), ParseError);

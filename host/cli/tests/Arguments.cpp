@@ -14,6 +14,7 @@ using namespace cimhost;
 using namespace cimhost::cli;
 using testing::ElementsAre;
 using testing::HasSubstr;
+using testing::StartsWith;
 
 namespace {
 
@@ -118,6 +119,28 @@ TEST(Arguments, marksTheWrongPlaceOfAPath)
                                     "  ^");
 }
 
+TEST(Arguments, showsOnlyTheSurroundingsOfTheWrongPlace)
+{
+    std::string wide; // 59 characters of two columns each; before them one of the quote
+    for (int i = 0; i < 59; ++i)
+        wide += "\u98a8";
+    EXPECT_EQ(errorOf({"gi", "C.K=\"" + wide + "\"!" + std::string(100, 'x')}),
+              "column 66: found \"!\", expected \",\" and a key, or the end\n"
+              "  ..." +
+                  wide + "\"!" + std::string(59, 'x') + "...\n  " + std::string(3 + 118 + 1, ' ') + '^');
+    EXPECT_EQ(errorOf({"gi", std::string(59, 'C') + "!"}),
+              "column 60: found \"!\", expected \".\" and a key, or the end\n  " + std::string(59, 'C') +
+                  "!\n  " + std::string(59, ' ') + '^');
+    for (const std::string start : {"", "C.", "C.K=", "C.K=\"", "C.K=1", "C.K=\"CIM_A.K="})
+        for (const char* repeated : {"x", "7", "!", "\u98a8", "\x1b", "\xff"}) {
+            std::string text = start;
+            while (text.size() < 120000)
+                text += repeated;
+            EXPECT_LT(errorOf({"gi", text}).size(), 2000U) << start << repeated;
+            EXPECT_LT(errorOf({"gi", text.substr(0, 60000)}).size(), 2000U) << start << repeated;
+        }
+}
+
 TEST(Arguments, propertiesFollowTheTarget)
 {
     EXPECT_EQ(commandOf({"ei", "C"}).properties, std::nullopt);
@@ -219,6 +242,17 @@ TEST(Arguments, setTheBrokerUp)
     EXPECT_TRUE(settings.trace);
 }
 
+TEST(Arguments, namesOfFilesAreNotEmpty)
+{
+    EXPECT_THAT(errorOf({"ei", "C", "--inventory", ""}),
+                StartsWith("--inventory: expected the name of a file, found nothing"));
+    EXPECT_THAT(errorOf({"ei", "C", "--inventory="}), StartsWith("--inventory: "));
+    EXPECT_THAT(errorOf({"ei", "C", "--registration", ""}),
+                StartsWith("--registration: expected the name of a file, found nothing"));
+    EXPECT_THAT(errorOf({"ei", "C", "--provider-dir", "/a", "--provider-dir", ""}),
+                StartsWith("--provider-dir: expected the name of a directory, found nothing"));
+}
+
 TEST(Arguments, repeatableOptionsTakeOneValueEach)
 {
     const Invocation invocation = parse({"--provider-dir", "/a", "ei", "C"});
@@ -236,6 +270,7 @@ TEST(Arguments, refuseWhatIsMissingOrUnknown)
     EXPECT_THAT(errorOf({"gi"}), HasSubstr("PATH is required"));
     EXPECT_THAT(errorOf({"ei", "C", "--frobnicate"}), HasSubstr("--frobnicate"));
     EXPECT_THAT(errorOf({"ei", "C", "--namespace"}), HasSubstr("--namespace"));
+    EXPECT_THAT(errorOf({"ei", "C", "--\x1b"}), HasSubstr("--\\x001B"));
     EXPECT_THAT(errorOf({"ei"}), HasSubstr("\nTry: cimhost --help"));
 }
 
