@@ -12,9 +12,9 @@ namespace cimhost::cim {
 
 namespace {
 
-FileError lastError()
+[[noreturn]] void failWithErrno()
 {
-    return FileError(std::generic_category().message(errno));
+    throw FileError(std::generic_category().message(errno));
 }
 
 const char* fileType(mode_t mode)
@@ -29,7 +29,7 @@ void checkType(int descriptor)
     struct stat status
     {};
     if (fstat(descriptor, &status) != 0)
-        throw lastError();
+        failWithErrno();
     if (!S_ISREG(status.st_mode))
         throw FileError(std::string("expected a regular file, found ") + fileType(status.st_mode));
 }
@@ -41,7 +41,7 @@ RegularFile::RegularFile(const std::string& name)
     : descriptor_(open(name.c_str(), O_RDONLY | O_CLOEXEC | O_NOCTTY | O_NONBLOCK))
 {
     if (descriptor_ < 0)
-        throw lastError();
+        failWithErrno();
     try {
         checkType(descriptor_);
     } catch (const FileError&) {
@@ -55,14 +55,14 @@ RegularFile::~RegularFile()
     close(descriptor_);
 }
 
-std::string RegularFile::read(std::size_t mostBytes)
+std::string RegularFile::read(std::size_t mostBytes) const
 {
     std::string content;
     std::array<char, 65536> part{};
     while (true) {
         const ssize_t count = ::read(descriptor_, part.data(), part.size());
         if (count < 0 && errno != EINTR)
-            throw lastError();
+            failWithErrno();
         if (count == 0)
             return content;
         if (count > 0)

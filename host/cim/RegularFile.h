@@ -28,7 +28,7 @@ public:
 
     /// What is left to read. \param mostBytes  more is refused
     /// \throws FileError
-    std::string read(std::size_t mostBytes);
+    [[nodiscard]] std::string read(std::size_t mostBytes) const;
 
 private:
     int descriptor_;

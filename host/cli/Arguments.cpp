@@ -142,12 +142,11 @@ cim::ObjectPath readTarget(const std::string& text, const std::string& nameSpace
 /// The check of an option's value. An empty one is a shell's variable that was not set, more often than not.
 CLI::Validator named(const char* what)
 {
-    return CLI::Validator(
-        [what](const std::string& value) {
-            return value.empty() ? std::string("expected the name of a ") + what + ", found nothing"
-                                 : std::string();
-        },
-        "");
+    const auto check = [what](const std::string& value) {
+        return value.empty() ? std::string("expected the name of a ") + what + ", found nothing"
+                             : std::string();
+    };
+    return {check, ""};
 }
 
 void addCommonOptions(CLI::App& app, Arguments& arguments)

@@ -29,8 +29,7 @@ protected:
 std::string errorOf(const std::string& name, std::size_t mostBytes)
 {
     try {
-        RegularFile(name).read(mostBytes);
-        return "no error";
+        return "no error: " + RegularFile(name).read(mostBytes);
     } catch (const FileError& error) {
         return error.what();
     }
