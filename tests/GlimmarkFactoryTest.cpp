@@ -12,7 +12,6 @@ using Tavro::GlimmarkProvider::Glimmark;
 using Tavro::GlimmarkProvider::GlimmarkFactory;
 using ::testing::Contains;
 using ::testing::ElementsAre;
-using ::testing::Ge;
 using ::testing::IsEmpty;
 using ::testing::IsNull;
 using ::testing::NotNull;

@@ -58,6 +58,7 @@ protected:
 std::vector<std::string> namesOf(const std::vector<Glimmark>& records)
 {
     std::vector<std::string> names;
+    names.reserve(records.size());
     for (const Glimmark& record : records)
         names.push_back(record.getElementName());
     return names;

@@ -49,12 +49,14 @@ TEST_F(Threads, GetTheAnswersThatOneAloneGets)
                           {TEST_PROVIDER_DIRECTORY});
     const std::vector<Operation> operations = allOperations();
     std::vector<std::string> expected;
+    expected.reserve(operations.size());
     for (const Operation& operation : operations)
         expected.push_back(answerOf(plain, operation));
     RecordedLog::clear();
 
     std::atomic<int> wrong{0};
     std::vector<std::thread> running;
+    running.reserve(threads);
     for (std::size_t thread = 0; thread < threads; ++thread) {
         running.emplace_back([&, thread] {
             for (int round = 0; round < rounds; ++round) {

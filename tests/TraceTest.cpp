@@ -181,6 +181,7 @@ TEST_F(FunctionTraceTest, KeepsTheLinesOfThreadsApart)
     constexpr int threads = 8;
     constexpr int rounds = 200;
     std::vector<std::thread> running;
+    running.reserve(threads);
     for (int i = 0; i < threads; ++i) {
         running.emplace_back([i] {
             const std::string name(static_cast<std::size_t>(20 * (i + 1)), static_cast<char>('a' + i));
@@ -198,9 +199,10 @@ TEST_F(FunctionTraceTest, KeepsTheLinesOfThreadsApart)
     EXPECT_EQ(lines.size(), 4U * threads * rounds);
     for (const RecordedLog::Line& line : lines) {
         const std::string& name = line.function;
-        const std::string expected =
-            line.level == 6000 ? "MESSAGE [File: Example.cpp, Line: 1]: " + name
-                               : "ENTERING: " + name + "() in Example.cpp [Line: 1],Parameters List: " + name;
+        std::string expected = "MESSAGE [File: Example.cpp, Line: 1]: ";
+        if (line.level != 6000)
+            expected = "ENTERING: " + name + "() in Example.cpp [Line: 1],Parameters List: ";
+        expected += name;
         ASSERT_EQ(line.text, expected);
     }
 }

@@ -63,8 +63,8 @@ struct Instrumentation::Implementation
         while (position < inventory.nodes->size() && (*inventory.nodes)[position].kind != *kind)
             ++position;
     }
-    bool onNode() const { return kind && position < inventory.nodes->size(); }
-    const MadeInventory::Node& node() const { return inventory.nodes->at(position); }
+    [[nodiscard]] bool onNode() const { return kind && position < inventory.nodes->size(); }
+    [[nodiscard]] const MadeInventory::Node& node() const { return inventory.nodes->at(position); }
 };
 
 Instrumentation::Instrumentation() : implementation_(std::make_unique<Implementation>())

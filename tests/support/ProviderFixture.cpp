@@ -280,6 +280,7 @@ std::vector<std::string> namesOf(const cim::Instance& instance)
 std::vector<std::string> valuesOf(const std::vector<cim::ObjectPath>& paths, const std::string& key)
 {
     std::vector<std::string> values;
+    values.reserve(paths.size());
     for (const cim::ObjectPath& path : paths)
         values.push_back(valueOf(path, key));
     return values;
@@ -288,6 +289,7 @@ std::vector<std::string> valuesOf(const std::vector<cim::ObjectPath>& paths, con
 std::vector<std::string> valuesOf(const std::vector<cim::Instance>& instances, const std::string& property)
 {
     std::vector<std::string> values;
+    values.reserve(instances.size());
     for (const cim::Instance& instance : instances)
         values.push_back(valueOf(instance, property));
     return values;
