@@ -45,8 +45,7 @@ TEST_F(Threads, GetTheAnswersThatOneAloneGets)
     constexpr std::size_t threads = 8;
     constexpr int rounds = 3;
     // A broker without the recording layer, which gives objects their names one request at a time.
-    cimhost::Broker plain(cimhost::readRegistrationFile(TEST_COMPUTER_SYSTEM_REGISTRATION),
-                          {TEST_PROVIDER_DIRECTORY});
+    cimhost::Broker plain(computerSystemRegistration(), {providerDirectory()});
     const std::vector<Operation> operations = allOperations();
     std::vector<std::string> expected;
     expected.reserve(operations.size());

@@ -116,7 +116,7 @@ namespace {
 
 cimhost::Registration computerSystemOnly()
 {
-    auto registration = cimhost::readRegistrationFile(TEST_COMPUTER_SYSTEM_REGISTRATION);
+    auto registration = computerSystemRegistration();
     // One besides the usual, so that a test sees where a namespace comes from.
     registration.classes.at(0).nameSpaces.emplace_back("root/test");
     return registration;
@@ -184,10 +184,20 @@ cim::Value textValue(const std::string& text)
 
 } // namespace
 
+std::string providerDirectory()
+{
+    return TEST_PROVIDER_DIRECTORY;
+}
+
+cimhost::Registration computerSystemRegistration()
+{
+    return cimhost::readRegistrationFile(TEST_COMPUTER_SYSTEM_REGISTRATION);
+}
+
 ProviderFixture::ProviderFixture() : ProviderFixture(computerSystemOnly()) {}
 
 ProviderFixture::ProviderFixture(cimhost::Registration registration)
-    : host(std::move(registration), {TEST_PROVIDER_DIRECTORY}),
+    : host(std::move(registration), {providerDirectory()}),
       request(std::make_unique<cimhost::Request>(host))
 {
     setComputerSystems({"alpha"});

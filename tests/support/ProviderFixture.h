@@ -65,6 +65,12 @@ std::string line(const std::string& module, const std::string& kind, const std::
 
 } // namespace Logged
 
+/// Where the built provider libraries lie, for a host's broker.
+std::string providerDirectory();
+
+/// The registration of the stand-in that serves TAVRO_ComputerSystem in root/cimv2.
+cimhost::Registration computerSystemRegistration();
+
 /// A test with a broker and one open request.
 class ProviderFixture : public ::testing::Test
 {
