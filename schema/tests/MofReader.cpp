@@ -182,6 +182,14 @@ public:
         return classes;
     }
 
+    std::vector<WrittenInstance> parseInstances()
+    {
+        std::vector<WrittenInstance> instances;
+        while (token_.kind != Token::End)
+            instances.push_back(parseInstance());
+        return instances;
+    }
+
 private:
     void advance() { token_ = scanner_.next(); }
 
@@ -263,6 +271,62 @@ private:
         takeSign("}");
         takeSign(";");
         return result;
+    }
+
+    WrittenInstance parseInstance()
+    {
+        WrittenInstance result;
+        takeWord("instance");
+        takeWord("of");
+        result.className = take(Token::Name, "the name of the class");
+        takeSign("{");
+        while (!isSign("}")) {
+            const int line = token_.line;
+            const std::string name = take(Token::Name, "the name of the property");
+            takeSign("=");
+            if (!result.values.emplace(name, parseValue()).second)
+                scanner_.fail(line, "there is already a value of " + name);
+            takeSign(";");
+        }
+        takeSign("}");
+        takeSign(";");
+        return result;
+    }
+
+    WrittenValue parseValue()
+    {
+        WrittenValue result;
+        if (isWord("null")) {
+            advance();
+            return result;
+        }
+        result.isArray = takeSignIfThere("{");
+        do {
+            const int line = token_.line;
+            const WrittenValue::Kind kind = parseElement(result.elements);
+            if (result.elements.size() > 1 && kind != result.kind)
+                scanner_.fail(line, "the elements of the array are of different kinds");
+            result.kind = kind;
+        } while (result.isArray && takeSignIfThere(","));
+        if (result.isArray)
+            takeSign("}");
+        return result;
+    }
+
+    WrittenValue::Kind parseElement(std::vector<std::string>& elements)
+    {
+        if (token_.kind == Token::Text) {
+            elements.push_back(parseText());
+            return WrittenValue::Text;
+        }
+        if (token_.kind == Token::Number) {
+            elements.push_back(take(Token::Number, "a number"));
+            return WrittenValue::Number;
+        }
+        if (!isWord("true") && !isWord("false"))
+            expected("a value");
+        elements.push_back(lowered(take(Token::Name, "TRUE or FALSE")));
+        return WrittenValue::Flag;
     }
 
     Property parseProperty()
@@ -352,6 +416,16 @@ private:
     Token token_;
 };
 
+std::string readText(const std::string& fileName)
+{
+    const std::ifstream file(fileName, std::ios::binary);
+    if (!file || !std::filesystem::is_regular_file(fileName))
+        throw MofError(fileName + ": cannot be read");
+    std::ostringstream text;
+    text << file.rdbuf();
+    return text.str();
+}
+
 } // namespace
 
 std::vector<Class> readMof(const std::string& text, const std::string& fileName)
@@ -361,12 +435,17 @@ std::vector<Class> readMof(const std::string& text, const std::string& fileName)
 
 std::vector<Class> readMofFile(const std::string& fileName)
 {
-    const std::ifstream file(fileName, std::ios::binary);
-    if (!file || !std::filesystem::is_regular_file(fileName))
-        throw MofError(fileName + ": cannot be read");
-    std::ostringstream text;
-    text << file.rdbuf();
-    return readMof(text.str(), fileName);
+    return readMof(readText(fileName), fileName);
+}
+
+std::vector<WrittenInstance> readMofInstances(const std::string& text, const std::string& fileName)
+{
+    return Parser(text, fileName).parseInstances();
+}
+
+std::vector<WrittenInstance> readMofInstancesFile(const std::string& fileName)
+{
+    return readMofInstances(readText(fileName), fileName);
 }
 
 } // namespace schema

@@ -1,10 +1,11 @@
 /// \file
-/// A reader of class declarations in MOF: qualifiers, properties, arrays, references, pragmas, comments. It
-/// refuses all else that MOF has (qualifier declarations, instances, methods, flavors): the project's schema
-/// has none of it.
+/// A reader of MOF: of class declarations (qualifiers, properties, arrays, references, pragmas, comments) and
+/// of instances with plain values. It refuses all else that MOF has (qualifier declarations, methods,
+/// flavors, aliases): the project's schema has none of it.
 #ifndef SCHEMA_MOFREADER_H
 #define SCHEMA_MOFREADER_H
 
+#include <map>
 #include <stdexcept>
 #include <string>
 #include <vector>
@@ -53,6 +54,28 @@ struct Class
     std::vector<Property> properties;
 };
 
+/// What an instance says of a property.
+struct WrittenValue
+{
+    enum Kind
+    {
+        Null,
+        Text,
+        Number, ///< an integer
+        Flag    ///< TRUE or FALSE
+    };
+    Kind kind = Null; ///< of every element of an array
+    bool isArray = false;
+    /// As in the text, texts without quotes and escapes: one, or an array's elements.
+    std::vector<std::string> elements;
+};
+
+struct WrittenInstance
+{
+    std::string className;
+    std::map<std::string, WrittenValue> values; ///< by the name of the property, as written
+};
+
 /// The classes in the order of the text. Pragmas are skipped. \param fileName  for error messages
 /// \throws MofError  also for what no text may hold: a class, property or qualifier twice, ignoring letter
 /// case
@@ -60,6 +83,11 @@ std::vector<Class> readMof(const std::string& text, const std::string& fileName)
 
 /// \throws MofError  also when the file cannot be read
 std::vector<Class> readMofFile(const std::string& fileName);
+
+/// The same of a text that declares instances and no classes. An array has at least one element, and elements
+/// of one kind. \throws MofError
+std::vector<WrittenInstance> readMofInstances(const std::string& text, const std::string& fileName);
+std::vector<WrittenInstance> readMofInstancesFile(const std::string& fileName);
 
 } // namespace schema
 

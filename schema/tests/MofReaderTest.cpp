@@ -175,8 +175,65 @@ INSTANTIATE_TEST_SUITE_P(
         BadText{"#pragma locale ()", "a.mof:1: expected a text in quotes, found \")\""},
         BadText{"\xff", "a.mof:1: expected class, found \"\xff\""}));
 
+TEST(MofReader, ReadsInstancesInTheirOrderWithTheirValues)
+{
+    const std::vector<schema::WrittenInstance> instances = schema::readMofInstances(
+        "// first\ninstance of B { Name = \"a\" \"b\"; Count = -3; On = TRUE; None = NULL; };\n"
+        "INSTANCE OF A { Names = {\"x\", \"y\"}; Types = {2, 3}; };",
+        "a.mof");
+    ASSERT_THAT(instances, SizeIs(2));
+    EXPECT_EQ(instances[0].className, "B");
+    ASSERT_THAT(instances[0].values, SizeIs(4));
+    EXPECT_EQ(instances[0].values.at("Name").kind, schema::WrittenValue::Text);
+    EXPECT_FALSE(instances[0].values.at("Name").isArray);
+    EXPECT_THAT(instances[0].values.at("Name").elements, ElementsAre("ab"));
+    EXPECT_EQ(instances[0].values.at("Count").kind, schema::WrittenValue::Number);
+    EXPECT_THAT(instances[0].values.at("Count").elements, ElementsAre("-3"));
+    EXPECT_EQ(instances[0].values.at("On").kind, schema::WrittenValue::Flag);
+    EXPECT_THAT(instances[0].values.at("On").elements, ElementsAre("true"));
+    EXPECT_EQ(instances[0].values.at("None").kind, schema::WrittenValue::Null);
+    EXPECT_THAT(instances[0].values.at("None").elements, IsEmpty());
+    EXPECT_EQ(instances[1].className, "A");
+    EXPECT_TRUE(instances[1].values.at("Names").isArray);
+    EXPECT_THAT(instances[1].values.at("Names").elements, ElementsAre("x", "y"));
+    EXPECT_EQ(instances[1].values.at("Types").kind, schema::WrittenValue::Number);
+    EXPECT_THAT(instances[1].values.at("Types").elements, ElementsAre("2", "3"));
+}
+
+class MofInstanceReaderRefuses : public testing::TestWithParam<BadText>
+{};
+
+TEST_P(MofInstanceReaderRefuses, NamingThePlaceAndWhatWasExpected)
+{
+    try {
+        schema::readMofInstances(GetParam().text, "a.mof");
+        FAIL() << "read it";
+    } catch (const MofError& error) {
+        EXPECT_STREQ(error.what(), GetParam().error);
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Texts, MofInstanceReaderRefuses,
+    testing::Values(BadText{"class A {};", "a.mof:1: expected instance, found \"class\""},
+                    BadText{"instance A {};", "a.mof:1: expected of, found \"A\""},
+                    BadText{"instance of {};", "a.mof:1: expected the name of the class, found \"{\""},
+                    BadText{"instance of A as $a {};", "a.mof:1: expected {, found \"as\""},
+                    BadText{"instance of A {}", "a.mof:1: expected ;, found the end of the file"},
+                    BadText{"instance of A { P; };", "a.mof:1: expected =, found \";\""},
+                    BadText{"instance of A { P = ; };", "a.mof:1: expected a value, found \";\""},
+                    BadText{"instance of A { P = word; };", "a.mof:1: expected a value, found \"word\""},
+                    BadText{"instance of A { P = 1\n};", "a.mof:2: expected ;, found \"}\""},
+                    BadText{"instance of A { P = 1;\nP = 2; };", "a.mof:2: there is already a value of P"},
+                    BadText{"instance of A { P = {}; };", "a.mof:1: expected a value, found \"}\""},
+                    BadText{"instance of A { P = {1, }; };", "a.mof:1: expected a value, found \"}\""},
+                    BadText{"instance of A { P = {1 2}; };", "a.mof:1: expected }, found \"2\""},
+                    BadText{"instance of A { P = {1,\n\"a\"}; };",
+                            "a.mof:2: the elements of the array are of different kinds"}));
+
 TEST(MofReader, RefusesAFileThatCannotBeRead)
 {
+    EXPECT_THROW(schema::readMofInstancesFile("/no/such/file.mof"), MofError);
     EXPECT_THROW(schema::readMofFile("/no/such/file.mof"), MofError);
     EXPECT_THROW(schema::readMofFile("/"), MofError);
 }

@@ -7,6 +7,11 @@
 #include "broker/Broker.h"
 #include "testing/Environment.h"
 
+#include <algorithm>
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
@@ -72,6 +77,28 @@ TEST(Schema, RefersOnlyToClassesOfItsFileAndOfDmtf)
             EXPECT_TRUE(isKnown) << declaration.name << '.' << property.name;
         }
     }
+}
+
+/// The brokers' compilers disagree on the encoding of a file, and on which pragmas there are.
+TEST(Schema, IsPlainAsciiWithoutPragmas)
+{
+    std::vector<std::string> files;
+    for (const auto& entry : std::filesystem::directory_iterator(SCHEMA_DIRECTORY)) {
+        const std::string extension = entry.path().extension();
+        if (extension != ".mof" && extension != ".reg")
+            continue;
+        files.push_back(entry.path().filename());
+        std::ifstream file(entry.path(), std::ios::binary);
+        const std::string text{std::istreambuf_iterator<char>(file), {}};
+        const bool plain =
+            std::all_of(text.begin(), text.end(), [](char c) { return c == '\n' || (c >= ' ' && c <= '~'); });
+        EXPECT_TRUE(plain) << entry.path();
+        EXPECT_EQ(text.find("#pragma"), std::string::npos) << entry.path();
+        EXPECT_THAT(text, testing::EndsWith("\n")) << entry.path();
+    }
+    EXPECT_THAT(files, UnorderedElementsAre("TAVRO_Glimmark.mof", "TAVRO_ComputerSystem.mof", "glimmark.reg",
+                                            "computer-system.reg", "glimmark-pegasus.mof",
+                                            "computer-system-pegasus.mof"));
 }
 
 class SchemaClass : public testing::TestWithParam<std::string>
