@@ -59,6 +59,13 @@ std::string shortened(const std::string& text, std::size_t longest = longestName
     return text.substr(0, length) + "...";
 }
 
+/// A text of the file as JSON writes it, shortened: nothing in it ends the message or drives a terminal.
+std::string escaped(const std::string& text)
+{
+    const std::string literal = Json(shortened(text)).dump();
+    return literal.substr(1, literal.size() - 2);
+}
+
 /// Such as "line 3, column 5", both counted from 1, the column in bytes.
 /// \param position  how many bytes the parser had read
 std::string lineAndColumn(std::string_view text, std::size_t position)
@@ -124,7 +131,7 @@ public:
         else if (isAt("path"))
             nodes_.back().path = checkedText(value);
         else if (level_ != Level::Inventory || field_ != "$schema")
-            refuse(inQuotes(shortened(value)));
+            refuse(inQuotes(escaped(value)));
         return true;
     }
 
@@ -224,7 +231,7 @@ private:
     {
         const std::optional<unsigned int> kind = findNodeKind(name);
         if (!kind)
-            refuse(inQuotes(shortened(name)));
+            refuse(inQuotes(escaped(name)));
         return *kind;
     }
 
@@ -250,7 +257,7 @@ private:
         else if (level_ == Level::Node)
             pointer = pointer / "nodes" / (nodes_.size() - 1);
         if (level_ != Level::NodeList && !field_.empty())
-            pointer /= shortened(field_);
+            pointer /= escaped(field_);
         return pointer.empty() ? "the whole file" : pointer.to_string();
     }
 
