@@ -44,6 +44,15 @@ if(GLIMMARK_SANITIZE)
     add_link_options(-fsanitize=${GLIMMARK_SANITIZE})
 endif()
 
+# Every source tells the fuzzer which of its branches an input took.
+if(GLIMMARK_FUZZ)
+    if(NOT CMAKE_CXX_COMPILER_ID STREQUAL "Clang")
+        message(FATAL_ERROR "GLIMMARK_FUZZ needs clang, which brings libFuzzer; the preset fuzz asks for it")
+    endif()
+    add_compile_options(-fsanitize=fuzzer-no-link)
+    add_link_options(-fsanitize=fuzzer-no-link)
+endif()
+
 option(GLIMMARK_COVERAGE "Build everything so that running it counts the lines run" OFF)
 if(GLIMMARK_COVERAGE)
     add_compile_options(--coverage -O0)

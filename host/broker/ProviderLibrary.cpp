@@ -9,7 +9,12 @@ namespace cimhost {
 
 namespace {
 
-#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+// g++ tells of a sanitizer by a macro, clang++ by a feature.
+#if !defined(__has_feature)
+#define __has_feature(feature) 0
+#endif
+#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__) || __has_feature(address_sanitizer) ||     \
+    __has_feature(thread_sanitizer)
 constexpr bool unloads = false;
 #else
 constexpr bool unloads = true;
