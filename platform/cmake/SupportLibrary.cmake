@@ -32,7 +32,7 @@ endfunction()
 # NEEDS_<NAME> holds patterns of the sonames needed beyond the compiler's run-time libraries.
 function(add_support_library_tests name)
     add_executable(${name}-tests ${ARGN})
-    target_link_libraries(${name}-tests PRIVATE ${name} GTest::gmock GTest::gtest_main glimmark::settings)
+    target_link_libraries(${name}-tests PRIVATE ${name} glimmark::test-settings GTest::gtest_main)
     target_include_directories(${name}-tests PRIVATE ${PROJECT_SOURCE_DIR}/platform)
     gtest_discover_tests(${name}-tests TEST_PREFIX ${name}. NO_PRETTY_VALUES)
 

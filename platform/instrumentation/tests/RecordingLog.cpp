@@ -7,12 +7,12 @@
 
 namespace {
 
-std::mutex access;
+std::mutex guarded;
 std::vector<RecordingLog::Line> lines;
 
 void record(RecordingLog::Line line)
 {
-    const std::lock_guard<std::mutex> guard(access);
+    const std::lock_guard<std::mutex> guard(guarded);
     lines.push_back(std::move(line));
 }
 
@@ -20,7 +20,7 @@ void record(RecordingLog::Line line)
 
 std::vector<RecordingLog::Line> RecordingLog::take()
 {
-    const std::lock_guard<std::mutex> guard(access);
+    const std::lock_guard<std::mutex> guard(guarded);
     return std::exchange(lines, {});
 }
 
