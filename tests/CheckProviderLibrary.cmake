@@ -3,14 +3,11 @@
 
 cmake_minimum_required(VERSION 3.20)
 
-function(run output)
-    execute_process(COMMAND ${ARGN} OUTPUT_VARIABLE text COMMAND_ERROR_IS_FATAL ANY)
-    set(${output} "${text}" PARENT_SCOPE)
-endfunction()
+include(${CMAKE_CURRENT_LIST_DIR}/../cmake/RunTool.cmake)
 
 # What it is linked with: the four support libraries and run-time libraries, nothing else. The loader and thread
 # libraries are part of the C library on newer systems; sanitizers bring their own run time.
-run(dynamic ${READELF} -d ${LIBRARY})
+run_tool(dynamic ${READELF} -d ${LIBRARY})
 string(REGEX MATCHALL "\\(NEEDED\\)[^\n]*\\[[^]]*\\]" needed "${dynamic}")
 list(TRANSFORM needed REPLACE ".*\\[(.*)\\]" "\\1")
 set(support libtavro-instrumentation.so.1 libtavro-common.so.1 libtavro-locale.so.1 libmvlog.so.1)
@@ -31,12 +28,12 @@ if(dynamic MATCHES "\\(RPATH\\)")
     message(SEND_ERROR "Has an RPATH, which stands before LD_LIBRARY_PATH")
 endif()
 
-# The six entry points by their plain names, and nothing else without a namespace.
-run(symbols ${NM} --dynamic --defined-only --format=posix ${LIBRARY})
-string(REGEX MATCHALL "[^ \n]+ [TW] " functions "${symbols}")
-list(TRANSFORM functions REPLACE " .*" "")
-set(plain ${functions})
-list(FILTER plain EXCLUDE REGEX "^_")
+# The six entry points by their plain names, and nothing else without a mangled one: no function, no variable.
+run_tool(symbols ${NM} --dynamic --defined-only --format=posix ${LIBRARY})
+string(REGEX MATCHALL "[^ \n]+ [A-Za-z] " exported "${symbols}")
+list(TRANSFORM exported REPLACE " .*" "")
+set(plain ${exported})
+list(FILTER plain EXCLUDE REGEX "^(_Z|__gcov_|mangle_path$)") # the latter two of a coverage build
 list(SORT plain)
 set(expected
     GlimmarkCapabilitiesProvider_Create_InstanceMI
@@ -61,7 +58,7 @@ foreach(name IN ITEMS
         _ZN5Tavro16GlimmarkProvider9setVectorERSt6vectorINS0_8GlimmarkESaIS2_EERNS_15InstrumentationE
         _ZN5Tavro9traceparaEPKcS1_jS1_NS_11MessageTypeE
         _ZN5Tavro5traceEPKcS1_jNS_11MessageTypeE)
-    if(NOT name IN_LIST functions)
+    if(NOT name IN_LIST exported)
         message(SEND_ERROR "Not visible: ${name}")
     endif()
 endforeach()

@@ -2,12 +2,9 @@
 #   cmake -DLIBRARY=FILE -DSONAME=NAME -DNEEDED="REGEX;..." -DEXPORTS=FILE -DREADELF=... -DNM=... -P THIS
 # NEEDED: one pattern for each soname needed beyond the compiler's and the sanitizers' run time.
 
-function(run output)
-    execute_process(COMMAND ${ARGN} OUTPUT_VARIABLE text COMMAND_ERROR_IS_FATAL ANY)
-    set(${output} "${text}" PARENT_SCOPE)
-endfunction()
+include(${CMAKE_CURRENT_LIST_DIR}/../../cmake/RunTool.cmake)
 
-run(dynamic ${READELF} -d ${LIBRARY})
+run_tool(dynamic ${READELF} -d ${LIBRARY})
 
 string(REGEX MATCH "soname: \\[([^]]*)\\]" found "${dynamic}")
 if(NOT CMAKE_MATCH_1 STREQUAL SONAME)
@@ -31,7 +28,7 @@ endif()
 
 file(STRINGS ${EXPORTS} expected REGEX "^ +_Z[^;]*;$")
 list(TRANSFORM expected REPLACE "[ ;]" "")
-run(symbols ${NM} --dynamic --defined-only --format=posix ${LIBRARY})
+run_tool(symbols ${NM} --dynamic --defined-only --format=posix ${LIBRARY})
 string(REGEX MATCHALL "[^ \n]+ [A-Za-z][^\n]*\n" symbols "${symbols}")
 list(TRANSFORM symbols REPLACE " .*" "")
 list(SORT expected)

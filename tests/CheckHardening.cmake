@@ -1,0 +1,59 @@
+# Holds a built shared object or executable to the hardening of cmake/BuildSettings.cmake, as the file shows it. Run as
+#   cmake -DFILE=FILE -DPROTECTIONS="NAME;..." -DFORTIFIED=BOOL -DREADELF=... -DNM=... -DLDD=... -P THIS
+# PROTECTIONS: the compiler's, without the -f.  FORTIFIED: whether the C library's checking functions are in use.
+
+cmake_minimum_required(VERSION 3.20)
+include(${CMAKE_CURRENT_LIST_DIR}/../cmake/RunTool.cmake)
+
+# Loaded anywhere in memory.
+run_tool(header ${READELF} --file-header --wide ${FILE})
+if(NOT header MATCHES "Type: +DYN")
+    message(SEND_ERROR "Not position-independent:\n${header}")
+endif()
+
+# The tables of addresses are read-only once all symbols are bound, which is before anything runs.
+run_tool(segments ${READELF} --program-headers --wide ${FILE})
+run_tool(dynamic ${READELF} --dynamic --wide ${FILE})
+if(NOT segments MATCHES "GNU_RELRO")
+    message(SEND_ERROR "No segment becomes read-only after binding:\n${segments}")
+endif()
+if(NOT dynamic MATCHES "\\(FLAGS\\)[^\n]* BIND_NOW" OR NOT dynamic MATCHES "\\(FLAGS_1\\)[^\n]* NOW")
+    message(SEND_ERROR "Symbols are bound lazily:\n${dynamic}")
+endif()
+
+# Nothing is written to code, and nothing written is run.
+if(NOT segments MATCHES "GNU_STACK( +0x[0-9a-f]+)+ +RW +0x")
+    message(SEND_ERROR "The stack is executable, or it is not said that it is not:\n${segments}")
+endif()
+if(dynamic MATCHES "TEXTREL")
+    message(SEND_ERROR "The loader would write into code:\n${dynamic}")
+endif()
+
+# No symbol is missing from what it is linked with.
+run_tool(relocations ${LDD} -r ${FILE})
+string(REGEX MATCHALL "undefined symbol: [^\n]*" undefined "${relocations}")
+if(undefined)
+    message(SEND_ERROR "Missing in its libraries: ${undefined}")
+endif()
+
+# Stacks are watched. The debug information says what each source was compiled with, for one compiler.
+run_tool(symbols ${NM} --dynamic --undefined-only --format=posix ${FILE})
+if("stack-protector-strong" IN_LIST PROTECTIONS AND NOT symbols MATCHES "__stack_chk_fail")
+    message(SEND_ERROR "No function watches its stack")
+endif()
+run_tool(information ${READELF} --debug-dump=info --dwarf-depth=1 ${FILE})
+string(REGEX MATCHALL "DW_AT_producer[^\n]*GNU C[^\n]*" compilations "${information}")
+foreach(compilation IN LISTS compilations)
+    foreach(protection IN LISTS PROTECTIONS)
+        if(NOT compilation MATCHES " -f${protection}")
+            message(SEND_ERROR "Compiled without -f${protection}: ${compilation}")
+        endif()
+    endforeach()
+endforeach()
+
+# The functions that print are always the checking ones; copies are where a size is known. Not vsnprintf: the C++
+# library passes it around by its address.
+string(REGEX MATCHALL "(^|\n)(sn?|f|)printf[@ ]" unchecked "${symbols}")
+if(FORTIFIED AND unchecked)
+    message(SEND_ERROR "Not the checking functions:${unchecked}")
+endif()
