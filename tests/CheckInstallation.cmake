@@ -1,5 +1,6 @@
 # Installs the build into an empty prefix and asks the provider from there, with nothing set in the environment. Run as
-#   cmake -DBUILD_DIR=DIR -DPREFIX=DIR -DINVENTORY=FILE -DPROVIDERDIR=lib/... -DREADELF=... -P THIS
+#   cmake -DBUILD_DIR=DIR -DPREFIX=DIR -DINVENTORY=FILE -DPROVIDERDIR=lib/... -DLIBDIR=lib -DREADELF=... -DCOMPILER=...
+#         -DSANITIZED=BOOL -DREPLACEMENTS=DIR -DWORK_DIR=DIR -P THIS
 
 cmake_minimum_required(VERSION 3.20)
 
@@ -17,7 +18,7 @@ if(NOT count EQUAL 13)
 endif()
 
 # Nothing of the build tree is left in the installed files' paths.
-file(GLOB installed ${PREFIX}/bin/* ${PREFIX}/${PROVIDERDIR}/*.so ${PREFIX}/${PROVIDERDIR}/../*.so.1)
+file(GLOB installed ${PREFIX}/bin/* ${PREFIX}/${PROVIDERDIR}/*.so ${PREFIX}/${LIBDIR}/*.so.1)
 list(LENGTH installed count)
 if(count LESS 6)
     message(SEND_ERROR "Too few files installed: ${installed}")
@@ -29,3 +30,55 @@ foreach(file IN LISTS installed)
         message(SEND_ERROR "${file} looks for libraries in the build tree:\n${dynamic}")
     endif()
 endforeach()
+file(GLOB_RECURSE texts ${PREFIX}/*.cmake ${PREFIX}/*.pc ${PREFIX}/sbin/*)
+list(LENGTH texts count)
+if(count LESS 5)
+    message(SEND_ERROR "Too few texts installed: ${texts}")
+endif()
+foreach(file IN LISTS texts)
+    file(READ ${file} text)
+    foreach(path IN ITEMS ${BUILD_DIR} ${CMAKE_CURRENT_LIST_DIR})
+        string(FIND "${text}" "${path}" position)
+        if(NOT position EQUAL -1)
+            message(SEND_ERROR "${file} names ${path}")
+        endif()
+    endforeach()
+endforeach()
+
+# The tree can be moved, and a maker's engineer builds with it where it then is.
+file(REMOVE_RECURSE ${WORK_DIR})
+file(MAKE_DIRECTORY ${WORK_DIR})
+set(moved ${WORK_DIR}/moved)
+file(RENAME ${PREFIX} ${moved})
+set(maker ${WORK_DIR}/maker)
+execute_process(
+    COMMAND ${CMAKE_COMMAND} -S ${CMAKE_CURRENT_LIST_DIR}/development -B ${maker} -DCMAKE_PREFIX_PATH=${moved}
+            -DCMAKE_CXX_COMPILER=${COMPILER} -DREPLACEMENT=${REPLACEMENTS}/Instrumentation.cpp -DSANITIZED=${SANITIZED}
+    OUTPUT_QUIET COMMAND_ERROR_IS_FATAL ANY)
+execute_process(COMMAND ${CMAKE_COMMAND} --build ${maker} OUTPUT_QUIET COMMAND_ERROR_IS_FATAL ANY)
+
+function(expect text expected)
+    if(NOT text MATCHES "${expected}")
+        message(SEND_ERROR "Expected ${expected}, found:\n${text}")
+    endif()
+endfunction()
+
+execute_process(
+    COMMAND ${CMAKE_COMMAND} -E env LD_LIBRARY_PATH=${maker} ${moved}/bin/cimhost ein TAVRO_Glimmark
+    OUTPUT_VARIABLE names COMMAND_ERROR_IS_FATAL ANY)
+expect("${names}" "Replaced indicator:replaced path")
+if(NOT SANITIZED)
+    execute_process(
+        COMMAND ${CMAKE_COMMAND} -E env LD_LIBRARY_PATH=${moved}/${LIBDIR} TAVRO_INVENTORY=${INVENTORY} ${maker}/program
+        OUTPUT_VARIABLE answer COMMAND_ERROR_IS_FATAL ANY)
+    expect("${answer}" "^four libraries in all: a node\n$")
+endif()
+
+# The same headers by pkg-config.
+file(GLOB_RECURSE package ${moved}/tavro-support.pc)
+get_filename_component(package_directory ${package} DIRECTORY)
+execute_process(
+    COMMAND ${CMAKE_COMMAND} -E env PKG_CONFIG_PATH=${package_directory} pkg-config --cflags tavro-support
+    OUTPUT_VARIABLE flags OUTPUT_STRIP_TRAILING_WHITESPACE COMMAND_ERROR_IS_FATAL ANY)
+separate_arguments(flags UNIX_COMMAND "${flags}")
+execute_process(COMMAND ${COMPILER} -std=c++17 ${flags} -fsyntax-only ${REPLACEMENTS}/Common.cpp COMMAND_ERROR_IS_FATAL ANY)

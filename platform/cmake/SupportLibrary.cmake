@@ -1,7 +1,8 @@
 # add_support_library(NAME ALIAS SOURCE...)
 #
 # The shared object lib<NAME>.so.1 from the sources in the calling folder. What include/ holds is its
-# interface and is installed as it lies there; exports.map lists the symbols that others may bind to.
+# interface and is installed as it lies there; exports.map lists the symbols that others may bind to. The library is
+# the installation component NAME; what a compiler needs of it is in the component support-development.
 function(add_support_library name alias)
     add_library(${name} SHARED ${ARGN})
     add_library(${alias} ALIAS ${name})
@@ -21,8 +22,15 @@ function(add_support_library name alias)
                    BUILD_WITH_INSTALL_RPATH ON
                    INSTALL_RPATH "\$ORIGIN")
 
-    install(TARGETS ${name} LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR})
-    install(DIRECTORY include/ DESTINATION ${CMAKE_INSTALL_INCLUDEDIR})
+    string(REGEX REPLACE "^tavro-" "" export_name ${name})
+    set_target_properties(${name} PROPERTIES EXPORT_NAME ${export_name})
+    install(
+        TARGETS ${name}
+        EXPORT TavroSupportTargets
+        LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR}
+                COMPONENT ${name}
+                NAMELINK_COMPONENT support-development)
+    install(DIRECTORY include/ DESTINATION ${CMAKE_INSTALL_INCLUDEDIR} COMPONENT support-development)
 endfunction()
 
 # add_support_library_tests(NAME SOURCE...)

@@ -91,6 +91,11 @@ END
     done
 }
 
+@test "folders that a failed step made are removed" {
+    FAIL="1 sfcbrepos" register 4 --namespace root/other register
+    is_as_remembered
+}
+
 @test "what cannot be taken back is said" {
     FAIL="1+ sfcbrepos" register 5 register
     says "not all could be taken back"
