@@ -17,6 +17,18 @@ if(NOT count EQUAL 13)
     message(SEND_ERROR "The installed provider names ${count} indicators, expected 13:\n${names}")
 endif()
 
+# The texts come from the same prefix.
+execute_process(
+    COMMAND ${CMAKE_COMMAND} -E env --unset=LD_LIBRARY_PATH --unset=CIMHOST_PROVIDER_DIR --unset=CIMHOST_REGISTRATION
+            --unset=TAVRO_CATALOGUES --unset=LC_ALL --unset=LC_MESSAGES LANG=de_AT.UTF-8 ${PREFIX}/bin/cimhost
+            --inventory ${INVENTORY} ei TAVRO_Glimmark Caption
+    OUTPUT_VARIABLE captions COMMAND_ERROR_IS_FATAL ANY)
+string(REGEX MATCHALL "Caption = \"Diagnoseanzeige\"" found "${captions}")
+list(LENGTH found count)
+if(NOT count EQUAL 13)
+    message(SEND_ERROR "The installed provider has ${count} German captions, expected 13:\n${captions}")
+endif()
+
 # Nothing of the build tree is left in the installed files' paths.
 file(GLOB installed ${PREFIX}/bin/* ${PREFIX}/${PROVIDERDIR}/*.so ${PREFIX}/${LIBDIR}/*.so.1)
 list(LENGTH installed count)

@@ -14,6 +14,7 @@
 #include <string>
 
 #include <Tavro/Common.h>
+#include <Tavro/Locale.h>
 
 namespace Tavro::ComputerSystem {
 namespace {
@@ -37,6 +38,14 @@ CMPIObjectPath* pathOf(const std::string& name, const std::string& nameSpace)
     return path;
 }
 
+std::string caption()
+{
+    constexpr int library = 1;
+    const ResourceString text(Locale::getResourceLibrary(library, Locale::getLanguageId()),
+                              L"MSGID_COMPUTERSYSTEM_CAPTION");
+    return make_string(text);
+}
+
 /// \param path  from pathOf  \param properties  those wanted besides the keys, ended by a null pointer; null
 /// for all. The broker keeps the others out by the filter.
 CMPIInstance* instanceAt(const CMPIObjectPath* path, const std::string& name, const char** properties)
@@ -47,7 +56,7 @@ CMPIInstance* instanceAt(const CMPIObjectPath* path, const std::string& name, co
 
     Cmpi::setProperty(instance, "CreationClassName", className);
     Cmpi::setProperty(instance, "Name", name);
-    Cmpi::setProperty(instance, "Caption", "Computer System");
+    Cmpi::setProperty(instance, "Caption", caption());
     Cmpi::setProperty(instance, "Description", "Computer system, served by a stand-in provider");
     Cmpi::setProperty(instance, "ElementName", name);
     Cmpi::setProperty(instance, "OperationalStatus", Cmpi::newArray(theBroker, {operationalStatusOk}));

@@ -1,7 +1,7 @@
 #include <Tavro/Instrumentation.h>
 
-#include "RecordingLog.h"
 #include "testing/Environment.h"
+#include "testing/RecordingLog.h"
 #include "testing/TemporaryDirectory.h"
 
 #include <string>

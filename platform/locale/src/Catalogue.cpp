@@ -1,23 +1,117 @@
 #include "Catalogue.h"
 
+#include "CatalogueDirectory.h"
+#include "EnglishCatalogue.h"
+#include "MessageCatalogue.h"
+
+#include "Tavro/Locale.h"
+
+#include <ReadFile.h>
+
+#include <MVLog/MVLogger.h>
+
 #include <algorithm>
-#include <array>
+#include <cstddef>
+#include <cstdlib>
+#include <map>
+#include <memory>
+#include <mutex>
 
 namespace Tavro {
 namespace {
 
 constexpr wchar_t separator = L'/';
+constexpr char endOfContext = '\4';
+constexpr std::size_t mostBytes = 1024UL * 1024; ///< of a catalogue; thousands of messages
+constexpr std::size_t longestLanguage = 64;
+constexpr int errorLevel = 6000;
 
-struct Text
+/// The catalogues read so far.
+class Catalogues
 {
-    std::wstring_view library;
-    std::wstring_view messageId;
-    std::wstring_view english;
+public:
+    /// Of the folder that TAVRO_CATALOGUES names now, or of the one beside this library. Reads the
+    /// catalogue the first time it is asked for. Empty: there is none.
+    const Messages& of(const std::string& language)
+    {
+        const char* const named = std::getenv("TAVRO_CATALOGUES");
+        const std::string directory = named != nullptr && *named != '\0' ? named : installed_;
+        const std::string file = directory + '/' + language + "/LC_MESSAGES/tavro.mo";
+        const auto found = byFile_.find(file);
+        return found != byFile_.end() ? found->second : byFile_.emplace(file, read(file)).first->second;
+    }
+
+    [[nodiscard]] const Messages& english() const { return english_; }
+
+private:
+    static Messages read(const std::string& file)
+    {
+        try {
+            return readMessages(readFile(file, mostBytes));
+        } catch (const FileMissing&) {
+            return {};
+        } catch (const ReadFailure& failure) {
+            return broken(file, failure.what());
+        } catch (const CatalogueError& error) {
+            return broken(file, error.what());
+        }
+    }
+
+    static Messages broken(const std::string& file, const std::string& reason)
+    {
+        MVLog::MVLogger::logLevelMessage("read", "Catalogue.cpp", __LINE__, "Mavrel.Locale", errorLevel,
+                                         nullptr, 0, 0, file + ": " + reason);
+        return {};
+    }
+
+    std::string installed_ = installedCatalogues();
+    Messages english_ = readMessages(englishCatalogue);
+    std::map<std::string, Messages> byFile_;
 };
 
-constexpr std::array texts = {
-    Text{L"2", L"MSGID_ALARMDEVICE_CAPTION", L"Diagnostic Indicator"},
-};
+// Set up at compile time and without destructors: any static object may ask for a text.
+std::mutex access; ///< guards `catalogues`
+Catalogues* catalogues = nullptr;
+
+/// Runs when the library is unloaded or, at the end of the process, after the static objects of all
+/// that use it are gone.
+[[gnu::destructor]] void close()
+{
+    const std::lock_guard<std::mutex> guard(access);
+    delete catalogues;
+    catalogues = nullptr;
+}
+
+bool isPartOfLanguage(wchar_t character)
+{
+    return (character >= L'a' && character <= L'z') || (character >= L'A' && character <= L'Z') ||
+           (character >= L'0' && character <= L'9') || character == L'-' || character == L'_';
+}
+
+/// The name as catalogues have it; empty for what names no language. Without this check it could name
+/// any file.
+std::string fileLanguage(std::wstring_view name)
+{
+    if (name.size() > longestLanguage || !std::all_of(name.begin(), name.end(), isPartOfLanguage))
+        return {};
+    std::string language;
+    for (const wchar_t character : name)
+        language += character == L'-' ? '_' : static_cast<char>(character);
+    return language;
+}
+
+/// zh_Hans of zh_Hans_CN; empty of zh.
+std::string withoutLastPart(const std::string& language)
+{
+    const std::string::size_type end = language.rfind('_');
+    return end == std::string::npos ? std::string() : language.substr(0, end);
+}
+
+std::optional<std::wstring> findIn(const Messages& messages, const std::string& key)
+{
+    const auto found = messages.find(key);
+    return found == messages.end() ? std::nullopt : std::optional(found->second);
+}
 
 } // namespace
 
@@ -27,20 +121,21 @@ std::wstring catalogueName(int library, const std::string& language)
     return std::to_wstring(library) + separator + std::wstring(language.begin(), language.end());
 }
 
-// Every language has the English texts so far: what follows the separator makes no difference yet.
-std::optional<std::wstring_view> findText(std::wstring_view catalogue, std::wstring_view messageId)
+std::optional<std::wstring> findText(const std::wstring& catalogue, const std::wstring& messageId)
 {
-    const std::wstring_view::size_type end = catalogue.find(separator);
-    if (end == std::wstring_view::npos)
+    const std::wstring::size_type end = catalogue.find(separator);
+    if (end == std::wstring::npos)
         return std::nullopt;
-    const std::wstring_view library = catalogue.substr(0, end);
+    const std::string key = make_string(catalogue.substr(0, end)) + endOfContext + make_string(messageId);
 
-    const auto* const found = std::find_if(texts.begin(), texts.end(), [&](const Text& text) {
-        return text.library == library && text.messageId == messageId;
-    });
-    if (found == texts.end())
-        return std::nullopt;
-    return found->english;
+    const std::lock_guard<std::mutex> guard(access);
+    if (catalogues == nullptr)
+        catalogues = std::make_unique<Catalogues>().release();
+    for (std::string language = fileLanguage(catalogue.substr(end + 1)); !language.empty();
+         language = withoutLastPart(language))
+        if (std::optional<std::wstring> text = findIn(catalogues->of(language), key))
+            return text;
+    return findIn(catalogues->english(), key);
 }
 
 } // namespace Tavro

@@ -13,9 +13,13 @@ namespace Tavro {
 /// "2/en_US". Anything may stand in `language`, it is only looked up.
 std::wstring catalogueName(int library, const std::string& language);
 
-/// The text of a message from the catalogue with that name; in English where the language has none;
-/// nothing where English has none either or where the name is not one of catalogueName's.
-std::optional<std::wstring_view> findText(std::wstring_view catalogue, std::wstring_view messageId);
+/// The text of a message from the catalogue with that name: in the language, else in the language without
+/// its last part (zh_Hans_CN, zh_Hans, zh), else in English; nothing where English has none either or
+/// where the name is not one of catalogueName's.
+///
+/// Each catalogue is read once, when it is first asked for. One that cannot be read or is broken
+/// gives one error line in the log and counts as empty.
+std::optional<std::wstring> findText(const std::wstring& catalogue, const std::wstring& messageId);
 
 } // namespace Tavro
 

@@ -1,8 +1,8 @@
 /// \file
 /// The logging library's functions, defined in the test program and so taking the place of the library's:
 /// lines are kept in place of being written.
-#ifndef TAVRO_INSTRUMENTATION_TESTS_RECORDINGLOG_H
-#define TAVRO_INSTRUMENTATION_TESTS_RECORDINGLOG_H
+#ifndef PLATFORM_TESTING_RECORDINGLOG_H
+#define PLATFORM_TESTING_RECORDINGLOG_H
 
 #include <string>
 #include <vector>

@@ -1,4 +1,4 @@
-#include "RecordingLog.h"
+#include "testing/RecordingLog.h"
 
 #include <MVLog/MVLogger.h>
 

@@ -16,6 +16,13 @@ public:
     using std::runtime_error::runtime_error;
 };
 
+/// There is no file of that name.
+class FileMissing : public ReadFailure
+{
+public:
+    using ReadFailure::ReadFailure;
+};
+
 /// The content of a regular file. A pipe or device is refused, not read: it might never end.
 /// \param mostBytes  a longer file is refused
 /// \throw ReadFailure

@@ -31,7 +31,11 @@ private:
 
 [[noreturn]] void failWithErrno()
 {
-    throw ReadFailure("expected a readable file: " + std::generic_category().message(errno));
+    const int reason = errno;
+    const std::string text = "expected a readable file: " + std::generic_category().message(reason);
+    if (reason == ENOENT || reason == ENOTDIR)
+        throw FileMissing(text);
+    throw ReadFailure(text);
 }
 
 std::string fileType(mode_t mode)

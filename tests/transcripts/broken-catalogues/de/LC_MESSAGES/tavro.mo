@@ -1,0 +1,1 @@
+This is no message catalogue.
