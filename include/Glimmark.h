@@ -45,9 +45,9 @@ public:
     [[nodiscard]] std::uint16_t getAlarmState() const;
 
     /// \return false for an empty identifier, which is stored all the same
-    bool setDeviceID(const std::string& deviceID);
+    bool setDeviceID(std::string deviceID);
     /// \return false for an empty name, which is stored all the same
-    bool setElementName(const std::string& elementName);
+    bool setElementName(std::string elementName);
     bool setRequestedState(unsigned int nodeStatus);
     bool setHealthState(unsigned int nodeStatus);
     bool setOperationalStatus(unsigned int nodeStatus);

@@ -4,13 +4,16 @@
 #include "RecordedLog.h"
 #include "support/ProviderFixture.h"
 
+#include <cstdio>
 #include <cstring>
+#include <iterator>
 #include <string>
 #include <thread>
 #include <vector>
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
+#include <rapidcheck/gtest.h>
 
 using Tavro::FunctionTrace;
 using Tavro::MessageType;
@@ -115,6 +118,42 @@ TEST(TracePara, FollowsNoNullPointer)
     EXPECT_STREQ(tracepara(nullptr, nullptr, 5, nullptr, MessageType::Exiting),
                  "EXITING: (null)() in (null) [Line: 5],Parameters List: (null)");
     EXPECT_STREQ(trace(nullptr, nullptr, 5, MessageType::Message), "MESSAGE [File: (null), Line: 5]: (null)");
+}
+
+// What administrators' log filters know are the texts that printf makes of these formats.
+RC_GTEST_PROP(TraceLines, areTextsAsPrintfFormatsThem,
+              (const std::string& text, const std::string& file, unsigned int line))
+{
+    static constexpr const char* wordings[][2] = {
+        {"ENTERING", "in"}, {"EXITING", "in"}, {"METHOD", "was invoked in"}};
+    const auto number = static_cast<int>(line);
+    // Short and long ones, so that some are cut in the middle.
+    const std::string parameters(*rc::gen::inRange<std::size_t>(0, 600), 'p');
+    char expected[512];
+    for (unsigned int type = 0; type < std::size(wordings); ++type) {
+        std::snprintf(expected, sizeof expected, "%s: %s() %s %s [Line: %d],Parameters List: %s",
+                      wordings[type][0], text.c_str(), wordings[type][1], file.c_str(), number,
+                      parameters.c_str());
+        RC_ASSERT(std::string(tracepara(text.c_str(), file.c_str(), line, parameters.c_str(),
+                                        static_cast<MessageType>(type))) == expected);
+    }
+    std::snprintf(expected, sizeof expected, "MESSAGE [File: %s, Line: %d]: %s,Parameters List: %s",
+                  file.c_str(), number, text.c_str(), parameters.c_str());
+    RC_ASSERT(std::string(tracepara(text.c_str(), file.c_str(), line, parameters.c_str(),
+                                    MessageType::Message)) == expected);
+    std::snprintf(expected, sizeof expected, "MESSAGE [File: %s, Line: %d]: %s", file.c_str(), number,
+                  parameters.c_str());
+    RC_ASSERT(std::string(trace(parameters.c_str(), file.c_str(), line, MessageType::Message)) == expected);
+}
+
+TEST(TracePara, PrintsEveryLineNumberInFull)
+{
+    EXPECT_STREQ(tracepara("T", "F", 0, "P", MessageType::Entering),
+                 "ENTERING: T() in F [Line: 0],Parameters List: P");
+    EXPECT_STREQ(tracepara("T", "F", 2147483647, "P", MessageType::Entering),
+                 "ENTERING: T() in F [Line: 2147483647],Parameters List: P");
+    EXPECT_STREQ(tracepara("T", "F", 2147483648U, "P", MessageType::Entering),
+                 "ENTERING: T() in F [Line: -2147483648],Parameters List: P");
 }
 
 TEST(ParameterList, StreamsTextsFlagsAndAddresses)

@@ -167,8 +167,9 @@ void GlimmarkFactory::_createGlimmarkMap()
 {
     const std::uint16_t count = countOf(glimmarks);
     for (std::uint16_t i = 0; i < count; ++i) {
-        const Glimmark& glimmark = glimmarks[i];
-        glimmarkMap[glimmark.getDeviceID()] = glimmark; // the last one of an identifier wins
+        Glimmark& glimmark = glimmarks[i];
+        // The last one of an identifier wins. Nobody reads the list any more: its records are moved.
+        glimmarkMap[glimmark.getDeviceID()] = std::move(glimmark);
     }
 }
 

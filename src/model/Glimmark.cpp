@@ -11,6 +11,7 @@
 
 #include <exception>
 #include <iostream>
+#include <utility>
 
 namespace Tavro {
 
@@ -67,9 +68,9 @@ Glimmark readNode(const Instrumentation& node)
 {
     Glimmark record;
     const std::string path = node.convertPathToString(node.getPathToNode());
-    const std::string description = node.getNodeDescription();
+    std::string description = node.getNodeDescription();
     require(record.setDeviceID(description + ":" + path), "Failed while setting Device ID");
-    require(record.setElementName(description), "Failed while setting Element Name");
+    require(record.setElementName(std::move(description)), "Failed while setting Element Name");
 
     // Status 0 is "not known": the record's defaults say that better than a translation would.
     if (const unsigned int status = node.getNodeStatus(); status != 0) {
@@ -129,15 +130,15 @@ std::uint16_t Glimmark::getAlarmState() const
     return AlarmState;
 }
 
-bool Glimmark::setDeviceID(const std::string& deviceID)
+bool Glimmark::setDeviceID(std::string deviceID)
 {
-    DeviceID = deviceID;
+    DeviceID = std::move(deviceID);
     return !DeviceID.empty();
 }
 
-bool Glimmark::setElementName(const std::string& elementName)
+bool Glimmark::setElementName(std::string elementName)
 {
-    ElementName = elementName;
+    ElementName = std::move(elementName);
     return !ElementName.empty();
 }
 

@@ -2,10 +2,15 @@
 
 #include <MVLog/MVLogger.h>
 
+#include <algorithm>
+#include <charconv>
 #include <cstddef>
-#include <cstdio>
 #include <cstring>
+#include <iterator>
+#include <limits>
 #include <mutex>
+#include <string_view>
+#include <utility>
 
 namespace Tavro {
 
@@ -23,10 +28,36 @@ char messageLineBuffer[bufferSize];
 // process when the memory has run out.
 std::mutex bufferMutex;
 
-const char* printable(const char* text)
+/// A text in one of the buffers, put together piece by piece; what is longer than the buffer is cut.
+class Line
 {
-    return text != nullptr ? text : "(null)";
-}
+public:
+    /// Clears the buffer.
+    explicit Line(char (&emptied)[bufferSize]) : next(emptied), last(emptied + bufferSize - 1)
+    {
+        std::memset(emptied, 0, bufferSize);
+    }
+
+    Line& operator<<(const char* text)
+    {
+        const std::string_view characters = text != nullptr ? text : "(null)";
+        next = std::copy_n(characters.data(), std::min(characters.size(), room()), next);
+        return *this;
+    }
+
+    Line& operator<<(int number)
+    {
+        char digits[std::numeric_limits<int>::digits10 + 3]; // a sign, all digits, the end
+        *std::to_chars(std::begin(digits), std::end(digits) - 1, number).ptr = '\0';
+        return *this << std::as_const(digits);
+    }
+
+private:
+    [[nodiscard]] std::size_t room() const { return static_cast<std::size_t>(last - next); }
+
+    char* next;
+    char* last; ///< stays a null character
+};
 
 /// The line that `format` leaves in one of the buffers, read back from a fresh message buffer.
 template <class Format>
@@ -54,39 +85,31 @@ void emit(const TraceModule& module, const char* function, unsigned int line, in
 const char* tracepara(const char* text, const char* file, unsigned int line, const char* parameters,
                       MessageType type)
 {
-    text = printable(text);
-    file = printable(file);
-    parameters = printable(parameters);
     const auto number = static_cast<int>(line);
-    char* const buffer = parameterLineBuffer;
-    std::memset(buffer, 0, bufferSize);
+    Line buffer(parameterLineBuffer);
     switch (type) {
     case MessageType::Exiting:
-        std::snprintf(buffer, bufferSize, "EXITING: %s() in %s [Line: %d],Parameters List: %s", text, file,
-                      number, parameters);
+        buffer << "EXITING: " << text << "() in " << file << " [Line: " << number << "]";
         break;
     case MessageType::Method:
-        std::snprintf(buffer, bufferSize, "METHOD: %s() was invoked in %s [Line: %d],Parameters List: %s",
-                      text, file, number, parameters);
+        buffer << "METHOD: " << text << "() was invoked in " << file << " [Line: " << number << "]";
         break;
     case MessageType::Message:
-        std::snprintf(buffer, bufferSize, "MESSAGE [File: %s, Line: %d]: %s,Parameters List: %s", file,
-                      number, text, parameters);
+        buffer << "MESSAGE [File: " << file << ", Line: " << number << "]: " << text;
         break;
     case MessageType::Entering:
     default:
-        std::snprintf(buffer, bufferSize, "ENTERING: %s() in %s [Line: %d],Parameters List: %s", text, file,
-                      number, parameters);
+        buffer << "ENTERING: " << text << "() in " << file << " [Line: " << number << "]";
         break;
     }
-    return buffer;
+    buffer << ",Parameters List: " << parameters;
+    return parameterLineBuffer;
 }
 
 const char* trace(const char* text, const char* file, unsigned int line, MessageType /*type*/)
 {
-    std::memset(messageLineBuffer, 0, bufferSize);
-    std::snprintf(messageLineBuffer, bufferSize, "MESSAGE [File: %s, Line: %d]: %s", printable(file),
-                  static_cast<int>(line), printable(text));
+    Line(messageLineBuffer) << "MESSAGE [File: " << file << ", Line: " << static_cast<int>(line)
+                            << "]: " << text;
     return messageLineBuffer;
 }
 
