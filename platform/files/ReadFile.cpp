@@ -1,5 +1,7 @@
 #include "ReadFile.h"
 
+#include "Descriptor.h"
+
 #include <array>
 #include <cerrno>
 #include <system_error>
@@ -10,24 +12,6 @@
 
 namespace Tavro {
 namespace {
-
-class Descriptor
-{
-public:
-    explicit Descriptor(int number) : number_(number) {}
-    ~Descriptor()
-    {
-        if (number_ >= 0)
-            close(number_);
-    }
-    Descriptor(const Descriptor&) = delete;
-    Descriptor& operator=(const Descriptor&) = delete;
-
-    [[nodiscard]] int number() const { return number_; }
-
-private:
-    int number_;
-};
 
 [[noreturn]] void failWithErrno()
 {
@@ -77,7 +61,7 @@ std::string readFile(const std::string& name, std::size_t mostBytes)
 {
     // Without O_NONBLOCK opening a pipe would wait for somebody to write to it.
     const Descriptor file(open(name.c_str(), O_RDONLY | O_CLOEXEC | O_NOCTTY | O_NONBLOCK));
-    if (file.number() < 0)
+    if (!file.isOpen())
         failWithErrno();
     checkType(file.number());
 

@@ -1,24 +1,21 @@
 #include "FileNodeSource.h"
 
+#include "ErrorLine.h"
 #include "InventoryReader.h"
 #include "ReadFile.h"
-
-#include <MVLog/MVLogger.h>
+#include "SysfsNodeSource.h"
 
 #include <cstddef>
-#include <cstdlib>
+#include <iterator>
 
 namespace Tavro {
 namespace {
 
-constexpr const char* variable = "TAVRO_INVENTORY";
 constexpr std::size_t mostBytes = 64UL * 1024 * 1024; ///< hundreds of thousands of nodes
-constexpr int errorLevel = 6000;
 
 std::vector<Node> emptyInventory(const std::string& reason)
 {
-    MVLog::MVLogger::logLevelMessage(static_cast<const char*>(__func__), "FileNodeSource.cpp", __LINE__,
-                                     "Mavrel.Instrumentation", errorLevel, nullptr, 0, 0, reason);
+    logError({static_cast<const char*>(__func__), "FileNodeSource.cpp", __LINE__}, reason);
     return {};
 }
 
@@ -26,21 +23,19 @@ std::vector<Node> emptyInventory(const std::string& reason)
 
 std::vector<Node> FileNodeSource::read() const
 {
-    const char* const file = std::getenv(variable);
-    if (file == nullptr || *file == '\0')
-        return emptyInventory(std::string(variable) + " is not set: expected the name of an inventory file");
     try {
-        return readInventory(readFile(file, mostBytes));
+        Inventory inventory = readInventory(readFile(file_, mostBytes));
+        if (!inventory.sources.empty()) {
+            std::vector<Node> read = SysfsNodeSource(inventory.sources).read();
+            inventory.nodes.insert(inventory.nodes.end(), std::make_move_iterator(read.begin()),
+                                   std::make_move_iterator(read.end()));
+        }
+        return std::move(inventory.nodes);
     } catch (const ReadFailure& failure) {
-        return emptyInventory(std::string(file) + ": " + failure.what());
+        return emptyInventory(file_ + ": " + failure.what());
     } catch (const InventoryError& error) {
-        return emptyInventory(std::string(file) + ": " + error.what());
+        return emptyInventory(file_ + ": " + error.what());
     }
-}
-
-std::string FileNodeSource::displayText(const std::string& path) const
-{
-    return path;
 }
 
 } // namespace Tavro

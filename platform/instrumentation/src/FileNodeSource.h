@@ -4,15 +4,21 @@
 
 #include "NodeSource.h"
 
+#include <string>
+#include <utility>
+
 namespace Tavro {
 
-/// The inventory file named by the environment variable TAVRO_INVENTORY.
+/// An inventory file: the nodes that stand in it, then those of the sources that it names.
 class FileNodeSource : public NodeSource
 {
 public:
+    explicit FileNodeSource(std::string file) : file_(std::move(file)) {}
+
     [[nodiscard]] std::vector<Node> read() const override;
-    /// The path as it stands in the file, where people wrote it.
-    [[nodiscard]] std::string displayText(const std::string& path) const override;
+
+private:
+    std::string file_;
 };
 
 } // namespace Tavro

@@ -1,7 +1,8 @@
 #include "Tavro/Instrumentation.h"
 
-#include "FileNodeSource.h"
+#include "NodeSource.h"
 
+#include <algorithm>
 #include <cstddef>
 #include <vector>
 
@@ -9,8 +10,7 @@ namespace Tavro {
 
 struct Instrumentation::Implementation
 {
-    std::unique_ptr<const NodeSource> source = std::make_unique<FileNodeSource>();
-    std::vector<Node> nodes = source->read();
+    const std::vector<Node> nodes = chooseNodeSource()->read();
     unsigned int kind = 0;
     std::size_t position = nodes.size(); ///< off the end: on no node
 
@@ -23,6 +23,16 @@ struct Instrumentation::Implementation
 
     /// Null while the cursor stands on none.
     [[nodiscard]] const Node* node() const { return position < nodes.size() ? &nodes[position] : nullptr; }
+
+    /// The node of that path, the one the cursor stands on before any other; null: there is none.
+    [[nodiscard]] const Node* nodeAt(const std::string& path) const
+    {
+        if (const Node* const current = node(); current != nullptr && current->path == path)
+            return current;
+        const auto found = std::find_if(nodes.begin(), nodes.end(),
+                                        [&path](const Node& candidate) { return candidate.path == path; });
+        return found == nodes.end() ? nullptr : &*found;
+    }
 };
 
 Instrumentation::Instrumentation() : implementation_(std::make_unique<Implementation>()) {}
@@ -57,7 +67,8 @@ std::string Instrumentation::getPathToNode() const
 
 std::string Instrumentation::convertPathToString(const std::string& path) const
 {
-    return implementation_->source->displayText(path);
+    const Node* const node = implementation_->nodeAt(path);
+    return node == nullptr ? path : node->displayText.value_or(path);
 }
 
 std::string Instrumentation::getNodeDescription() const

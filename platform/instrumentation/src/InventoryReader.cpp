@@ -1,6 +1,7 @@
 #include "InventoryReader.h"
 
 #include "NodeKinds.h"
+#include "QuotedNames.h"
 
 #include <algorithm>
 #include <array>
@@ -30,22 +31,14 @@ struct Field
     bool isRequired;
 };
 
-constexpr std::array inventoryFields = {Field{"$schema", false}, Field{"nodes", true}};
+constexpr std::array inventoryFields = {Field{"$schema", false}, Field{"nodes", false},
+                                        Field{"sources", false}};
 constexpr std::array nodeFields = {Field{"kind", true}, Field{"description", true}, Field{"path", true},
                                    Field{"status", true}, Field{"alarmState", false}};
 
 std::string inQuotes(std::string_view text)
 {
     return '"' + std::string(text) + '"';
-}
-
-template <class Fields>
-std::string listOf(const Fields& fields)
-{
-    std::string list;
-    for (const Field& field : fields)
-        list += (list.empty() ? "" : ", ") + inQuotes(field.name);
-    return list;
 }
 
 /// Cut where a character of UTF-8 ends.
@@ -96,7 +89,7 @@ class InventoryHandler
 public:
     explicit InventoryHandler(std::string_view text) : text_(text) {}
 
-    std::vector<Node> takeNodes() { return std::move(nodes_); }
+    Inventory takeInventory() { return std::move(inventory_); }
 
     // What the parser calls. None of these returns false: a fault is thrown.
 
@@ -112,11 +105,11 @@ public:
             refuse(std::to_string(value));
         const auto number = static_cast<unsigned int>(value);
         if (isAt("kind"))
-            nodes_.back().kind = number;
+            node().kind = number;
         else if (isAt("status"))
-            nodes_.back().status = number;
+            node().status = number;
         else if (isAt("alarmState"))
-            nodes_.back().alarmState = number;
+            node().alarmState = number;
         else
             refuse(std::to_string(value));
         return true;
@@ -125,11 +118,13 @@ public:
     bool string(const std::string& value)
     {
         if (isAt("kind"))
-            nodes_.back().kind = kindCalled(value);
+            node().kind = kindCalled(value);
         else if (isAt("description"))
-            nodes_.back().description = checkedText(value);
+            node().description = checkedText(value);
         else if (isAt("path"))
-            nodes_.back().path = checkedText(value);
+            node().path = checkedText(value);
+        else if (level_ == Level::SourceList)
+            inventory_.sources.push_back(sourceCalled(value));
         else if (level_ != Level::Inventory || field_ != "$schema")
             refuse(inQuotes(escaped(value)));
         return true;
@@ -141,7 +136,7 @@ public:
             level_ = Level::Inventory;
         } else if (level_ == Level::NodeList) {
             level_ = Level::Node;
-            nodes_.emplace_back();
+            inventory_.nodes.emplace_back();
             fieldsOfNode_.clear();
         } else {
             refuse("an object");
@@ -163,10 +158,11 @@ public:
     {
         field_.clear();
         if (level_ == Level::Node) {
-            checkComplete(nodeFields, fieldsOfNode_);
+            checkNodeIsComplete();
             level_ = Level::NodeList;
         } else {
-            checkComplete(inventoryFields, fieldsOfInventory_);
+            if (!has(fieldsOfInventory_, "nodes") && !has(fieldsOfInventory_, "sources"))
+                throw InventoryError(place() + ": expected the field \"nodes\" or \"sources\", found none");
             level_ = Level::Outside;
         }
         return true;
@@ -174,9 +170,9 @@ public:
 
     bool start_array(std::size_t)
     {
-        if (level_ != Level::Inventory || field_ != "nodes")
+        if (level_ != Level::Inventory || field_ == "$schema")
             refuse("a list");
-        level_ = Level::NodeList;
+        level_ = field_ == "nodes" ? Level::NodeList : Level::SourceList;
         return true;
     }
 
@@ -199,9 +195,15 @@ private:
         Outside,
         Inventory,
         NodeList,
-        Node
+        Node,
+        SourceList
     };
     using Names = std::set<std::string, std::less<>>;
+
+    [[nodiscard]] const std::vector<Node>& nodes() const { return inventory_.nodes; }
+
+    /// The node that the parser is in.
+    Node& node() { return inventory_.nodes.back(); }
 
     [[nodiscard]] bool isAt(std::string_view nodeField) const
     {
@@ -213,16 +215,17 @@ private:
     {
         if (std::none_of(std::begin(known), std::end(known),
                          [this](const Field& f) { return f.name == field_; }))
-            throw InventoryError(place() + ": unknown field, expected one of " + listOf(known));
+            throw InventoryError(place() + ": unknown field, expected one of " + quotedNames(known));
         if (!seen.insert(field_).second)
             throw InventoryError(place() + ": field given twice, expected it once");
     }
 
-    template <class Fields>
-    void checkComplete(const Fields& known, const Names& seen) const
+    static bool has(const Names& seen, std::string_view name) { return seen.find(name) != seen.end(); }
+
+    void checkNodeIsComplete() const
     {
-        for (const Field& field : known)
-            if (field.isRequired && seen.find(field.name) == seen.end())
+        for (const Field& field : nodeFields)
+            if (field.isRequired && !has(fieldsOfNode_, field.name))
                 throw InventoryError(place() + ": expected the field " + inQuotes(field.name) +
                                      ", found none");
     }
@@ -233,6 +236,17 @@ private:
         if (!kind)
             refuse(inQuotes(escaped(name)));
         return *kind;
+    }
+
+    [[nodiscard]] SysfsClass sourceCalled(const std::string& name) const
+    {
+        const std::optional<SysfsClass> source = findSysfsClass(name);
+        if (!source)
+            refuse(inQuotes(escaped(name)));
+        const std::vector<SysfsClass>& before = inventory_.sources;
+        if (std::find(before.begin(), before.end(), *source) != before.end())
+            throw InventoryError(place() + ": source given twice, expected it once");
+        return *source;
     }
 
     /// Texts go through interfaces in which a null character ends them.
@@ -253,10 +267,12 @@ private:
     {
         Json::json_pointer pointer;
         if (level_ == Level::NodeList)
-            pointer = pointer / "nodes" / nodes_.size();
+            pointer = pointer / "nodes" / nodes().size();
         else if (level_ == Level::Node)
-            pointer = pointer / "nodes" / (nodes_.size() - 1);
-        if (level_ != Level::NodeList && !field_.empty())
+            pointer = pointer / "nodes" / (nodes().size() - 1);
+        else if (level_ == Level::SourceList)
+            pointer = pointer / "sources" / inventory_.sources.size();
+        if ((level_ == Level::Inventory || level_ == Level::Node) && !field_.empty())
             pointer /= escaped(field_);
         return pointer.empty() ? "the whole file" : pointer.to_string();
     }
@@ -264,11 +280,15 @@ private:
     [[nodiscard]] std::string expected() const
     {
         if (level_ == Level::Outside)
-            return "an object with the field \"nodes\"";
+            return R"(an object with the field "nodes" or "sources")";
         if (level_ == Level::NodeList)
             return "a node, which is an object";
+        if (level_ == Level::SourceList)
+            return "one of " + listSysfsClasses();
         if (field_ == "nodes")
             return "a list of nodes";
+        if (field_ == "sources")
+            return "a list of sources";
         std::string number = "a whole number from 0 to " + std::to_string(largestNumber);
         if (field_ == "kind")
             return number + " or one of " + listNodeKinds();
@@ -282,16 +302,16 @@ private:
     std::string field_; ///< that was named last in the object the parser is in
     Names fieldsOfInventory_;
     Names fieldsOfNode_;
-    std::vector<Node> nodes_;
+    Inventory inventory_;
 };
 
 } // namespace
 
-std::vector<Node> readInventory(const std::string& json)
+Inventory readInventory(const std::string& json)
 {
     InventoryHandler handler(json);
     Json::sax_parse(json, &handler);
-    return handler.takeNodes();
+    return handler.takeInventory();
 }
 
 } // namespace Tavro

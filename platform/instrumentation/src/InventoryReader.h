@@ -4,6 +4,7 @@
 #define TAVRO_INVENTORYREADER_H
 
 #include "Node.h"
+#include "SysfsClasses.h"
 
 #include <stdexcept>
 #include <string>
@@ -19,9 +20,15 @@ public:
     using std::runtime_error::runtime_error;
 };
 
-/// The nodes of an inventory in JSON, in their order there.
+/// What an inventory file says.
+struct Inventory
+{
+    std::vector<Node> nodes;         ///< in their order there
+    std::vector<SysfsClass> sources; ///< read after the nodes, in this order; none twice
+};
+
 /// \throw InventoryError at the first fault
-std::vector<Node> readInventory(const std::string& json);
+Inventory readInventory(const std::string& json);
 
 } // namespace Tavro
 

@@ -15,6 +15,7 @@ struct Node
     std::string path;
     unsigned int status = 0;
     std::optional<unsigned int> alarmState;
+    std::optional<std::string> displayText; ///< what people are shown for the path; nothing: the path itself
 };
 
 } // namespace Tavro

@@ -1,5 +1,6 @@
 #include "NodeKinds.h"
 
+#include "QuotedNames.h"
 #include "Tavro/NodeLexicon.h"
 
 #include <array>
@@ -37,13 +38,7 @@ std::optional<unsigned int> findNodeKind(std::string_view name)
 
 std::string listNodeKinds()
 {
-    std::string list;
-    for (const NamedKind& named : namedKinds) {
-        if (!list.empty())
-            list += ", ";
-        list.append(1, '"').append(named.name).append(1, '"');
-    }
-    return list;
+    return quotedNames(namedKinds);
 }
 
 } // namespace Tavro

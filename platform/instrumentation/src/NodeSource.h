@@ -5,7 +5,7 @@
 
 #include "Node.h"
 
-#include <string>
+#include <memory>
 #include <vector>
 
 namespace Tavro {
@@ -21,10 +21,11 @@ public:
     /// All nodes as they are now, in the inventory's order. A source that cannot be read logs why, in
     /// one error line, and has no nodes. Throws nothing but std::bad_alloc.
     [[nodiscard]] virtual std::vector<Node> read() const = 0;
-
-    /// What is shown to people for a path of this source.
-    [[nodiscard]] virtual std::string displayText(const std::string& path) const = 0;
 };
+
+/// The source that the environment variable TAVRO_INVENTORY names: "sysfs", or nothing, is what Linux
+/// knows of this machine; anything else is the name of an inventory file.
+std::unique_ptr<const NodeSource> chooseNodeSource();
 
 } // namespace Tavro
 

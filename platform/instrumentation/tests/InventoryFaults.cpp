@@ -3,6 +3,7 @@
 #include "testing/Environment.h"
 #include "testing/RecordingLog.h"
 #include "testing/TemporaryDirectory.h"
+#include "testing/WithoutPrivileges.h"
 
 #include <algorithm>
 #include <filesystem>
@@ -16,7 +17,6 @@
 #include <gtest/gtest.h>
 
 #include <sys/stat.h>
-#include <unistd.h>
 
 namespace {
 
@@ -28,7 +28,7 @@ class InventoryFaults : public testing::Test
 {
 protected:
     /// What is logged about the inventory in that file. Expects exactly one line, and no nodes.
-    std::string complaintAbout(const std::optional<std::string>& file)
+    std::string complaintAbout(const std::string& file)
     {
         inventory.set(file);
         Tavro::Instrumentation cursor;
@@ -63,13 +63,6 @@ protected:
 
 // The file.
 
-TEST_F(InventoryFaults, noFileIsNamed)
-{
-    const std::string complaint = "TAVRO_INVENTORY is not set: expected the name of an inventory file";
-    EXPECT_EQ(complaintAbout(std::nullopt), complaint);
-    EXPECT_EQ(complaintAbout(""), complaint);
-}
-
 TEST_F(InventoryFaults, theFileIsMissing)
 {
     const std::string file = directory.path("missing.json");
@@ -78,29 +71,11 @@ TEST_F(InventoryFaults, theFileIsMissing)
               file + "/below: expected a readable file: No such file or directory");
 }
 
-/// Root may read everything; for as long as this lives, the test is somebody who may not.
-class WithoutPrivileges
-{
-public:
-    WithoutPrivileges() : before_(geteuid())
-    {
-        if (before_ == 0) {
-            EXPECT_EQ(seteuid(65534), 0);
-        }
-    }
-    ~WithoutPrivileges() { EXPECT_EQ(seteuid(before_), 0); }
-    WithoutPrivileges(const WithoutPrivileges&) = delete;
-    WithoutPrivileges& operator=(const WithoutPrivileges&) = delete;
-
-private:
-    uid_t before_;
-};
-
 TEST_F(InventoryFaults, theFileMayNotBeRead)
 {
     const std::string file = directory.write("secret.json", R"({"nodes":[]})");
     ASSERT_EQ(chmod(file.c_str(), 0), 0);
-    const WithoutPrivileges user;
+    const PlatformTesting::WithoutPrivileges user;
     EXPECT_EQ(complaintAbout(file), file + ": expected a readable file: Permission denied");
 }
 
@@ -222,10 +197,11 @@ TEST_F(InventoryFaults, theReportStaysShortWhateverTheFileHolds)
             EXPECT_LT(faultIn(beginning + lots + end).size(), 500U) << beginning << end;
 }
 
+const std::string anInventory = R"(: expected an object with the field "nodes" or "sources", found )";
+
 TEST_F(InventoryFaults, deepNestingIsRefusedAtItsBeginning)
 {
-    EXPECT_EQ(faultIn(std::string(1000000, '[')),
-              "the whole file: expected an object with the field \"nodes\", found a list");
+    EXPECT_EQ(faultIn(std::string(1000000, '[')), "the whole file" + anInventory + "a list");
     EXPECT_EQ(faultIn("{\"nodes\":" + std::string(1000000, '[')),
               "/nodes/0: expected a node, which is an object, found a list");
 }
@@ -240,7 +216,9 @@ TEST_P(ContentFaults, areReportedWithTheirPlaceAndWhatWasExpected)
     EXPECT_EQ(faultIn(GetParam().content), GetParam().complaint);
 }
 
-const std::string anInventory = ": expected an object with the field \"nodes\", found ";
+const std::string nothing = R"(: expected the field "nodes" or "sources", found none)";
+const std::string inventoryFields = R"(: unknown field, expected one of "$schema", "nodes", "sources")";
+const std::string aSource = R"(: expected one of "leds", "enclosures", found )";
 const std::string number = "expected a whole number from 0 to 4294967295";
 const std::string kind =
     number + R"( or one of "chassis", "system board", "processor", "memory module", "drive", "fan", )"
@@ -254,14 +232,12 @@ INSTANTIATE_TEST_SUITE_P(
         Fault{"null", "the whole file" + anInventory + "null"},
         Fault{"true", "the whole file" + anInventory + "true"},
         Fault{"7", "the whole file" + anInventory + "7"}, Fault{"-7", "the whole file" + anInventory + "-7"},
-        Fault{"\"x\"", "the whole file" + anInventory + "\"x\""},
-        Fault{"{}", "the whole file: expected the field \"nodes\", found none"},
-        Fault{R"({"$schema":"x"})", "the whole file: expected the field \"nodes\", found none"},
-        Fault{R"({"node":[]})", "/node: unknown field, expected one of \"$schema\", \"nodes\""},
-        Fault{R"({"Nodes":[]})", "/Nodes: unknown field, expected one of \"$schema\", \"nodes\""},
-        Fault{R"({"nodes":[],"a/b~c":1})", "/a~1b~0c: unknown field, expected one of \"$schema\", \"nodes\""},
-        Fault{R"({"nodes":[],"a\u0000\u001bb":1})",
-              R"(/a\u0000\u001bb: unknown field, expected one of "$schema", "nodes")"},
+        Fault{"\"x\"", "the whole file" + anInventory + "\"x\""}, Fault{"{}", "the whole file" + nothing},
+        Fault{R"({"$schema":"x"})", "the whole file" + nothing},
+        Fault{R"({"node":[]})", "/node" + inventoryFields},
+        Fault{R"({"Nodes":[]})", "/Nodes" + inventoryFields},
+        Fault{R"({"nodes":[],"a/b~c":1})", "/a~1b~0c" + inventoryFields},
+        Fault{R"({"nodes":[],"a\u0000\u001bb":1})", R"(/a\u0000\u001bb)" + inventoryFields},
         Fault{R"({"nodes":"a\u0000\"\\\nä"})", R"(/nodes: expected a list of nodes, found "a\u0000\"\\\nä")"},
         Fault{R"({"nodes":[],"nodes":[]})", "/nodes: field given twice, expected it once"},
         Fault{R"({"$schema":1,"nodes":[]})", "/$schema: expected a text, found 1"},
@@ -273,6 +249,24 @@ INSTANTIATE_TEST_SUITE_P(
         Fault{R"({"nodes":[7]})", "/nodes/0: expected a node, which is an object, found 7"},
         Fault{R"({"nodes":[null]})", "/nodes/0: expected a node, which is an object, found null"},
         Fault{R"({"nodes":["kind"]})", "/nodes/0: expected a node, which is an object, found \"kind\""}));
+
+INSTANTIATE_TEST_SUITE_P(
+    Sources, ContentFaults,
+    testing::Values(Fault{R"({"sources":"leds"})", "/sources: expected a list of sources, found \"leds\""},
+                    Fault{R"({"sources":{}})", "/sources: expected a list of sources, found an object"},
+                    Fault{R"({"sources":null})", "/sources: expected a list of sources, found null"},
+                    Fault{R"({"sources":1})", "/sources: expected a list of sources, found 1"},
+                    Fault{R"({"nodes":[],"sources":["LEDs"]})", "/sources/0" + aSource + "\"LEDs\""},
+                    Fault{R"({"sources":["leds","fans"],"nodes":[]})", "/sources/1" + aSource + "\"fans\""},
+                    Fault{R"({"sources":["leds",7]})", "/sources/1" + aSource + "7"},
+                    Fault{R"({"sources":["leds",null]})", "/sources/1" + aSource + "null"},
+                    Fault{R"({"sources":[["leds"]]})", "/sources/0" + aSource + "a list"},
+                    Fault{R"({"sources":[{"leds":1}]})", "/sources/0" + aSource + "an object"},
+                    Fault{R"({"sources":["enclosures","leds","enclosures"]})",
+                          "/sources/2: source given twice, expected it once"},
+                    Fault{R"({"sources":["leds"],"sources":[]})",
+                          "/sources: field given twice, expected it once"},
+                    Fault{R"({"sources":["leds"],"nodes":3})", "/nodes: expected a list of nodes, found 3"}));
 
 /// A node that is well in an inventory with three before it and one in it that are not at fault.
 std::string inventoryWith(const std::string& fields)

@@ -1,9 +1,12 @@
 /// \file
 /// The hardware inventory of this server.
 ///
-/// It is read from the JSON file named by the environment variable TAVRO_INVENTORY. A file that cannot
-/// be read or is not an inventory in every detail counts as an empty one; one error line in the log says
-/// which file, where in it, and what was expected.
+/// The environment variable TAVRO_INVENTORY chooses where it is read from. "sysfs", and the variable unset
+/// or empty: the LEDs and drive enclosures that Linux shows in sysfs, below TAVRO_SYSFS_ROOT, by default
+/// /sys. Anything else: a JSON file of that name.
+///
+/// A file that cannot be read or is not an inventory in every detail counts as an empty one; one error line
+/// in the log says which file, where in it, and what was expected. So does a root of sysfs that is none.
 #ifndef TAVRO_INSTRUMENTATION_H
 #define TAVRO_INSTRUMENTATION_H
 
@@ -41,7 +44,8 @@ public:
     /// The inventory's own path of the node.
     [[nodiscard]] std::string getPathToNode() const;
 
-    /// What is shown to people for a path of this inventory. A file's paths are shown as they stand there.
+    /// What is shown to people for a path of this inventory: for a node of sysfs its place among the devices
+    /// of its class. A file's paths, and those of no node, are shown as they stand.
     [[nodiscard]] std::string convertPathToString(const std::string& path) const;
 
     /// The node's description, as it stands in the inventory.
