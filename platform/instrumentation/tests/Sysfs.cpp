@@ -2,8 +2,8 @@
 
 #include <Tavro/Instrumentation.h>
 
-#include "RecordingLog.h"
 #include "testing/Environment.h"
+#include "testing/RecordingLog.h"
 #include "testing/TemporaryDirectory.h"
 #include "testing/WithoutPrivileges.h"
 
