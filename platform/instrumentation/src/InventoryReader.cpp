@@ -162,7 +162,7 @@ public:
             level_ = Level::NodeList;
         } else {
             if (!has(fieldsOfInventory_, "nodes") && !has(fieldsOfInventory_, "sources"))
-                throw InventoryError(place() + ": expected the field \"nodes\" or \"sources\", found none");
+                throw InventoryError(place() + R"(: expected the field "nodes" or "sources", found none)");
             level_ = Level::Outside;
         }
         return true;

@@ -73,9 +73,10 @@ bool blinks(std::string_view trigger)
 unsigned int slotStatus(std::string_view text)
 {
     const std::string_view word = withoutLineEnd(text);
-    const auto found = std::find_if(statusWords.begin(), statusWords.end(),
-                                    [word](const StatusWord& candidate) { return candidate.word == word; });
-    return found == statusWords.end() ? unknownStatus : found->status;
+    for (const StatusWord& known : statusWords)
+        if (known.word == word)
+            return known.status;
+    return unknownStatus;
 }
 
 } // namespace Tavro

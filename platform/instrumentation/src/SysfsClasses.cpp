@@ -21,6 +21,7 @@ constexpr std::array namedClasses = {NamedClass{"leds", SysfsClass::Leds},
 std::vector<SysfsClass> allSysfsClasses()
 {
     std::vector<SysfsClass> all;
+    all.reserve(namedClasses.size());
     for (const NamedClass& named : namedClasses)
         all.push_back(named.sysfsClass);
     return all;
@@ -34,7 +35,7 @@ std::optional<SysfsClass> findSysfsClass(std::string_view name)
     return std::nullopt;
 }
 
-std::string folderOf(SysfsClass sysfsClass)
+const char* folderOf(SysfsClass sysfsClass)
 {
     return sysfsClass == SysfsClass::Leds ? "class/leds" : "class/enclosure";
 }

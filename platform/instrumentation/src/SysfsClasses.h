@@ -23,7 +23,7 @@ std::vector<SysfsClass> allSysfsClasses();
 std::optional<SysfsClass> findSysfsClass(std::string_view name);
 
 /// Where sysfs keeps its devices, relative to the root: "class/leds".
-std::string folderOf(SysfsClass sysfsClass);
+const char* folderOf(SysfsClass sysfsClass);
 
 /// All names, quoted and separated by commas.
 std::string listSysfsClasses();

@@ -48,12 +48,11 @@ std::vector<Node> SysfsNodeSource::read() const
     }
     std::vector<Node> nodes;
     for (const SysfsClass sysfsClass : classes_) {
-        const std::string folder = folderOf(sysfsClass);
-        const SysfsDirectory directory(root, folder);
+        const SysfsDirectory directory(root, folderOf(sysfsClass));
         if (directory.isOpen())
             appendNodes(sysfsClass, directory, nodes);
         else if (!directory.isAbsent())
-            complain(rootPath + '/' + folder, directory.errorCode());
+            complain(std::string(rootPath).append("/").append(folderOf(sysfsClass)), directory.errorCode());
     }
     return nodes;
 }

@@ -21,7 +21,6 @@ using PlatformTesting::Environment;
 using PlatformTesting::TemporaryDirectory;
 using Tavro::Instrumentation;
 using testing::ElementsAre;
-using testing::HasSubstr;
 using testing::IsEmpty;
 using testing::UnorderedElementsAre;
 namespace NodeLexicon = Tavro::NodeLexicon;
