@@ -1,6 +1,7 @@
 #include "cim/ObjectPathText.h"
 
 #include "cim/Literal.h"
+#include "cim/Number.h"
 #include "cim/Utf8.h"
 #include "cim/Values.h"
 
@@ -212,24 +213,8 @@ Value Reader::readNumber()
 {
     const std::size_t start = position_;
     const std::string_view token = takeWhile(isNumberByte);
-    const char* first = token.data() + (token.front() == '+' ? 1 : 0);
-    const char* const last = token.data() + token.size();
-    const bool signedTwice = token.front() == '+' && token.size() > 1 && token[1] == '-';
-
-    std::uint64_t natural = 0;
-    std::int64_t integer = 0;
-    double real = 0;
-    const bool isInteger = token.find_first_of(".eE") == std::string_view::npos;
-    const auto isRead = [&](auto& number) {
-        const auto [end, error] = std::from_chars(first, last, number);
-        return error == std::errc() && end == last && !signedTwice;
-    };
-    if (isInteger && isRead(natural))
-        return unsignedValue(natural);
-    if (isInteger && isRead(integer))
-        return integer < 0 ? signedValue(integer) : unsignedValue(0);
-    if (!isInteger && isRead(real))
-        return realValue(real);
+    if (std::optional<Value> number = parseNumber(token))
+        return std::move(*number);
     fail(start, '"' + excerpt(token) + '"', "a decimal number of 64 bits");
 }
 

@@ -27,6 +27,7 @@ Examples:
   cimhost gi 'CLASS.Key="value"'           one instance
   cimhost ai -ac ASSOC 'CLASS.Key="value"' what an association ties to it
   cimhost graph | dot -Tsvg > graph.svg    the whole picture
+  cimhost serve                            for CIM clients on this machine
 
 Environment:
   CIMHOST_PROVIDER_DIR   directories of provider libraries, separated by colons
@@ -51,6 +52,9 @@ void translateFieldSpellings(std::vector<std::string>& arguments)
         std::replace(arguments.begin(), end, std::string(spelling), std::string(option));
 }
 
+/// Of CIM-XML over HTTP without encryption, as registered with IANA (wbem-http).
+constexpr std::uint16_t standardPort = 5988;
+
 /// What the options and positionals write into.
 struct Arguments
 {
@@ -58,13 +62,14 @@ struct Arguments
     std::string nameSpace = "root/cimv2";
     std::vector<std::string> properties;
     std::string format;
-    Invocation invocation;
+    OperationRequest request;
+    Serve serve{"127.0.0.1", standardPort};
+    Settings settings;
 };
 
 /// What an operation takes besides the common options.
 enum class Target
 {
-    none,
     classPath,
     objectPath,
 };
@@ -75,7 +80,7 @@ enum class Filters
     references,  ///< the association class, which is the operation's result class, and one role
 };
 
-struct CommandEntry
+struct QuestionEntry
 {
     Operation operation;
     const char* name;
@@ -85,26 +90,24 @@ struct CommandEntry
     Filters filters;
 };
 
-constexpr std::array commandEntries{
-    CommandEntry{Operation::enumerateInstanceNames, "ein", "enumerate-instance-names",
-                 "Enumerate the names of a class's instances", Target::classPath, Filters::none},
-    CommandEntry{Operation::enumerateInstances, "ei", "enumerate-instances", "Enumerate a class's instances",
-                 Target::classPath, Filters::none},
-    CommandEntry{Operation::getInstance, "gi", "get-instance", "Get one instance", Target::objectPath,
-                 Filters::none},
-    CommandEntry{Operation::associatorNames, "ain", "associator-names",
-                 "Names of the objects that associations tie to an object", Target::objectPath,
-                 Filters::associators},
-    CommandEntry{Operation::associators, "ai", "associators",
-                 "The objects that associations tie to an object", Target::objectPath, Filters::associators},
-    CommandEntry{Operation::referenceNames, "rin", "reference-names",
-                 "Names of the association instances that refer to an object", Target::objectPath,
-                 Filters::references},
-    CommandEntry{Operation::references, "ri", "references",
-                 "The association instances that refer to an object", Target::objectPath,
-                 Filters::references},
-    CommandEntry{Operation::graph, "graph", "", "Write a namespace's instances as a Graphviz graph",
-                 Target::none, Filters::none},
+constexpr std::array questionEntries{
+    QuestionEntry{Operation::enumerateInstanceNames, "ein", "enumerate-instance-names",
+                  "Enumerate the names of a class's instances", Target::classPath, Filters::none},
+    QuestionEntry{Operation::enumerateInstances, "ei", "enumerate-instances", "Enumerate a class's instances",
+                  Target::classPath, Filters::none},
+    QuestionEntry{Operation::getInstance, "gi", "get-instance", "Get one instance", Target::objectPath,
+                  Filters::none},
+    QuestionEntry{Operation::associatorNames, "ain", "associator-names",
+                  "Names of the objects that associations tie to an object", Target::objectPath,
+                  Filters::associators},
+    QuestionEntry{Operation::associators, "ai", "associators",
+                  "The objects that associations tie to an object", Target::objectPath, Filters::associators},
+    QuestionEntry{Operation::referenceNames, "rin", "reference-names",
+                  "Names of the association instances that refer to an object", Target::objectPath,
+                  Filters::references},
+    QuestionEntry{Operation::references, "ri", "references",
+                  "The association instances that refer to an object", Target::objectPath,
+                  Filters::references},
 };
 
 const std::map<std::string, Format>& formats()
@@ -151,7 +154,7 @@ CLI::Validator named(const char* what)
 
 void addCommonOptions(CLI::App& app, Arguments& arguments)
 {
-    Settings& settings = arguments.invocation.settings;
+    Settings& settings = arguments.settings;
     app.add_option("-n,--namespace", arguments.nameSpace, "Namespace of paths without one")
         ->type_name("NAMESPACE")
         ->capture_default_str();
@@ -193,51 +196,76 @@ void addFilters(CLI::App& command, Filters filters, Traversal& traversal)
         ->type_name("ROLE");
 }
 
-void addCommand(CLI::App& app, const CommandEntry& entry, Arguments& arguments)
+/// A command, with what all of them have.
+CLI::App& addCommand(CLI::App& app, const char* name, const char* description)
 {
-    Command& result = arguments.invocation.command;
-    CLI::App* command = app.add_subcommand(entry.name, entry.description);
-    if (*entry.alias != '\0')
-        command->alias(entry.alias);
-    command->fallthrough();
-    command->group("Commands");
-    command->footer("More options, for all commands: cimhost --help");
-    command->callback([&entry, &result] { result.operation = entry.operation; });
-    if (entry.target != Target::none) {
-        const bool isClass = entry.target == Target::classPath;
-        command
-            ->add_option(isClass ? "CLASS" : "PATH", arguments.target,
-                         isClass ? "The class, such as root/cimv2:CLASS" : "The object's path")
-            ->type_name("")
-            ->required();
-        if (!answersPaths(entry.operation))
-            command->add_option("PROPERTY", arguments.properties, "Properties wanted; without any, all")
-                ->type_name("");
-    }
-    addFilters(*command, entry.filters, result.traversal);
+    CLI::App& command = *app.add_subcommand(name, description);
+    command.fallthrough();
+    command.group("Commands");
+    command.footer("More options, for all commands: cimhost --help");
+    return command;
 }
 
-/// What the parser alone cannot judge.
-void finish(Arguments& arguments)
+void addQuestion(CLI::App& app, const QuestionEntry& entry, Arguments& arguments)
 {
-    Command& command = arguments.invocation.command;
-    const auto* entry =
-        std::find_if(commandEntries.begin(), commandEntries.end(),
-                     [&](const CommandEntry& candidate) { return candidate.operation == command.operation; });
-    if (!arguments.format.empty())
-        command.format = formats().at(arguments.format);
-    if (!arguments.properties.empty())
-        command.properties = arguments.properties;
+    CLI::App& command = addCommand(app, entry.name, entry.description);
+    command.alias(entry.alias);
+    const bool isClass = entry.target == Target::classPath;
+    command
+        .add_option(isClass ? "CLASS" : "PATH", arguments.target,
+                    isClass ? "The class, such as root/cimv2:CLASS" : "The object's path")
+        ->type_name("")
+        ->required();
+    if (!answersPaths(entry.operation))
+        command.add_option("PROPERTY", arguments.properties, "Properties wanted; without any, all")
+            ->type_name("");
+    addFilters(command, entry.filters, arguments.request.traversal);
+}
 
-    if (entry->target == Target::none) {
-        if (command.format)
-            throw UsageError("--format has no meaning for graph, which writes DOT");
-        command.target.nameSpace = arguments.nameSpace;
-        return;
-    }
-    command.target = readTarget(arguments.target, arguments.nameSpace);
-    if (entry->target == Target::classPath && !command.target.keys.empty())
-        throw UsageError(std::string(entry->name) + " takes a class; gi gets the one instance of a path");
+void addServe(CLI::App& app, Serve& serve)
+{
+    CLI::App& command = addCommand(
+        app, "serve", "Answer CIM clients over HTTP, for development: no authentication, no encryption");
+    command.add_option("--address", serve.address, "Address of this machine to listen on")
+        ->type_name("ADDRESS")
+        ->check(named("network address"))
+        ->capture_default_str();
+    command.add_option("--port", serve.port, "Port to listen on; 0 for any that is free")
+        ->type_name("PORT")
+        ->check(CLI::Range(0, 65535))
+        ->capture_default_str();
+}
+
+Ask questionOf(const QuestionEntry& entry, Arguments& arguments)
+{
+    OperationRequest& request = arguments.request;
+    request.operation = entry.operation;
+    request.target = readTarget(arguments.target, arguments.nameSpace);
+    if (entry.target == Target::classPath && !request.target.keys.empty())
+        throw UsageError(std::string(entry.name) + " takes a class; gi gets the one instance of a path");
+    if (!arguments.properties.empty())
+        request.properties = arguments.properties;
+    Ask ask{request, {}};
+    if (!arguments.format.empty())
+        ask.format = formats().at(arguments.format);
+    return ask;
+}
+
+/// The command that was given, with what the parser alone cannot judge.
+Command commandOf(const CLI::App& app, Arguments& arguments)
+{
+    const std::string name = app.get_subcommands().front()->get_name();
+    const auto* entry = std::find_if(questionEntries.begin(), questionEntries.end(),
+                                     [&](const QuestionEntry& candidate) { return candidate.name == name; });
+    if (entry != questionEntries.end())
+        return questionOf(*entry, arguments);
+    const bool isGraph = name == "graph";
+    if (!arguments.format.empty())
+        throw UsageError("--format has no meaning for " + name + ", which writes " +
+                         (isGraph ? "DOT" : "XML"));
+    if (isGraph)
+        return DrawGraph{arguments.nameSpace};
+    return arguments.serve;
 }
 
 /// What is wrong, in one line.
@@ -270,8 +298,10 @@ std::variant<Invocation, Notice> parseArguments(std::vector<std::string> argumen
     app.get_formatter()->label("SUBCOMMAND", "COMMAND");
     app.require_subcommand(1);
     addCommonOptions(app, result);
-    for (const CommandEntry& entry : commandEntries)
-        addCommand(app, entry, result);
+    for (const QuestionEntry& entry : questionEntries)
+        addQuestion(app, entry, result);
+    addCommand(app, "graph", "Write a namespace's instances as a Graphviz graph");
+    addServe(app, result.serve);
 
     translateFieldSpellings(arguments);
     std::reverse(arguments.begin(), arguments.end()); // the parser takes them off the back
@@ -280,8 +310,7 @@ std::variant<Invocation, Notice> parseArguments(std::vector<std::string> argumen
     } catch (const CLI::ParseError& error) {
         return noticeOf(app, error);
     }
-    finish(result);
-    return result.invocation;
+    return Invocation{commandOf(app, result), result.settings};
 }
 
 } // namespace cimhost::cli

@@ -3,11 +3,12 @@
 #ifndef CIMHOST_CLI_COMMAND_H
 #define CIMHOST_CLI_COMMAND_H
 
-#include "broker/Broker.h"
-#include "cim/Model.h"
+#include "broker/OperationRequest.h"
 
+#include <cstdint>
 #include <optional>
 #include <string>
+#include <variant>
 #include <vector>
 
 namespace cimhost::cli {
@@ -20,18 +21,6 @@ enum ExitStatus : int
     exitUsage = 2, ///< the command line, or a file that it names, is wrong
 };
 
-enum class Operation
-{
-    enumerateInstanceNames,
-    enumerateInstances,
-    getInstance,
-    associators,
-    associatorNames,
-    references,
-    referenceNames,
-    graph,
-};
-
 enum class Format
 {
     text,  ///< paths as a command line takes them, instances as lists of NAME = VALUE
@@ -40,16 +29,27 @@ enum class Format
     json, ///< for programs
 };
 
-/// One request, and how its answer is to be shown.
-struct Command
+/// Asks one question and shows the answer.
+struct Ask
 {
-    Operation operation = Operation::enumerateInstanceNames;
-    /// The class or object asked for, with a namespace; of a graph the namespace only.
-    cim::ObjectPath target;
-    Traversal traversal;
-    cim::PropertyList properties;
+    OperationRequest request;
     std::optional<Format> format; ///< nothing: the one that suits the operation and the output
 };
+
+/// Draws the instances of a namespace.
+struct DrawGraph
+{
+    std::string nameSpace;
+};
+
+/// Answers the clients of a network address until a signal ends it.
+struct Serve
+{
+    std::string address;    ///< an IPv4 or IPv6 address of this machine
+    std::uint16_t port = 0; ///< 0: any that is free
+};
+
+using Command = std::variant<Ask, DrawGraph, Serve>;
 
 /// What the broker is to be started with.
 struct Settings
@@ -60,12 +60,9 @@ struct Settings
     bool trace = false;
 };
 
-/// Whether the answer consists of paths; otherwise it consists of instances.
-bool answersPaths(Operation operation);
-
-/// The format of the command, or without one: text for paths, ready to be copied into the next command;
-/// for instances a table on a terminal and text elsewhere.
-Format formatOf(const Command& command, bool isTerminal);
+/// The format asked for, or without one: text for paths, ready to be copied into the next command; for
+/// instances a table on a terminal and text elsewhere.
+Format formatOf(const Ask& ask, bool isTerminal);
 
 } // namespace cimhost::cli
 

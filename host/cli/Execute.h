@@ -1,5 +1,5 @@
 /// \file
-/// Carries a command out: asks the broker and shows the answer.
+/// Carries a command out.
 #ifndef CIMHOST_CLI_EXECUTE_H
 #define CIMHOST_CLI_EXECUTE_H
 
@@ -10,10 +10,10 @@
 
 namespace cimhost::cli {
 
+/// Asks, draws or serves.
 /// \param isTerminal  whether a person looks at `out`
 /// \return exitAnswered, or exitError after an answer with an error status, which goes to `err`;
-/// what such an answer brought is not shown, as brokers do not send it. GetInstance that brings no
-/// instance without an error is CMPI_RC_ERR_NOT_FOUND, as brokers have it.
+/// what such an answer brought is not shown, as brokers do not send it
 ExitStatus execute(const Command& command, Broker& broker, bool isTerminal, std::ostream& out,
                    std::ostream& err);
 

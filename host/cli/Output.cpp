@@ -53,28 +53,29 @@ std::string pathsText(const std::vector<cim::ObjectPath>& paths, Format format)
     return joined(paths, "", [](const cim::ObjectPath& path) { return text(path); });
 }
 
-std::string instancesText(const std::vector<cim::Instance>& instances, const Command& command, Format format)
+std::string instancesText(const std::vector<cim::Instance>& instances, const OperationRequest& request,
+                          Format format)
 {
     if (format == Format::mof)
         return joined(instances, "\n", [](const cim::Instance& instance) { return cim::mof(instance); });
     if (format == Format::text)
         return joined(instances, "\n", [](const cim::Instance& instance) { return text(instance); });
     // Who asks for one instance wants to see all of it.
-    if (command.operation == Operation::getInstance)
+    if (request.operation == Operation::getInstance)
         return instanceBlocks(instances);
-    return instanceTable(instances, command.properties);
+    return instanceTable(instances, request.properties);
 }
 
 } // namespace
 
-std::string answerText(const cim::Answer& answer, const Command& command, Format format)
+std::string answerText(const cim::Answer& answer, const OperationRequest& request, Format format)
 {
-    const bool paths = answersPaths(command.operation);
+    const bool paths = answersPaths(request.operation);
     if (format == Format::json)
         return cim::toText(cim::Json{
             {"status", cim::toJson(answer.status)},
             {paths ? "paths" : "instances", paths ? jsonList(answer.paths) : jsonList(answer.instances)}});
-    return paths ? pathsText(answer.paths, format) : instancesText(answer.instances, command, format);
+    return paths ? pathsText(answer.paths, format) : instancesText(answer.instances, request, format);
 }
 
 std::string errorText(const cim::Status& status, Format format)

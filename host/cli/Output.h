@@ -12,7 +12,7 @@ namespace cimhost::cli {
 
 /// What an answer brought. In JSON it comes with the status: `{ "status": ..., "paths": [...] }` or
 /// `{ "status": ..., "instances": [...] }`.
-std::string answerText(const cim::Answer& answer, const Command& command, Format format);
+std::string answerText(const cim::Answer& answer, const OperationRequest& request, Format format);
 
 /// An answer with an error status as standard output has it: in JSON `{ "status": ... }`, else nothing.
 std::string errorText(const cim::Status& status, Format format);

@@ -23,9 +23,14 @@ Invocation parse(std::vector<std::string> arguments)
     return std::get<Invocation>(parseArguments(std::move(arguments)));
 }
 
-Command commandOf(std::vector<std::string> arguments)
+OperationRequest requestOf(std::vector<std::string> arguments)
 {
-    return parse(std::move(arguments)).command;
+    return std::get<Ask>(parse(std::move(arguments)).command).request;
+}
+
+std::optional<Format> formatOf(std::vector<std::string> arguments)
+{
+    return std::get<Ask>(parse(std::move(arguments)).command).format;
 }
 
 std::string noticeOf(std::vector<std::string> arguments)
@@ -56,7 +61,7 @@ class CommandNames : public testing::TestWithParam<CommandName>
 
 TEST_P(CommandNames, chooseTheOperation)
 {
-    EXPECT_EQ(commandOf({GetParam().name, GetParam().target}).operation, GetParam().operation);
+    EXPECT_EQ(requestOf({GetParam().name, GetParam().target}).operation, GetParam().operation);
 }
 
 INSTANTIATE_TEST_SUITE_P(
@@ -78,28 +83,26 @@ INSTANTIATE_TEST_SUITE_P(
 
 TEST(Arguments, graphTakesNoTarget)
 {
-    const Command command = commandOf({"graph"});
-    EXPECT_EQ(command.operation, Operation::graph);
-    EXPECT_EQ(command.target.nameSpace, "root/cimv2");
-    EXPECT_EQ(commandOf({"graph", "--namespace", "root/x"}).target.nameSpace, "root/x");
+    EXPECT_EQ(std::get<DrawGraph>(parse({"graph"}).command).nameSpace, "root/cimv2");
+    EXPECT_EQ(std::get<DrawGraph>(parse({"graph", "--namespace", "root/x"}).command).nameSpace, "root/x");
     EXPECT_NE(errorOf({"graph", "C"}), "");
 }
 
 TEST(Arguments, theTargetHasANamespaceOfItsOwnOrTheCommonOne)
 {
-    EXPECT_EQ(commandOf({"ein", "C"}).target, (cim::ObjectPath{"", "root/cimv2", "C", {}}));
-    EXPECT_EQ(commandOf({"ein", "C", "--namespace", "root/x"}).target,
+    EXPECT_EQ(requestOf({"ein", "C"}).target, (cim::ObjectPath{"", "root/cimv2", "C", {}}));
+    EXPECT_EQ(requestOf({"ein", "C", "--namespace", "root/x"}).target,
               (cim::ObjectPath{"", "root/x", "C", {}}));
-    EXPECT_EQ(commandOf({"-n", "root/x", "ein", "C"}).target, (cim::ObjectPath{"", "root/x", "C", {}}));
-    EXPECT_EQ(commandOf({"ein", "a/b:C", "--namespace", "root/x"}).target,
+    EXPECT_EQ(requestOf({"-n", "root/x", "ein", "C"}).target, (cim::ObjectPath{"", "root/x", "C", {}}));
+    EXPECT_EQ(requestOf({"ein", "a/b:C", "--namespace", "root/x"}).target,
               (cim::ObjectPath{"", "a/b", "C", {}}));
-    EXPECT_EQ(commandOf({"gi", "//srv/a/b:C.K=\"x\""}).target,
+    EXPECT_EQ(requestOf({"gi", "//srv/a/b:C.K=\"x\""}).target,
               (cim::ObjectPath{"srv", "a/b", "C", {{"K", cim::textValue("x")}}}));
 }
 
 TEST(Arguments, anObjectMayLackKeysAClassMayNotHaveThem)
 {
-    EXPECT_EQ(commandOf({"gi", "C"}).target.className, "C");
+    EXPECT_EQ(requestOf({"gi", "C"}).target.className, "C");
     EXPECT_EQ(errorOf({"ei", "C.K=1"}), "ei takes a class; gi gets the one instance of a path");
     EXPECT_EQ(errorOf({"ein", "C.K=1"}), "ein takes a class; gi gets the one instance of a path");
 }
@@ -143,16 +146,16 @@ TEST(Arguments, showsOnlyTheSurroundingsOfTheWrongPlace)
 
 TEST(Arguments, propertiesFollowTheTarget)
 {
-    EXPECT_EQ(commandOf({"ei", "C"}).properties, std::nullopt);
-    EXPECT_THAT(commandOf({"ei", "C", "A", "B"}).properties.value(), ElementsAre("A", "B"));
-    EXPECT_THAT(commandOf({"gi", "C.K=1", "A", "--trace"}).properties.value(), ElementsAre("A"));
-    EXPECT_THAT(commandOf({"ai", "C.K=1", "A"}).properties.value(), ElementsAre("A"));
-    EXPECT_THAT(commandOf({"ri", "C.K=1", "A"}).properties.value(), ElementsAre("A"));
+    EXPECT_EQ(requestOf({"ei", "C"}).properties, std::nullopt);
+    EXPECT_THAT(requestOf({"ei", "C", "A", "B"}).properties.value(), ElementsAre("A", "B"));
+    EXPECT_THAT(requestOf({"gi", "C.K=1", "A", "--trace"}).properties.value(), ElementsAre("A"));
+    EXPECT_THAT(requestOf({"ai", "C.K=1", "A"}).properties.value(), ElementsAre("A"));
+    EXPECT_THAT(requestOf({"ri", "C.K=1", "A"}).properties.value(), ElementsAre("A"));
 }
 
 TEST(Arguments, aPropertyMayBeNamedLikeACommand)
 {
-    EXPECT_THAT(commandOf({"ei", "C", "references", "gi"}).properties.value(),
+    EXPECT_THAT(requestOf({"ei", "C", "references", "gi"}).properties.value(),
                 ElementsAre("references", "gi"));
 }
 
@@ -165,7 +168,7 @@ TEST(Arguments, namesHaveNoProperties)
 TEST(Arguments, traversalsTakeClassesAndRoles)
 {
     for (const char* command : {"ai", "ain"}) {
-        const Traversal traversal = commandOf({command, "C.K=1", "--assoc-class", "A", "--result-class", "R",
+        const Traversal traversal = requestOf({command, "C.K=1", "--assoc-class", "A", "--result-class", "R",
                                                "--role", "From", "--result-role", "To"})
                                         .traversal;
         EXPECT_EQ(traversal.assocClass, "A");
@@ -178,7 +181,7 @@ TEST(Arguments, traversalsTakeClassesAndRoles)
 TEST(Arguments, traversalsTakeTheFieldsSpellingsToo)
 {
     const Traversal traversal =
-        commandOf({"ain", "-ac", "A", "-arc", "R", "-ar", "From", "-arr", "To", "C.K=1"}).traversal;
+        requestOf({"ain", "-ac", "A", "-arc", "R", "-ar", "From", "-arr", "To", "C.K=1"}).traversal;
     EXPECT_EQ(traversal.assocClass, "A");
     EXPECT_EQ(traversal.resultClass, "R");
     EXPECT_EQ(traversal.role, "From");
@@ -189,7 +192,7 @@ TEST(Arguments, theAssociationOfReferencesIsTheirResultClass)
 {
     for (const char* command : {"ri", "rin"})
         for (const char* option : {"--result-class", "--assoc-class", "-arc", "-ac"}) {
-            const Traversal traversal = commandOf({command, option, "A", "-ar", "From", "C.K=1"}).traversal;
+            const Traversal traversal = requestOf({command, option, "A", "-ar", "From", "C.K=1"}).traversal;
             EXPECT_EQ(traversal.resultClass, "A") << command << option;
             EXPECT_EQ(traversal.assocClass, std::nullopt) << command << option;
             EXPECT_EQ(traversal.role, "From") << command << option;
@@ -199,7 +202,7 @@ TEST(Arguments, theAssociationOfReferencesIsTheirResultClass)
 
 TEST(Arguments, whatIsNotGivenIsNull)
 {
-    const Traversal traversal = commandOf({"ai", "C.K=1"}).traversal;
+    const Traversal traversal = requestOf({"ai", "C.K=1"}).traversal;
     EXPECT_EQ(traversal.assocClass, std::nullopt);
     EXPECT_EQ(traversal.resultClass, std::nullopt);
     EXPECT_EQ(traversal.role, std::nullopt);
@@ -215,11 +218,11 @@ TEST(Arguments, onlyTraversalsTakeFilters)
 
 TEST(Arguments, formatsHaveNames)
 {
-    EXPECT_EQ(commandOf({"ei", "C"}).format, std::nullopt);
-    EXPECT_EQ(commandOf({"ei", "C", "--format", "text"}).format, Format::text);
-    EXPECT_EQ(commandOf({"ei", "C", "--format", "table"}).format, Format::table);
-    EXPECT_EQ(commandOf({"--format", "mof", "ei", "C"}).format, Format::mof);
-    EXPECT_EQ(commandOf({"ei", "-f", "json", "C"}).format, Format::json);
+    EXPECT_EQ(formatOf({"ei", "C"}), std::nullopt);
+    EXPECT_EQ(formatOf({"ei", "C", "--format", "text"}), Format::text);
+    EXPECT_EQ(formatOf({"ei", "C", "--format", "table"}), Format::table);
+    EXPECT_EQ(formatOf({"--format", "mof", "ei", "C"}), Format::mof);
+    EXPECT_EQ(formatOf({"ei", "-f", "json", "C"}), Format::json);
     EXPECT_THAT(errorOf({"ei", "C", "--format", "xml"}), HasSubstr("xml not in {json,mof,table,text}"));
     EXPECT_THAT(errorOf({"graph", "--format", "json"}), HasSubstr("--format"));
 }
@@ -257,7 +260,7 @@ TEST(Arguments, repeatableOptionsTakeOneValueEach)
 {
     const Invocation invocation = parse({"--provider-dir", "/a", "ei", "C"});
     EXPECT_THAT(invocation.settings.providerDirectories, ElementsAre("/a"));
-    EXPECT_EQ(invocation.command.target.className, "C");
+    EXPECT_EQ(std::get<Ask>(invocation.command).request.target.className, "C");
 }
 
 TEST(Arguments, refuseWhatIsMissingOrUnknown)
@@ -291,8 +294,8 @@ TEST(Arguments, versionIsTheProjects)
 
 TEST(Formats, suitTheOutput)
 {
-    Command command;
-    command.operation = Operation::enumerateInstances;
+    Ask command;
+    command.request.operation = Operation::enumerateInstances;
     EXPECT_EQ(formatOf(command, true), Format::table);
     EXPECT_EQ(formatOf(command, false), Format::text);
     command.format = Format::json;
@@ -303,8 +306,8 @@ TEST(Formats, keepNamesReadyToBeCopied)
 {
     for (const Operation operation :
          {Operation::enumerateInstanceNames, Operation::associatorNames, Operation::referenceNames}) {
-        Command command;
-        command.operation = operation;
+        Ask command;
+        command.request.operation = operation;
         EXPECT_EQ(formatOf(command, true), Format::text);
         EXPECT_EQ(formatOf(command, false), Format::text);
     }

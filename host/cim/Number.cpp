@@ -1,0 +1,34 @@
+#include "cim/Number.h"
+
+#include "cim/Values.h"
+
+#include <charconv>
+
+namespace cimhost::cim {
+
+std::optional<Value> parseNumber(std::string_view text)
+{
+    const bool hasStrangers = text.find_first_not_of("0123456789+-.eE") != std::string_view::npos;
+    const bool signedTwice = text.substr(0, 2) == "+-";
+    if (text.empty() || hasStrangers || signedTwice)
+        return std::nullopt;
+
+    const char* const first = text.data() + (text.front() == '+' ? 1 : 0);
+    const char* const last = text.data() + text.size();
+    const auto isRead = [&](auto& number) {
+        const auto [end, error] = std::from_chars(first, last, number);
+        return error == std::errc() && end == last;
+    };
+    std::uint64_t natural = 0;
+    std::int64_t integer = 0;
+    double real = 0;
+    if (text.find_first_of(".eE") != std::string_view::npos)
+        return isRead(real) ? std::optional(realValue(real)) : std::nullopt;
+    if (isRead(natural))
+        return unsignedValue(natural);
+    if (isRead(integer))
+        return integer < 0 ? signedValue(integer) : unsignedValue(0);
+    return std::nullopt;
+}
+
+} // namespace cimhost::cim

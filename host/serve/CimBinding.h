@@ -1,0 +1,54 @@
+/// \file
+/// CIM operations over HTTP (DMTF DSP0200): what a request of HTTP has to be, and what is responded.
+#ifndef CIMHOST_SERVE_CIMBINDING_H
+#define CIMHOST_SERVE_CIMBINDING_H
+
+#include "broker/Broker.h"
+#include "serve/Http.h"
+#include "serve/Xml.h"
+
+#include <cstddef>
+#include <optional>
+#include <string>
+
+namespace cimhost::serve {
+
+/// What a request may have at most.
+struct RequestLimits
+{
+    std::size_t bytes = 1048576; ///< of the body
+    XmlLimits xml;
+};
+
+/// Answers requests by asking a broker. Safe to use from several threads at once.
+class CimBinding
+{
+public:
+    /// \param broker    outlives this object
+    /// \param hostName  of this machine, for paths that name no host but have to
+    CimBinding(Broker& broker, std::string hostName, const RequestLimits& limits = {});
+
+    /// The refusal of a request whose body need not be waited for; nothing: read on.
+    /// \param request  without its body
+    [[nodiscard]] std::optional<HttpResponse> refuse(const HttpRequest& request) const;
+
+    /// The response to a whole request. Never fails: an error has its status. An error of HTTP has a
+    /// body of plain text that says what is wrong, one of CIM is an ERROR in the response message.
+    [[nodiscard]] HttpResponse answer(const HttpRequest& request) const;
+
+    /// The response to a body that turned out longer than the limit.
+    [[nodiscard]] HttpResponse tooLarge() const;
+
+    [[nodiscard]] const RequestLimits& limits() const { return limits_; }
+
+private:
+    [[nodiscard]] HttpResponse respond(const HttpRequest& request) const;
+
+    Broker& broker_;
+    std::string hostName_;
+    RequestLimits limits_;
+};
+
+} // namespace cimhost::serve
+
+#endif

@@ -1,0 +1,15 @@
+/// \file
+#ifndef CIMHOST_SERVE_EXECUTOR_H
+#define CIMHOST_SERVE_EXECUTOR_H
+
+#include "broker/Broker.h"
+#include "serve/Message.h"
+
+namespace cimhost::serve {
+
+/// What the broker answers; what is wrong with the question is an answer too.
+cim::Answer execute(const RequestMessage& message, Broker& broker);
+
+} // namespace cimhost::serve
+
+#endif

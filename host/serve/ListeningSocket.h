@@ -1,0 +1,40 @@
+/// \file
+#ifndef CIMHOST_SERVE_LISTENINGSOCKET_H
+#define CIMHOST_SERVE_LISTENINGSOCKET_H
+
+#include <cstdint>
+#include <stdexcept>
+#include <string>
+
+namespace cimhost::serve {
+
+/// Where a server is to be found.
+struct Endpoint
+{
+    std::string address;    ///< IPv4 or IPv6, in numbers
+    std::uint16_t port = 0; ///< 0: any that is free
+};
+
+/// It cannot be listened there; what() says where and why.
+class ListenError : public std::runtime_error
+{
+public:
+    using std::runtime_error::runtime_error;
+};
+
+/// A socket that waits for connections, and where it does.
+struct ListeningSocket
+{
+    int descriptor; ///< the caller's to close
+    Endpoint endpoint;
+};
+
+/// \throws ListenError
+ListeningSocket listenAt(const Endpoint& endpoint);
+
+/// As in a URL: `127.0.0.1:5988`, `[::1]:5988`.
+std::string textOf(const Endpoint& endpoint);
+
+} // namespace cimhost::serve
+
+#endif

@@ -1,0 +1,189 @@
+#include "serve/ResponseWriter.h"
+
+#include "cim/Values.h"
+#include "cim/tests/Print.h"
+#include "serve/Dtd.h"
+#include "serve/ValueReader.h"
+#include "serve/ValueWriter.h"
+#include "serve/Xml.h"
+
+#include <cmath>
+#include <string>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+using namespace cimhost;
+using namespace cimhost::serve;
+using testing::HasSubstr;
+using testing::Not;
+
+namespace {
+
+RequestMessage requestOf(Operation operation)
+{
+    OperationRequest request;
+    request.operation = operation;
+    return {"7 & \"8\"", "1.0", "Method", true, "root/cimv2", request};
+}
+
+/// What stands inside of the response's method.
+std::string bodyOf(Operation operation, const cim::Answer& answer)
+{
+    const std::string document = writeResponse(requestOf(operation), answer, "here");
+    const std::string before =
+        "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\">"
+        "<MESSAGE ID=\"7 &amp; &quot;8&quot;\" PROTOCOLVERSION=\"1.0\"><SIMPLERSP><IMETHODRESPONSE NAME=\"Method\">";
+    const std::string after = "</IMETHODRESPONSE></SIMPLERSP></MESSAGE></CIM>";
+    EXPECT_EQ(document.substr(0, before.size()), before);
+    EXPECT_EQ(document.substr(document.size() - after.size()), after);
+    return document.substr(before.size(), document.size() - before.size() - after.size());
+}
+
+std::string instanceText(const cim::Instance& instance)
+{
+    XmlWriter xml;
+    writeInstance(xml, instance);
+    return xml.document();
+}
+
+const cim::ObjectPath path{"", "root/cimv2", "CIM_A", {{"Name", cim::textValue("<a> & \"b\"")}}};
+const cim::Instance instance{path, {{"Size", cim::unsignedValue(3, CMPI_uint16)}}};
+const std::string nameXml =
+    "<INSTANCENAME CLASSNAME=\"CIM_A\"><KEYBINDING NAME=\"Name\"><KEYVALUE VALUETYPE=\"string\">"
+    "&lt;a&gt; &amp; &quot;b&quot;</KEYVALUE></KEYBINDING></INSTANCENAME>";
+const std::string instanceXml =
+    "<INSTANCE CLASSNAME=\"CIM_A\"><PROPERTY NAME=\"Size\" TYPE=\"uint16\"><VALUE>3</VALUE>"
+    "</PROPERTY></INSTANCE>";
+const std::string pathXml =
+    "<INSTANCEPATH><NAMESPACEPATH><HOST>here</HOST><LOCALNAMESPACEPATH><NAMESPACE NAME=\"root\">"
+    "</NAMESPACE><NAMESPACE NAME=\"cimv2\"></NAMESPACE></LOCALNAMESPACEPATH></NAMESPACEPATH>" +
+    nameXml + "</INSTANCEPATH>";
+
+TEST(ResponseWriter, givesEachOperationItsForm)
+{
+    const cim::Answer paths{{}, {path}, {}};
+    const cim::Answer instances{{}, {}, {instance}};
+    const auto returned = [](const std::string& value) {
+        return "<IRETURNVALUE>" + value + "</IRETURNVALUE>";
+    };
+    EXPECT_EQ(bodyOf(Operation::enumerateInstanceNames, paths), returned(nameXml));
+    EXPECT_EQ(bodyOf(Operation::createInstance, paths), returned(nameXml));
+    EXPECT_EQ(bodyOf(Operation::enumerateInstances, instances),
+              returned("<VALUE.NAMEDINSTANCE>" + nameXml + instanceXml + "</VALUE.NAMEDINSTANCE>"));
+    EXPECT_EQ(bodyOf(Operation::getInstance, instances), returned(instanceXml));
+    EXPECT_EQ(bodyOf(Operation::execQuery, instances),
+              returned("<VALUE.OBJECT>" + instanceXml + "</VALUE.OBJECT>"));
+    for (const Operation operation : {Operation::associators, Operation::references})
+        EXPECT_EQ(bodyOf(operation, instances),
+                  returned("<VALUE.OBJECTWITHPATH>" + pathXml + instanceXml + "</VALUE.OBJECTWITHPATH>"));
+    for (const Operation operation : {Operation::associatorNames, Operation::referenceNames})
+        EXPECT_EQ(bodyOf(operation, paths), returned("<OBJECTPATH>" + pathXml + "</OBJECTPATH>"));
+    EXPECT_EQ(bodyOf(Operation::modifyInstance, {}), "");
+    EXPECT_EQ(bodyOf(Operation::deleteInstance, {}), "");
+    EXPECT_EQ(bodyOf(Operation::associators, {}), returned(""));
+}
+
+TEST(ResponseWriter, namesTheHostThatThePathNames)
+{
+    cim::ObjectPath elsewhere = path;
+    elsewhere.host = "srv";
+    elsewhere.nameSpace = "";
+    const std::string body = bodyOf(Operation::associatorNames, {{}, {elsewhere}, {}});
+    EXPECT_THAT(body, HasSubstr("<HOST>srv</HOST>"));
+    EXPECT_THAT(body, HasSubstr("<NAMESPACE NAME=\"cimv2\">")) << "without a namespace it is the request's";
+}
+
+/// What stands in the response after an error that came behind a result.
+std::string errorOf(CMPIrc code, const char* message)
+{
+    cim::Answer answer;
+    answer.status.code = code;
+    if (message != nullptr)
+        answer.status.message = message;
+    answer.paths.push_back(path);
+    return bodyOf(Operation::enumerateInstanceNames, answer);
+}
+
+TEST(ResponseWriter, sendsTheErrorOnly)
+{
+    EXPECT_EQ(errorOf(CMPI_RC_ERR_FAILED, "a \"b\" <c> \x1b \xff"),
+              "<ERROR CODE=\"1\" DESCRIPTION=\"a &quot;b&quot; &lt;c&gt; \ufffd \ufffd\"></ERROR>");
+    EXPECT_EQ(errorOf(CMPI_RC_ERR_METHOD_NOT_FOUND, nullptr), "<ERROR CODE=\"17\"></ERROR>");
+    EXPECT_EQ(errorOf(CMPI_RC_ERROR_SYSTEM, nullptr),
+              "<ERROR CODE=\"1\" DESCRIPTION=\"CMPI_RC_ERROR_SYSTEM\"></ERROR>");
+}
+
+TEST(ResponseWriter, answersMethodsOfClassesInTheirOwnElement)
+{
+    const RequestMessage message{"1",   "1.0", "Reset",
+                                 false, "a",   cim::Status{CMPI_RC_ERR_NOT_SUPPORTED, "no"}};
+    EXPECT_THAT(
+        writeResponse(message, {{CMPI_RC_ERR_NOT_SUPPORTED, "no"}, {}, {}}, "here"),
+        HasSubstr(
+            "<METHODRESPONSE NAME=\"Reset\"><ERROR CODE=\"7\" DESCRIPTION=\"no\"></ERROR></METHODRESPONSE>"));
+}
+
+TEST(ResponseWriter, failsForWhatHasNoForm)
+{
+    for (const cim::Value& key :
+         {cim::nullValue(CMPI_string), cim::arrayValue(CMPI_uint8, {}), cim::instanceValue(instance)}) {
+        const cim::Answer answer{{}, {{"", "", "CIM_A", {{"K", key}}}}, {}};
+        const std::string body = bodyOf(Operation::enumerateInstanceNames, answer);
+        EXPECT_THAT(
+            body, HasSubstr("<ERROR CODE=\"1\" DESCRIPTION=\"the provider returned the key K of the type "));
+        EXPECT_THAT(body, Not(HasSubstr("IRETURNVALUE")));
+    }
+    const cim::Instance refs{
+        path, {{"P", cim::arrayValue(CMPI_ref, {std::make_shared<const cim::ObjectPath>(path)})}}};
+    EXPECT_THAT(bodyOf(Operation::getInstance, {{}, {}, {refs}}), HasSubstr("an array of references"));
+}
+
+TEST(ValueWriter, writesNumbersThatAreNone)
+{
+    const auto text = [](double number) {
+        return instanceText({{"", "", "A", {}}, {{"P", cim::realValue(number)}}});
+    };
+    EXPECT_THAT(text(NAN), HasSubstr("<VALUE>NaN</VALUE>"));
+    EXPECT_THAT(text(INFINITY), HasSubstr("<VALUE>INF</VALUE>"));
+    EXPECT_THAT(text(-INFINITY), HasSubstr("<VALUE>-INF</VALUE>"));
+}
+
+TEST(ValueWriter, writesAnEmptyTextWithAnEndTag)
+{
+    EXPECT_THAT(instanceText({{"", "", "A", {}}, {{"P", cim::textValue("")}}}), HasSubstr("<VALUE></VALUE>"));
+}
+
+TEST(ValueWriter, writesWhatTheReaderReads)
+{
+    cim::ObjectPath far{"srv", "root/b", "CIM_B", {}};
+    far.keys = {{"Text", cim::textValue("  \r\n\t<&>\"'\u98a8\U0001F300 ")},
+                {"Flag", cim::booleanValue(true)},
+                {"Number", cim::signedValue(-5, CMPI_sint16)},
+                {"Real", cim::realValue(0.1)},
+                {"Time", cim::textValue("20260101000000.000000+000", CMPI_dateTime)},
+                {"Char", cim::unsignedValue(0x98a8, CMPI_char16)},
+                {"Near", cim::referenceValue({"", "", "CIM_C", {{"K", cim::unsignedValue(1, CMPI_uint8)}}})}};
+    cim::ObjectPath local = far;
+    local.host = "";
+    const cim::Instance inner{{"", "", "CIM_D", {}}, {{"P", cim::textValue("]]> <x/>")}}};
+    const cim::Instance whole{
+        {"", "", "CIM_A", {}},
+        {{"Far", cim::referenceValue(far)},
+         {"Local", cim::referenceValue(local)},
+         {"NullRef", cim::nullValue(CMPI_ref)},
+         {"Null", cim::nullValue(CMPI_uint32)},
+         {"NullArray", cim::nullValue(CMPI_stringA)},
+         {"Empty", cim::arrayValue(CMPI_string, {})},
+         {"List", cim::arrayValue(CMPI_string, {std::string(" a "), std::monostate(), std::string()})},
+         {"Least", cim::signedValue(INT64_MIN)},
+         {"Most", cim::unsignedValue(UINT64_MAX)},
+         {"Embedded", cim::instanceValue(inner)}}};
+    const cim::Instance read = readInstance(parseXml(instanceText(whole), {}, &isKnownElement), {});
+    ASSERT_EQ(read.properties.size(), whole.properties.size());
+    for (std::size_t i = 0; i < whole.properties.size(); ++i)
+        EXPECT_EQ(read.properties[i].value, whole.properties[i].value) << whole.properties[i].name;
+    EXPECT_TRUE(read == whole);
+}
+
+} // namespace

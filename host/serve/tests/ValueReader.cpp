@@ -1,0 +1,224 @@
+#include "serve/ValueReader.h"
+
+#include "cim/Values.h"
+#include "cim/tests/Print.h"
+#include "serve/Dtd.h"
+#include "serve/Fault.h"
+
+#include <string>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+using namespace cimhost;
+using namespace cimhost::serve;
+using testing::HasSubstr;
+
+namespace {
+
+Element parse(const std::string& document)
+{
+    return parseXml(document, {}, &isKnownElement);
+}
+
+/// The one key of an INSTANCENAME.
+cim::Value keyOf(const std::string& value)
+{
+    const cim::ObjectPath path =
+        readInstanceName(parse("<INSTANCENAME CLASSNAME=\"CIM_A\"><KEYBINDING NAME=\"K\">" + value +
+                               "</KEYBINDING></INSTANCENAME>"));
+    return path.keys.at(0).value;
+}
+
+/// The one property of an INSTANCE.
+cim::Value propertyOf(const std::string& property)
+{
+    return readInstance(parse("<INSTANCE CLASSNAME=\"CIM_A\">" + property + "</INSTANCE>"), {})
+        .properties.at(0)
+        .value;
+}
+
+cim::Value scalarOf(const std::string& type, const std::string& text)
+{
+    return propertyOf("<PROPERTY NAME=\"P\" TYPE=\"" + type + "\"><VALUE>" + text + "</VALUE></PROPERTY>");
+}
+
+/// The message of the error that reading ends in. Empty: it does not.
+template <class Error = ValueError, class Read>
+std::string errorOf(const Read& read)
+{
+    try {
+        read();
+        return "";
+    } catch (const Error& error) {
+        return error.what();
+    }
+}
+
+TEST(KeyReader, readsTheTypesThatKeysHave)
+{
+    EXPECT_EQ(keyOf("<KEYVALUE> a </KEYVALUE>"), cim::textValue(" a "));
+    EXPECT_EQ(keyOf("<KEYVALUE/>"), cim::textValue(""));
+    EXPECT_EQ(keyOf("<KEYVALUE VALUETYPE=\"string\">42</KEYVALUE>"), cim::textValue("42"));
+    EXPECT_EQ(keyOf("<KEYVALUE VALUETYPE=\"boolean\">True</KEYVALUE>"), cim::booleanValue(true));
+    EXPECT_EQ(keyOf("<KEYVALUE VALUETYPE=\"numeric\">42</KEYVALUE>"), cim::unsignedValue(42));
+    EXPECT_EQ(keyOf("<KEYVALUE VALUETYPE=\"numeric\"> -42 </KEYVALUE>"), cim::signedValue(-42));
+    EXPECT_EQ(keyOf("<KEYVALUE VALUETYPE=\"numeric\">0x2A</KEYVALUE>"), cim::unsignedValue(42));
+    EXPECT_EQ(keyOf("<KEYVALUE VALUETYPE=\"numeric\">-0X2a</KEYVALUE>"), cim::signedValue(-42));
+    EXPECT_EQ(keyOf("<KEYVALUE VALUETYPE=\"numeric\">1.5e1</KEYVALUE>"), cim::realValue(15));
+    EXPECT_EQ(keyOf("<KEYVALUE VALUETYPE=\"numeric\" TYPE=\"uint16\">42</KEYVALUE>"),
+              cim::unsignedValue(42, CMPI_uint16));
+    EXPECT_EQ(keyOf("<KEYVALUE TYPE=\"datetime\">20260101000000.000000+000</KEYVALUE>"),
+              cim::textValue("20260101000000.000000+000", CMPI_dateTime));
+}
+
+TEST(KeyReader, refusesWhatIsNoSuchValue)
+{
+    for (const char* number :
+         {"", "x", "1x", "0x", "0xg", "--1", "+-1", "1.2.3", "18446744073709551616", "-9223372036854775809",
+          "0x10000000000000000", "nan", "nan(e)", "inf", "1e999"})
+        EXPECT_THAT(
+            errorOf([&] { keyOf(std::string("<KEYVALUE VALUETYPE=\"numeric\">") + number + "</KEYVALUE>"); }),
+            HasSubstr("expected a number of 64 bits"))
+            << number;
+    EXPECT_THAT(errorOf([] { keyOf("<KEYVALUE VALUETYPE=\"boolean\">1</KEYVALUE>"); }), HasSubstr("boolean"));
+    EXPECT_THAT(errorOf<RequestError>([] { keyOf("<KEYVALUE VALUETYPE=\"text\"/>"); }),
+                HasSubstr("expected string, boolean or numeric"));
+    EXPECT_THAT(errorOf<RequestError>([] { keyOf("<KEYVALUE TYPE=\"int\"/>"); }),
+                HasSubstr("one of CIM's types"));
+    EXPECT_THAT(errorOf<RequestError>([] { keyOf("<KEYVALUE><VALUE/></KEYVALUE>"); }),
+                HasSubstr("text only"));
+    EXPECT_THAT(errorOf<RequestError>([] { keyOf(""); }), HasSubstr("expected KEYVALUE or VALUE.REFERENCE"));
+}
+
+TEST(KeyReader, refusesKeysThatRepeatOrHaveNoName)
+{
+    const std::string key = "<KEYBINDING NAME=\"K\"><KEYVALUE/></KEYBINDING>";
+    EXPECT_THAT(errorOf([&] {
+                    readInstanceName(parse("<INSTANCENAME CLASSNAME=\"C\">" + key + key + "</INSTANCENAME>"));
+                }),
+                HasSubstr("found the key K again, expected each key once"));
+    EXPECT_THAT(errorOf([&] {
+                    readInstanceName(
+                        parse("<INSTANCENAME CLASSNAME=\"C\"><KEYVALUE>a</KEYVALUE></INSTANCENAME>"));
+                }),
+                HasSubstr("found a key without its name, expected KEYBINDING"));
+}
+
+TEST(ReferenceReader, readsPathsOfEveryLength)
+{
+    const std::string name = "<INSTANCENAME CLASSNAME=\"CIM_B\"/>";
+    const std::string nameSpace =
+        "<LOCALNAMESPACEPATH><NAMESPACE NAME=\"root\"/><NAMESPACE NAME=\"b\"/></LOCALNAMESPACEPATH>";
+    const std::string place = "<NAMESPACEPATH><HOST>srv</HOST>" + nameSpace + "</NAMESPACEPATH>";
+    const auto reference = [](const std::string& path) {
+        return keyOf("<VALUE.REFERENCE>" + path + "</VALUE.REFERENCE>");
+    };
+    EXPECT_EQ(reference(name), cim::referenceValue({"", "", "CIM_B", {}}));
+    EXPECT_EQ(reference("<LOCALINSTANCEPATH>" + nameSpace + name + "</LOCALINSTANCEPATH>"),
+              cim::referenceValue({"", "root/b", "CIM_B", {}}));
+    EXPECT_EQ(reference("<INSTANCEPATH>" + place + name + "</INSTANCEPATH>"),
+              cim::referenceValue({"srv", "root/b", "CIM_B", {}}));
+    const std::string className = "<CLASSNAME NAME=\"CIM_B\"/>";
+    EXPECT_EQ(reference(className), cim::referenceValue({"", "", "CIM_B", {}}));
+    EXPECT_EQ(reference("<LOCALCLASSPATH>" + nameSpace + className + "</LOCALCLASSPATH>"),
+              cim::referenceValue({"", "root/b", "CIM_B", {}}));
+    EXPECT_EQ(reference("<CLASSPATH>" + place + className + "</CLASSPATH>"),
+              cim::referenceValue({"srv", "root/b", "CIM_B", {}}));
+    EXPECT_THAT(
+        errorOf<RequestError>([&] { reference("<INSTANCEPATH>" + name + place + "</INSTANCEPATH>"); }),
+        HasSubstr("found this element in INSTANCEPATH, expected NAMESPACEPATH"));
+}
+
+TEST(PropertyReader, readsEveryType)
+{
+    EXPECT_EQ(scalarOf("string", "a"), cim::textValue("a"));
+    EXPECT_EQ(scalarOf("boolean", "FALSE"), cim::booleanValue(false));
+    EXPECT_EQ(scalarOf("char16", "\u98a8"), cim::unsignedValue(0x98a8, CMPI_char16));
+    EXPECT_EQ(scalarOf("real32", "2"), cim::realValue(2, CMPI_real32));
+    EXPECT_EQ(scalarOf("real64", "-1.5"), cim::realValue(-1.5));
+    EXPECT_EQ(scalarOf("sint8", "-128"), cim::signedValue(-128, CMPI_sint8));
+    EXPECT_EQ(scalarOf("sint64", "9223372036854775807"), cim::signedValue(INT64_MAX));
+    EXPECT_EQ(scalarOf("uint64", "18446744073709551615"), cim::unsignedValue(UINT64_MAX));
+    EXPECT_EQ(scalarOf("datetime", "00000001000000.000000:000"),
+              cim::textValue("00000001000000.000000:000", CMPI_dateTime));
+}
+
+TEST(PropertyReader, refusesValuesOutsideOfTheType)
+{
+    const struct
+    {
+        const char* type;
+        const char* text;
+    } wrong[] = {{"uint8", "256"},
+                 {"uint8", "-1"},
+                 {"uint16", "65536"},
+                 {"uint32", "1.0"},
+                 {"sint8", "128"},
+                 {"sint8", "-129"},
+                 {"sint64", "9223372036854775808"},
+                 {"boolean", "maybe"},
+                 {"char16", ""},
+                 {"char16", "ab"},
+                 {"char16", "\U0001F300"},
+                 {"datetime", "now"},
+                 {"real64", "x"}};
+    for (const auto& entry : wrong)
+        EXPECT_THAT(errorOf([&] { scalarOf(entry.type, entry.text); }),
+                    HasSubstr(std::string("expected a value of the type ") + entry.type))
+            << entry.type << ' ' << entry.text;
+}
+
+TEST(PropertyReader, readsNullsArraysAndReferences)
+{
+    EXPECT_EQ(propertyOf("<PROPERTY NAME=\"P\" TYPE=\"uint8\"/>"), cim::nullValue(CMPI_uint8));
+    EXPECT_EQ(propertyOf("<PROPERTY.ARRAY NAME=\"P\" TYPE=\"uint8\"/>"), cim::nullValue(CMPI_uint8A));
+    EXPECT_EQ(propertyOf("<PROPERTY.ARRAY NAME=\"P\" TYPE=\"uint8\"><QUALIFIER/><VALUE.ARRAY><VALUE>1</VALUE>"
+                         "<VALUE.NULL/></VALUE.ARRAY></PROPERTY.ARRAY>"),
+              cim::arrayValue(CMPI_uint8, {std::uint64_t{1}, std::monostate()}));
+    EXPECT_EQ(propertyOf("<PROPERTY.REFERENCE NAME=\"P\"><VALUE.REFERENCE><INSTANCENAME CLASSNAME=\"B\"/>"
+                         "</VALUE.REFERENCE></PROPERTY.REFERENCE>"),
+              cim::referenceValue({"", "", "B", {}}));
+    EXPECT_EQ(propertyOf("<PROPERTY.REFERENCE NAME=\"P\"/>"), cim::nullValue(CMPI_ref));
+    EXPECT_THAT(errorOf<RequestError>(
+                    [] { propertyOf("<PROPERTY NAME=\"P\" TYPE=\"uint8\"><VALUE.ARRAY/></PROPERTY>"); }),
+                HasSubstr("expected one VALUE"));
+    EXPECT_THAT(errorOf<RequestError>([] { propertyOf("<PROPERTY NAME=\"P\"/>"); }),
+                HasSubstr("no attribute TYPE"));
+    EXPECT_THAT(errorOf([] {
+                    propertyOf("<PROPERTY NAME=\"P\" TYPE=\"uint8\"/><PROPERTY NAME=\"p\" TYPE=\"uint8\"/>");
+                }),
+                HasSubstr("found the property p again"));
+}
+
+TEST(PropertyReader, readsEmbeddedInstances)
+{
+    const auto embedded = [](const std::string& text) {
+        return propertyOf("<PROPERTY NAME=\"P\" TYPE=\"string\" EmbeddedObject=\"instance\"><VALUE>" + text +
+                          "</VALUE></PROPERTY>");
+    };
+    EXPECT_EQ(embedded("<![CDATA[<INSTANCE CLASSNAME=\"B\"/>]]>"),
+              cim::instanceValue({{"", "", "B", {}}, {}}));
+    EXPECT_EQ(embedded("&lt;INSTANCE CLASSNAME=\"B\"/&gt;"), cim::instanceValue({{"", "", "B", {}}, {}}));
+    EXPECT_THAT(errorOf([&] { embedded("B"); }), HasSubstr("text that is no embedded instance"));
+    EXPECT_THAT(errorOf([&] { embedded("&lt;CLASS/&gt;"); }), HasSubstr("expected an embedded INSTANCE"));
+}
+
+TEST(PropertyReader, boundsInstancesEmbeddedInEachOther)
+{
+    std::string document = "<INSTANCE CLASSNAME=\"B\"/>";
+    const auto escaped = [](const std::string& text) {
+        std::string result;
+        for (const char byte : text)
+            result += byte == '<' ? "&lt;" : byte == '&' ? "&amp;" : std::string(1, byte);
+        return result;
+    };
+    for (int depth = 0; depth < 6; ++depth)
+        document =
+            "<INSTANCE CLASSNAME=\"B\"><PROPERTY NAME=\"P\" TYPE=\"string\" EmbeddedObject=\"instance\"><VALUE>" +
+            escaped(document) + "</VALUE></PROPERTY></INSTANCE>";
+    EXPECT_EQ(errorOf([&] { readInstance(parse(document), {10, 100}); }), "");
+    EXPECT_THAT(errorOf([&] { readInstance(parse(document), {6, 100}); }), HasSubstr("deep in each other"));
+}
+
+} // namespace
