@@ -33,7 +33,8 @@ int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size)
             Fuzz::require(!notice->text.empty(), "a notice has a text");
         } else {
             const cli::Command& command = std::get<cli::Invocation>(read).command;
-            Fuzz::require(command.operation == cli::Operation::graph || !command.target.className.empty(),
+            const auto* const ask = std::get_if<cli::Ask>(&command);
+            Fuzz::require(ask == nullptr || !ask->request.target.className.empty(),
                           "a request names a class");
         }
     } catch (const cli::UsageError& error) {
