@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cctype>
 #include <cstddef>
+#include <utility>
 
 using MadeInventory::Node;
 
@@ -34,6 +35,23 @@ rc::Gen<unsigned int> numbers(unsigned int beyondTheLast)
 {
     return gen::oneOf(gen::inRange(0U, beyondTheLast), gen::inRange(0x10000U, 0x10000U + beyondTheLast),
                       gen::arbitrary<unsigned int>(), gen::element(0x7FFFFFFFU, 0x80000000U, 0xFFFFFFFFU));
+}
+
+/// Description and path.
+using Place = std::pair<std::string, std::string>;
+
+/// Nodes at one of the places, with blanks around that make no difference.
+rc::Gen<Node> nodesAt(const std::vector<Place>& places)
+{
+    const auto kinds =
+        gen::weightedOneOf<unsigned int>({{9, gen::just(indicatorKind)}, {1, gen::inRange(0U, 60U)}});
+    const auto blanks = gen::element<std::string>("", " ", "  ");
+    const auto node = [](const Place& place, const std::string& before, const std::string& after,
+                         unsigned int status, std::optional<unsigned int> alarmState, unsigned int kind) {
+        return Node{before + place.first, place.second + after, status, alarmState, kind};
+    };
+    return gen::apply(node, gen::elementOf(places), blanks, blanks, Generators::statuses(),
+                      Generators::alarmStates(), kinds);
 }
 
 std::string inOtherCase(std::string name)
@@ -70,13 +88,11 @@ rc::Gen<std::optional<unsigned int>> alarmStates()
 
 rc::Gen<std::vector<Node>> inventories()
 {
-    const auto kinds =
-        gen::weightedOneOf<unsigned int>({{9, gen::just(indicatorKind)}, {1, gen::inRange(0U, 60U)}});
-    const auto nodes =
-        gen::build<Node>(gen::set(&Node::description, texts()), gen::set(&Node::path, texts()),
-                         gen::set(&Node::status, statuses()), gen::set(&Node::alarmState, alarmStates()),
-                         gen::set(&Node::kind, kinds));
-    return gen::scale(0.25, gen::container<std::vector<Node>>(nodes));
+    const auto places =
+        gen::nonEmpty(gen::scale(0.1, gen::container<std::vector<Place>>(gen::pair(texts(), texts()))));
+    return gen::mapcat(places, [](const std::vector<Place>& some) {
+        return gen::scale(0.25, gen::container<std::vector<Node>>(nodesAt(some)));
+    });
 }
 
 rc::Gen<std::vector<std::string>> computerSystems()

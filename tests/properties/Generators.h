@@ -30,7 +30,7 @@ rc::Gen<std::string> texts();
 rc::Gen<unsigned int> statuses();
 rc::Gen<std::optional<unsigned int>> alarmStates();
 
-/// Indicators and nodes of other kinds.
+/// Indicators and nodes of other kinds, several of them at one place.
 rc::Gen<std::vector<MadeInventory::Node>> inventories();
 
 /// Names of computer systems, each once; also none.
