@@ -8,6 +8,7 @@
 #include "testing/WithoutPrivileges.h"
 
 #include <algorithm>
+#include <array>
 #include <atomic>
 #include <filesystem>
 #include <iterator>
@@ -20,7 +21,9 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <fcntl.h>
 #include <sys/stat.h>
+#include <unistd.h>
 
 namespace {
 
@@ -355,6 +358,20 @@ TEST_F(Sysfs, whatMayNotBeReadIsUnknown)
     }
     EXPECT_THAT(found, ElementsAre(std::make_pair(0U, unknown), std::make_pair(0U, unknown),
                                    std::make_pair(1U, unknown)));
+}
+
+TEST_F(Sysfs, nothingIsTakenOutOfAPipe)
+{
+    addLed("led");
+    const std::string pipe = tree.path("devices/led/brightness");
+    fs::remove(pipe);
+    ASSERT_EQ(mkfifo(pipe.c_str(), 0600), 0);
+    const int end = open(pipe.c_str(), O_RDWR | O_NONBLOCK | O_CLOEXEC);
+    ASSERT_EQ(write(end, "1\n", 2), 2);
+    EXPECT_EQ(states(), std::make_pair(0U, unknown));
+    std::array<char, 3> left{};
+    EXPECT_EQ(read(end, left.data(), left.size()), 2);
+    close(end);
 }
 
 TEST_F(Sysfs, noDescriptorStaysOpen)
