@@ -1,81 +1,150 @@
 #include "Log.h"
 
-#include "DescriptorSink.h"
+#include "DatagramSink.h"
+#include "Escape.h"
+#include "FileSink.h"
+#include "Formatters.h"
 #include "Settings.h"
+#include "StandardErrorSink.h"
 
-#include <atomic>
+#include <cstdlib>
 #include <limits>
 #include <memory>
 #include <mutex>
+#include <utility>
+#include <vector>
 
 #include <spdlog/fmt/fmt.h>
-#include <spdlog/logger.h>
 
 namespace MVLog {
 namespace {
 
-constexpr int notRead = std::numeric_limits<int>::min();
+constexpr std::int64_t notRead = std::numeric_limits<std::int64_t>::min();
+constexpr int flowLevel = 3000;
+constexpr int errorLevel = 6000;
 
-// All three are set up at compile time and need no destructor, so that objects constructed earlier or
-// destroyed later than anything of this library can log.
-std::atomic<int> leastLevel{notRead};
-std::mutex access; ///< guards `logger`
-spdlog::logger* logger = nullptr;
-
-std::shared_ptr<DescriptorSink> openSink(Settings& settings)
+const char* orUnknown(const char* text)
 {
-    if (settings.file.empty())
-        return std::make_shared<DescriptorSink>();
-    try {
-        return std::make_shared<DescriptorSink>(settings.file);
-    } catch (const spdlog::spdlog_ex& error) {
-        settings.complaints.push_back("MVLOG_FILE: " + std::string(error.what()) +
-                                      ", expected a file to append to; taking standard error");
-        return std::make_shared<DescriptorSink>();
-    }
+    return text == nullptr ? "?" : text;
 }
 
-/// One line stays one line, and a terminal is sent no commands.
-std::string withControlCharactersEscaped(const std::string& text)
+spdlog::level::level_enum severityOf(int level)
 {
-    std::string escaped;
-    escaped.reserve(text.size());
-    for (const char character : text) {
-        const auto code = static_cast<unsigned char>(character);
-        if (code < 0x20 || code == 0x7F)
-            escaped += fmt::format("\\x{:02X}", code);
-        else
-            escaped += character;
-    }
-    return escaped;
+    if (level >= errorLevel)
+        return spdlog::level::err;
+    return level > flowLevel ? spdlog::level::info : spdlog::level::debug;
+}
+
+/// Hands a line to a sink. \throw spdlog::spdlog_ex when it cannot be written
+void log(spdlog::sinks::sink& sink, const char* channel, const Line& line)
+{
+    const std::string text = withControlCharactersEscaped(
+        fmt::format("{} {} {} {}() {}:{}: {}", line.level, channel, line.category, orUnknown(line.function),
+                    orUnknown(line.file), line.line, line.text));
+    sink.log({{orUnknown(line.file), line.line, orUnknown(line.function)},
+              line.category,
+              severityOf(line.level),
+              text});
 }
 
 /// Says on standard error what is wrong with the log itself.
 void complain(const std::string& complaint)
 {
-    spdlog::logger("mvlog", std::make_shared<DescriptorSink>()).warn(withControlCharactersEscaped(complaint));
+    StandardErrorSink sink;
+    sink.set_formatter(lineFormatter());
+    try {
+        log(sink, "log", {"complain", "Log.cpp", __LINE__, "MVLog", errorLevel, complaint});
+    } catch (const spdlog::spdlog_ex&) {
+        // There is nobody left to tell.
+    }
 }
 
-std::unique_ptr<spdlog::logger> openLogger(Settings& settings)
+/// A sink, and whether anybody was told yet that it fails.
+class Destination
 {
-    auto opened = std::make_unique<spdlog::logger>("mvlog", openSink(settings));
-    opened->set_pattern("%Y-%m-%dT%H:%M:%S.%e%z [%P:%t] %v");
-    opened->set_error_handler([hasComplained = false](const std::string& reason) mutable {
-        if (!hasComplained)
-            complain("a log line is lost: " + reason);
-        hasComplained = true;
-    });
-    return opened;
+public:
+    explicit Destination(std::shared_ptr<spdlog::sinks::sink> sink) : sink_(std::move(sink)) {}
+
+    /// The first failure is complained of.
+    void write(const char* channel, const Line& line)
+    {
+        try {
+            log(*sink_, channel, line);
+        } catch (const spdlog::spdlog_ex& error) {
+            if (!std::exchange(hasComplained_, true))
+                complain(error.what());
+        }
+    }
+
+private:
+    std::shared_ptr<spdlog::sinks::sink> sink_;
+    bool hasComplained_ = false;
+};
+
+std::shared_ptr<spdlog::sinks::sink> withFormatter(std::shared_ptr<spdlog::sinks::sink> sink)
+{
+    sink->set_formatter(lineFormatter());
+    return sink;
 }
+
+/// \throw spdlog::spdlog_ex
+std::shared_ptr<spdlog::sinks::sink> open(const Output& output)
+{
+    switch (output.kind) {
+    case Output::file:
+        return withFormatter(std::make_shared<FileSink>(output.path));
+    case Output::syslog:
+        return std::make_shared<DatagramSink>(output.path, syslogFormatter());
+    case Output::journal:
+        return std::make_shared<DatagramSink>(output.path, journalFormatter());
+    default:
+        return withFormatter(std::make_shared<StandardErrorSink>());
+    }
+}
+
+std::shared_ptr<Destination> openOrStandardError(const Output& output, std::vector<std::string>& complaints)
+{
+    try {
+        return std::make_shared<Destination>(open(output));
+    } catch (const spdlog::spdlog_ex& error) {
+        const char* const expected =
+            output.kind == Output::file ? "a file to append to" : "a log daemon's socket";
+        complaints.push_back(std::string(output.variable) + ": " + error.what() + ", expected " + expected +
+                             "; taking standard error");
+        return std::make_shared<Destination>(open(Output{}));
+    }
+}
+
+/// What the settings come to.
+struct Log
+{
+    std::array<std::shared_ptr<Destination>, 2> destinations; ///< by channel, often one for both; null: off
+    std::vector<std::string> categories;
+};
+
+std::mutex access; ///< guards the next two
+Log* theLog = nullptr;
 
 /// Opens the log unless it is open. Needs `access`.
 void open()
 {
-    if (logger != nullptr)
+    if (theLog != nullptr)
         return;
-    Settings settings = readSettings();
-    logger = openLogger(settings).release();
-    leastLevel = settings.leastLevel;
+    Settings settings = readSettings([](const char* name) { return std::getenv(name); });
+    auto opened = std::make_unique<Log>();
+    opened->categories = std::move(settings.categories);
+
+    auto& [log, trace] = opened->destinations;
+    if (settings.log.leastLevel != off)
+        log = openOrStandardError(settings.log.output, settings.complaints);
+    if (settings.trace.leastLevel != off)
+        trace = log != nullptr && settings.trace.output == settings.log.output
+                    ? log
+                    : openOrStandardError(settings.trace.output, settings.complaints);
+
+    theLog = opened.release();
+    leastLevels[0] = settings.log.leastLevel;
+    leastLevels[1] = settings.trace.leastLevel;
     for (const std::string& complaint : settings.complaints)
         complain(complaint);
 }
@@ -85,32 +154,21 @@ void open()
 [[gnu::destructor]] void close()
 {
     const std::lock_guard<std::mutex> guard(access);
-    delete logger;
-    logger = nullptr;
-}
-
-const char* orUnknown(const char* text)
-{
-    return text == nullptr ? "?" : text;
-}
-
-std::string format(const Line& line)
-{
-    return withControlCharactersEscaped(fmt::format("{} {} {} {}() {}:{}: {}", line.level, line.channel,
-                                                    line.category, orUnknown(line.function),
-                                                    orUnknown(line.file), line.line, line.text));
+    delete theLog;
+    theLog = nullptr;
 }
 
 } // namespace
 
-void write(const Line& line)
+std::array<std::atomic<std::int64_t>, 2> leastLevels{notRead, notRead};
+
+void writeUnlessDropped(Channel channel, const Line& line)
 {
-    if (line.level < leastLevel.load(std::memory_order_relaxed))
-        return;
+    const auto number = static_cast<std::size_t>(channel);
     const std::lock_guard<std::mutex> guard(access);
     open();
-    if (line.level >= leastLevel)
-        logger->info(format(line));
+    if (line.level >= leastLevels[number] && isWanted(theLog->categories, line.category))
+        theLog->destinations[number]->write(channel == Channel::log ? "log" : "trace", line);
 }
 
 } // namespace MVLog

@@ -1,15 +1,7 @@
-#include <MVLog/MVLogger.h>
-
-#include "testing/Environment.h"
-#include "testing/TemporaryDirectory.h"
+#include "LoggerTest.h"
 
 #include <algorithm>
-#include <cstdio>
-#include <cstdlib>
-#include <functional>
 #include <limits>
-#include <optional>
-#include <sstream>
 #include <string>
 #include <thread>
 #include <type_traits>
@@ -19,7 +11,6 @@
 #include <gtest/gtest.h>
 
 #include <sys/stat.h>
-#include <sys/wait.h>
 #include <unistd.h>
 
 namespace {
@@ -27,8 +18,6 @@ namespace {
 using namespace std::string_literals;
 using MVLog::MVLogger;
 using PlatformTesting::contentOf;
-using PlatformTesting::Environment;
-using PlatformTesting::TemporaryDirectory;
 using testing::ContainsRegex;
 using testing::ElementsAre;
 using testing::EndsWith;
@@ -41,47 +30,7 @@ using Signature = void(const char*, const char*, int, const std::string&, int, c
 static_assert(std::is_same_v<decltype(MVLogger::logLevelMessage), Signature>);
 static_assert(std::is_same_v<decltype(MVLogger::traceLevelMessage), Signature>);
 
-void log(int level, const std::string& text)
-{
-    MVLogger::logLevelMessage("function", "File.cpp", 12, "Mavrel.Test", level, nullptr, 0, 0, text);
-}
-
-std::vector<std::string> linesOf(const std::string& text)
-{
-    std::istringstream stream(text);
-    std::vector<std::string> lines;
-    for (std::string line; std::getline(stream, line);)
-        lines.push_back(line);
-    return lines;
-}
-
-/// What a process of its own writes to standard error until it has ended well. The log reads its
-/// settings once in a process, so every test that logs does so in a child.
-std::vector<std::string> standardErrorOf(const std::function<void()>& work)
-{
-    const TemporaryDirectory directory;
-    const std::string file = directory.path("stderr");
-    std::fflush(nullptr);
-    const pid_t child = fork();
-    if (child == 0) {
-        if (std::freopen(file.c_str(), "a", stderr) == nullptr)
-            _exit(99);
-        work();
-        std::exit(0);
-    }
-    int status = -1;
-    EXPECT_EQ(waitpid(child, &status, 0), child);
-    EXPECT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0) << status << contentOf(file);
-    return linesOf(contentOf(file));
-}
-
-class Logger : public testing::Test
-{
-protected:
-    TemporaryDirectory directory;
-    Environment level{"MVLOG_LEVEL", std::nullopt};
-    Environment file{"MVLOG_FILE", std::nullopt};
-};
+using Logger = LoggerTest;
 
 TEST_F(Logger, writesAllThatItIsToldInOneLine)
 {
@@ -97,6 +46,7 @@ TEST_F(Logger, writesAllThatItIsToldInOneLine)
 
 TEST_F(Logger, namesTheTraceChannel)
 {
+    traceLevel.set("0");
     EXPECT_THAT(standardErrorOf([] {
                     MVLogger::traceLevelMessage("f", "F.cpp", -1, "C", 7000, "reserved", 5, 6, "text");
                 }),
@@ -159,7 +109,7 @@ TEST_F(Logger, emptyVariablesCountAsUnset)
                 ElementsAre(EndsWith(": error")));
 }
 
-class BadLevel : public Logger, public testing::WithParamInterface<const char*>
+class BadLevel : public LoggerTest, public testing::WithParamInterface<const char*>
 {};
 
 TEST_P(BadLevel, isComplainedOfOnceAndTheDefaultTaken)
@@ -171,7 +121,7 @@ TEST_P(BadLevel, isComplainedOfOnceAndTheDefaultTaken)
                     log(6000, "second");
                 }),
                 ElementsAre(EndsWith(std::string("MVLOG_LEVEL is \"") + GetParam() +
-                                     "\", expected a whole number from 0 to 2147483647; taking 6000"),
+                                     "\", expected a whole number from 0 to 2147483647 or off; taking 6000"),
                             EndsWith(": first"), EndsWith(": second")));
 }
 
@@ -233,11 +183,12 @@ TEST_F(Logger, everyBadVariableIsComplainedOf)
 TEST_F(Logger, aLineThatCannotBeWrittenIsComplainedOfOnce)
 {
     file.set("/dev/full");
-    EXPECT_THAT(standardErrorOf([] {
-                    log(6000, "first");
-                    log(6000, "second");
-                }),
-                ElementsAre(EndsWith("a log line is lost: cannot write: No space left on device")));
+    EXPECT_THAT(
+        standardErrorOf([] {
+            log(6000, "first");
+            log(6000, "second");
+        }),
+        ElementsAre(EndsWith("a log line is lost: cannot write to /dev/full: No space left on device")));
 }
 
 TEST_F(Logger, survivesAClosedStandardError)

@@ -1,14 +1,26 @@
 /// \file
 /// Log lines of the management software.
 ///
-/// By default every line from level 6000 up goes to standard error. Two environment variables, read
-/// once, at the first line of the process, say otherwise:
+/// There are two channels, log and trace. By default every line of the log from level 6000 up goes to
+/// standard error, and the trace is off. Environment variables, read once, at the first line of the process,
+/// say otherwise:
 ///
-///     MVLOG_LEVEL  the least level that is written, a whole number from 0; 3000 adds the flow lines
-///     MVLOG_FILE   the file that lines are appended to, in place of standard error
+///     MVLOG_LEVEL         the least level of the log that is written, a whole number from 0, or off;
+///                         3000 adds the flow lines
+///     MVLOG_OUTPUT        where the log goes: stderr, file:PATH, syslog, journal; after syslog and journal
+///                         may stand :SOCKET for another socket than the system's
+///     MVLOG_FILE          as MVLOG_OUTPUT=file:PATH, which goes before it
+///     MVLOG_TRACE_LEVEL   the least level of the trace that is written; off if unset
+///     MVLOG_TRACE_OUTPUT  where the trace goes; where the log goes, if unset
+///     MVLOG_CATEGORIES    the categories that are written, of both channels, separated by commas; * at the
+///     end
+///                         stands for any ending; all, if unset
 ///
-/// A value that cannot be used, or a file that cannot be opened, is complained of once on standard
-/// error; the default holds in its place. An empty variable counts as unset.
+/// A value that cannot be used, or an output that cannot be opened, is complained of once on standard
+/// error; the default holds in its place, for an output standard error. An empty variable counts as unset.
+///
+/// A file that was moved away or removed is made anew at the next line. Lines beyond what a destination takes
+/// are lost.
 #ifndef MVLOG_MVLOGGER_H
 #define MVLOG_MVLOGGER_H
 
@@ -18,8 +30,8 @@ namespace MVLog {
 
 /// Both functions may be called from any thread at any time, also before main and while static
 /// objects are destroyed. A line is written whole, with its control characters escaped. Nothing but
-/// std::bad_alloc is thrown: a line that cannot be written is lost, and the first such loss is
-/// complained of on standard error.
+/// std::bad_alloc is thrown: a line that cannot be written is lost, and the first such loss of a destination
+/// is complained of on standard error. A line below its channel's level costs a comparison.
 ///
 /// \param function, file, line  where the line comes from; the texts may be null
 /// \param category              the module, such as "Mavrel.Glimmark"

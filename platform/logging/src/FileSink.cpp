@@ -1,0 +1,76 @@
+#include "FileSink.h"
+
+#include <cerrno>
+#include <filesystem>
+#include <system_error>
+
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+namespace MVLog {
+namespace {
+
+std::string absolute(const std::string& path)
+{
+    std::error_code error;
+    const std::filesystem::path found = std::filesystem::absolute(path, error);
+    return error ? path : found.string();
+}
+
+} // namespace
+
+FileSink::FileSink(const std::string& path) : path_(absolute(path))
+{
+    if (const int error = open(); error != 0)
+        throw spdlog::spdlog_ex("cannot open " + path, error);
+}
+
+FileSink::~FileSink()
+{
+    close();
+}
+
+int FileSink::open()
+{
+    // A pipe that nobody reads is refused instead of waited for.
+    const int descriptor =
+        ::open(path_.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC | O_NOCTTY | O_NONBLOCK, 0640);
+    struct stat status
+    {};
+    if (descriptor < 0 || fstat(descriptor, &status) != 0)
+        return errno;
+    close();
+    descriptor_ = descriptor;
+    device_ = status.st_dev;
+    inode_ = status.st_ino;
+    writer_.emplace(descriptor, path_);
+    return 0;
+}
+
+void FileSink::close()
+{
+    if (descriptor_ >= 0)
+        ::close(descriptor_);
+}
+
+bool FileSink::isMoved() const
+{
+    struct stat status
+    {};
+    return stat(path_.c_str(), &status) != 0 || status.st_dev != device_ || status.st_ino != inode_;
+}
+
+void FileSink::sink_it_(const spdlog::details::log_msg& message)
+{
+    spdlog::memory_buf_t line;
+    formatter_->format(message, line);
+
+    const int error = isMoved() ? open() : 0;
+    writer_->write({line.data(), line.size()});
+    if (error != 0)
+        throw spdlog::spdlog_ex("log lines go on into the file that was moved away: cannot open " + path_,
+                                error);
+}
+
+} // namespace MVLog
