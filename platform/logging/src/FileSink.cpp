@@ -48,7 +48,7 @@ int FileSink::open()
     return 0;
 }
 
-void FileSink::close()
+void FileSink::close() const
 {
     if (descriptor_ >= 0)
         ::close(descriptor_);

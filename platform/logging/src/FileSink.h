@@ -37,7 +37,7 @@ protected:
 private:
     /// Opens the file of that name. \return 0, or why it cannot be opened; what is open then stays open
     int open();
-    void close();
+    void close() const;
     [[nodiscard]] bool isMoved() const;
 
     std::string path_;
