@@ -210,7 +210,7 @@ void ProviderFixture::newRequest()
 {
     request.reset(); // requests nest: the old one ends before the new one begins
     request = std::make_unique<cimhost::Request>(host);
-    broker.clear();
+    broker.forget();
     broker.name(request->context(), "ctx");
 }
 
@@ -235,6 +235,13 @@ CMPIObjectPath* ProviderFixture::ref(const std::string& className,
     cim::ObjectPath path{"", nameSpace, className, {}};
     for (const auto& [name, value] : keys)
         path.keys.push_back({name, textValue(value)});
+    return ref(path);
+}
+
+CMPIObjectPath* ProviderFixture::ref(cim::ObjectPath path)
+{
+    if (path.nameSpace.empty())
+        path.nameSpace = "root/test";
     CMPIObjectPath* const handle = request->path(path);
     broker.name(handle, "ref");
     return handle;

@@ -89,6 +89,8 @@ protected:
     CMPIObjectPath* ref(const std::string& className,
                         const std::vector<std::pair<std::string, std::string>>& keys = {},
                         const std::string& nameSpace = "root/test");
+    /// The same for keys of any type. A path without a namespace is put into "root/test".
+    CMPIObjectPath* ref(cimhost::cim::ObjectPath path);
 
     /// Ends the open request with all of its objects, and opens another.
     void newRequest();

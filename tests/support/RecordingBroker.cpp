@@ -149,14 +149,20 @@ std::vector<std::string> showAll(First first, Rest... rest)
 
 // Results of calls that fail.
 
-void fillStatus(CMPIStatus* status)
+bool setsStatus(Failure failure)
+{
+    return failure == Failure::errorStatus || failure == Failure::noMessage ||
+           failure == Failure::servedError;
+}
+
+void fillStatus(CMPIStatus* status, Failure failure)
 {
     if (status != nullptr)
-        *status = {CMPI_RC_ERR_FAILED, active->injectedMessage()};
+        *status = active->injectedStatus(failure);
 }
 
 template <class Other>
-void fillStatus(Other)
+void fillStatus(Other, Failure)
 {}
 
 template <class Object>
@@ -186,12 +192,16 @@ Object* objectWithoutHandle()
     return &object;
 }
 
+/// Whether a service that answers so makes or finds an object.
+template <class Result>
+constexpr bool makesObject = std::is_pointer_v<Result> && !std::is_const_v<std::remove_pointer_t<Result>>;
+
 template <class Result>
 Result failed(Failure failure)
 {
     if constexpr (std::is_same_v<Result, CMPIStatus>) {
         return failure == Failure::nullResult ? CMPIStatus{CMPI_RC_OK, nullptr}
-                                              : CMPIStatus{CMPI_RC_ERR_FAILED, active->injectedMessage()};
+                                              : active->injectedStatus(failure);
     } else if constexpr (std::is_same_v<Result, CMPIData>) {
         CMPIData data = CMPIData();
         data.type = failure == Failure::wrongValue ? CMPI_uint64 : CMPI_null;
@@ -199,7 +209,7 @@ Result failed(Failure failure)
         if (failure == Failure::wrongValue)
             data.value.uint64 = 1; // no pointer
         return data;
-    } else if constexpr (std::is_pointer_v<Result> && !std::is_const_v<std::remove_pointer_t<Result>>) {
+    } else if constexpr (makesObject<Result>) {
         return failure == Failure::noHandle ? objectWithoutHandle<std::remove_pointer_t<Result>>() : nullptr;
     } else {
         return Result();
@@ -234,6 +244,17 @@ private:
     static inline thread_local int depth = 0;
 };
 
+/// What a service answers with, and on what it is called.
+struct ServiceKind
+{
+    bool returnsStatus;
+    bool returnsData;
+    bool returnsObject;
+    bool isOnObject; ///< not on the broker
+};
+
+std::map<std::string, ServiceKind> serviceKinds;
+
 /// Stands in a slot of a function table.
 template <auto Slot>
 struct Layer;
@@ -264,9 +285,22 @@ struct Layer<Slot>
                 return data;
             }
         }
-        if (*failure == Failure::errorStatus)
-            (fillStatus(arguments), ...);
-        return failed<Result>(*failure);
+        return fail(*failure, arguments...);
+    }
+
+    static Result fail(Failure failure, Arguments... arguments)
+    {
+        if (failure == Failure::servedError) {
+            const Result result = serve(arguments...);
+            (fillStatus(arguments, failure), ...);
+            if constexpr (std::is_same_v<Result, CMPIStatus>)
+                return active->injectedStatus(failure);
+            else
+                return result;
+        }
+        if (setsStatus(failure))
+            (fillStatus(arguments, failure), ...);
+        return failed<Result>(failure);
     }
 
     static Result serve(Arguments... arguments)
@@ -284,6 +318,9 @@ struct Layer<Slot>
         original = table.*Slot;
         service = name;
         table.*Slot = &call;
+        serviceKinds[name] = {
+            std::is_same_v<Result, CMPIStatus>, std::is_same_v<Result, CMPIData>, makesObject<Result>,
+            !std::is_same_v<Table, CMPIBrokerFT> && !std::is_same_v<Table, CMPIBrokerEncFT>};
     }
 };
 
@@ -320,6 +357,11 @@ void install(FunctionTables& tables)
 }
 
 #undef LAYER
+
+bool endsWith(const std::string& text, const std::string& end)
+{
+    return text.size() >= end.size() && text.compare(text.size() - end.size(), end.size(), end) == 0;
+}
 
 bool beginsWith(const std::string& call, const std::string& service)
 {
@@ -363,6 +405,14 @@ void RecordingBroker::clear()
     counters.clear();
 }
 
+void RecordingBroker::forget()
+{
+    clear();
+    const std::lock_guard lock(mutex);
+    givenNames.clear();
+    plans.clear();
+}
+
 std::vector<std::string> RecordingBroker::calls() const
 {
     const std::lock_guard lock(mutex);
@@ -384,6 +434,21 @@ std::vector<std::string> RecordingBroker::calls(const std::vector<std::string>& 
             found.push_back(call);
     }
     return found;
+}
+
+std::vector<Failure> RecordingBroker::failuresOf(const std::string& call)
+{
+    const ServiceKind& kind = serviceKinds.at(call.substr(0, call.find('(')));
+    std::vector<Failure> failures{Failure::nullResult};
+    if (kind.returnsObject)
+        failures.push_back(Failure::noHandle);
+    if (kind.returnsStatus || endsWith(call, "rc)"))
+        failures.insert(failures.end(), {Failure::errorStatus, Failure::noMessage, Failure::servedError});
+    if (kind.returnsData)
+        failures.insert(failures.end(), {Failure::wrongValue, Failure::nullState});
+    if (kind.isOnObject)
+        failures.push_back(Failure::lostHandle);
+    return failures;
 }
 
 void RecordingBroker::fail(const std::string& service, int nth, Failure failure)
@@ -422,7 +487,9 @@ std::string RecordingBroker::nameOf(const void* object, const std::string& kind)
     return names[object] = kind + std::to_string(++counters[kind]);
 }
 
-CMPIString* RecordingBroker::injectedMessage()
+CMPIStatus RecordingBroker::injectedStatus(Failure failure)
 {
-    return originalTables.enc.newString(broker.cmpiBroker(), "injected", nullptr);
+    if (failure == Failure::noMessage)
+        return {CMPI_RC_ERR_FAILED, nullptr};
+    return {CMPI_RC_ERR_FAILED, originalTables.enc.newString(broker.cmpiBroker(), "injected", nullptr)};
 }

@@ -21,6 +21,8 @@ enum class Failure
     nullResult,  ///< a null pointer or a zero; a status argument is left alone
     noHandle,    ///< an object with a null handle
     errorStatus, ///< a null pointer or a zero, and code 1 with the message "injected" in the status argument
+    noMessage,   ///< as errorStatus, but the status has no message
+    servedError, ///< the call is served, and its status is that of errorStatus all the same
     wrongValue,  ///< getNext: an item that is no reference; hasNext: false
     nullState,   ///< data that is served but says that it is null
     lostHandle   ///< the call is served, but the object it is made on has a null handle from then on
@@ -45,6 +47,9 @@ public:
     /// Forgets the calls so far, and the names of objects that calls made.
     void clear();
 
+    /// Forgets the test's own objects too, whose request has ended, and the failures still to come.
+    void forget();
+
     std::vector<std::string> calls() const;
 
     /// For each of calls(), how many lines the logging library had been given before it.
@@ -52,6 +57,9 @@ public:
 
     /// Those calls that begin with one of the services' names.
     std::vector<std::string> calls(const std::vector<std::string>& services) const;
+
+    /// The ways in which a call can fail, each with an effect of its own. \param call  one of calls()
+    static std::vector<Failure> failuresOf(const std::string& call);
 
     /// Lets the nth call (from 1, counted from now on) of a service fail; without a name, that of any
     /// service. May be said for several.
@@ -64,8 +72,8 @@ public:
     std::optional<Failure> record(const std::string& service, const std::vector<std::string>& arguments);
     /// The name of an object; a new one of that kind if it has none.
     std::string nameOf(const void* object, const std::string& kind);
-    /// A broker's string for the status of a failing call.
-    CMPIString* injectedMessage();
+    /// The status of a call that fails. \param failure  errorStatus, noMessage or servedError
+    CMPIStatus injectedStatus(Failure failure);
 
 private:
     struct Plan

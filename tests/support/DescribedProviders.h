@@ -1,0 +1,17 @@
+/// \file
+/// What the four providers are described to do, written down a second time: providers that answer every read
+/// operation call by call and line by line as the library should, whatever the broker's calls return. Tests
+/// run an operation with the library and with these and compare all that the broker and the log have seen.
+///
+/// It shares nothing with the library and is built the other way round: one straight walk for each
+/// operation, for one thread, for requests without a property list and a result class, for inventories of
+/// fewer than 65,536 indicators, without the parameter lists of the trace lines.
+#ifndef TESTS_SUPPORT_DESCRIBEDPROVIDERS_H
+#define TESTS_SUPPORT_DESCRIBEDPROVIDERS_H
+
+#include "Operations.h"
+
+/// The providers' factory functions. Operations other than those of allOperations() are null pointers.
+EntryPoints describedEntryPoints();
+
+#endif
