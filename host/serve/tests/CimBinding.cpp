@@ -202,7 +202,7 @@ TEST_F(Binding, checksTheProtocolVersion)
     expectError(501, "unsupported-protocol-version", "expected 1.x");
     set("CIMProtocolVersion", "1.1");
     expectError(400, "header-mismatch",
-                "CIMProtocolVersion: found \"1.1\", expected \"1.0\" as in the message");
+                R"(CIMProtocolVersion: found "1.1", expected "1.0" as in the message)");
 }
 
 TEST_F(Binding, comparesHeadersAndMessage)
@@ -216,7 +216,7 @@ TEST_F(Binding, comparesHeadersAndMessage)
     }
     set("CIMObject", "root%2Fother");
     expectError(400, "header-mismatch",
-                "CIMObject: found \"root/other\", expected \"root/cimv2\" as in the message");
+                R"(CIMObject: found "root/other", expected "root/cimv2" as in the message)");
     for (const char* object : {"root%2", "root%", "root%zzcimv2", "root%+1"}) {
         set("CIMObject", object);
         expectError(400, "header-mismatch", "expected two hexadecimal digits behind %");
@@ -238,9 +238,9 @@ TEST_F(Binding, namesTheFaultOfTheMessage)
     expectError(400, "request-not-valid", "found a document type declaration");
     request.body = "<CIM/>";
     expectError(400, "request-not-loosely-valid", "CIMVERSION");
-    request.body = "<CIM CIMVERSION=\"3.0\" DTDVERSION=\"2.0\"/>";
+    request.body = R"(<CIM CIMVERSION="3.0" DTDVERSION="2.0"/>)";
     expectError(501, "unsupported-cim-version", "expected 2.x");
-    request.body = "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"3.0\"/>";
+    request.body = R"(<CIM CIMVERSION="2.0" DTDVERSION="3.0"/>)";
     expectError(501, "unsupported-dtd-version", "expected 2.x");
     request.body = messageWith("<MULTIREQ/>");
     expectError(501, "multiple-requests-unsupported", "expected a single request");

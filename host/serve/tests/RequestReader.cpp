@@ -256,8 +256,8 @@ TEST(RequestReader, knowsTheVersionsItUnderstands)
 {
     const auto document = [](const std::string& cim, const std::string& dtd, const std::string& protocol) {
         return "<CIM CIMVERSION=\"" + cim + "\" DTDVERSION=\"" + dtd +
-               "\"><MESSAGE ID=\"1\" PROTOCOLVERSION=\"" + protocol +
-               "\"><SIMPLEREQ><IMETHODCALL NAME=\"GetClass\"><LOCALNAMESPACEPATH><NAMESPACE NAME=\"a\"/>" +
+               R"("><MESSAGE ID="1" PROTOCOLVERSION=")" + protocol +
+               R"("><SIMPLEREQ><IMETHODCALL NAME="GetClass"><LOCALNAMESPACEPATH><NAMESPACE NAME="a"/>)" +
                "</LOCALNAMESPACEPATH></IMETHODCALL></SIMPLEREQ></MESSAGE></CIM>";
     };
     for (const char* version : {"2.0", "2.3", "2.99"})
@@ -286,9 +286,9 @@ TEST(RequestReader, refusesWhatTheDtdDoesNotAllow)
     refuse("<MESSAGE/>", "line 1, MESSAGE: found this element, expected CIM");
     refuse("<CIM/>", "found no attribute CIMVERSION, expected one");
     refuse("<CIM CIMVERSION=\"2.0\"/>", "DTDVERSION");
-    refuse("<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"/>", "found nothing, expected MESSAGE");
+    refuse(R"(<CIM CIMVERSION="2.0" DTDVERSION="2.0"/>)", "found nothing, expected MESSAGE");
     refuse(
-        "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><MESSAGE PROTOCOLVERSION=\"1.0\"><SIMPLEREQ/></MESSAGE></CIM>",
+        R"(<CIM CIMVERSION="2.0" DTDVERSION="2.0"><MESSAGE PROTOCOLVERSION="1.0"><SIMPLEREQ/></MESSAGE></CIM>)",
         "found no call");
     refuse(messageWith(""), "expected SIMPLEREQ, MULTIREQ, SIMPLEEXPREQ or MULTIEXPREQ");
     refuse(messageWith("<SIMPLEREQ/><SIMPLEREQ/>"), "a second element in MESSAGE");

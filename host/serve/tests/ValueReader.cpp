@@ -24,9 +24,8 @@ Element parse(const std::string& document)
 /// The one key of an INSTANCENAME.
 cim::Value keyOf(const std::string& value)
 {
-    const cim::ObjectPath path =
-        readInstanceName(parse("<INSTANCENAME CLASSNAME=\"CIM_A\"><KEYBINDING NAME=\"K\">" + value +
-                               "</KEYBINDING></INSTANCENAME>"));
+    const cim::ObjectPath path = readInstanceName(parse(
+        R"(<INSTANCENAME CLASSNAME="CIM_A"><KEYBINDING NAME="K">)" + value + "</KEYBINDING></INSTANCENAME>"));
     return path.keys.at(0).value;
 }
 
@@ -40,7 +39,7 @@ cim::Value propertyOf(const std::string& property)
 
 cim::Value scalarOf(const std::string& type, const std::string& text)
 {
-    return propertyOf("<PROPERTY NAME=\"P\" TYPE=\"" + type + "\"><VALUE>" + text + "</VALUE></PROPERTY>");
+    return propertyOf(R"(<PROPERTY NAME="P" TYPE=")" + type + "\"><VALUE>" + text + "</VALUE></PROPERTY>");
 }
 
 /// The message of the error that reading ends in. Empty: it does not.
@@ -109,7 +108,7 @@ TEST(ReferenceReader, readsPathsOfEveryLength)
 {
     const std::string name = "<INSTANCENAME CLASSNAME=\"CIM_B\"/>";
     const std::string nameSpace =
-        "<LOCALNAMESPACEPATH><NAMESPACE NAME=\"root\"/><NAMESPACE NAME=\"b\"/></LOCALNAMESPACEPATH>";
+        R"(<LOCALNAMESPACEPATH><NAMESPACE NAME="root"/><NAMESPACE NAME="b"/></LOCALNAMESPACEPATH>)";
     const std::string place = "<NAMESPACEPATH><HOST>srv</HOST>" + nameSpace + "</NAMESPACEPATH>";
     const auto reference = [](const std::string& path) {
         return keyOf("<VALUE.REFERENCE>" + path + "</VALUE.REFERENCE>");
@@ -194,7 +193,7 @@ TEST(PropertyReader, readsNullsArraysAndReferences)
 TEST(PropertyReader, readsEmbeddedInstances)
 {
     const auto embedded = [](const std::string& text) {
-        return propertyOf("<PROPERTY NAME=\"P\" TYPE=\"string\" EmbeddedObject=\"instance\"><VALUE>" + text +
+        return propertyOf(R"(<PROPERTY NAME="P" TYPE="string" EmbeddedObject="instance"><VALUE>)" + text +
                           "</VALUE></PROPERTY>");
     };
     EXPECT_EQ(embedded("<![CDATA[<INSTANCE CLASSNAME=\"B\"/>]]>"),
@@ -215,7 +214,7 @@ TEST(PropertyReader, boundsInstancesEmbeddedInEachOther)
     };
     for (int depth = 0; depth < 6; ++depth)
         document =
-            "<INSTANCE CLASSNAME=\"B\"><PROPERTY NAME=\"P\" TYPE=\"string\" EmbeddedObject=\"instance\"><VALUE>" +
+            R"(<INSTANCE CLASSNAME="B"><PROPERTY NAME="P" TYPE="string" EmbeddedObject="instance"><VALUE>)" +
             escaped(document) + "</VALUE></PROPERTY></INSTANCE>";
     EXPECT_EQ(errorOf([&] { readInstance(parse(document), {10, 100}); }), "");
     EXPECT_THAT(errorOf([&] { readInstance(parse(document), {6, 100}); }), HasSubstr("deep in each other"));

@@ -85,10 +85,10 @@ TEST(Xml, ignoresCommentsAndInstructions)
 TEST(Xml, namesThePlaceOfWhatIsNotWellFormed)
 {
     for (const char* document :
-         {"", " ", "x", "<CIM", "<CIM>", "<CIM></MESSAGE>", "<CIM/><CIM/>", "<CIM A=\"1\" A=\"2\"/>",
+         {"", " ", "x", "<CIM", "<CIM>", "<CIM></MESSAGE>", "<CIM/><CIM/>", R"(<CIM A="1" A="2"/>)",
           "<CIM A=1/>", "<CIM>&nothing;</CIM>", "<CIM>&#0;</CIM>", "<CIM>&#x1;</CIM>", "<CIM>\x01</CIM>",
           "<CIM A=\"<\"/>", "<CIM>]]></CIM>", "<CIM/>tail", " <?xml version=\"1.0\"?><CIM/>",
-          "<?xml version=\"1.0\" encoding=\"no-such-encoding\"?><CIM/>"}) {
+          R"(<?xml version="1.0" encoding="no-such-encoding"?><CIM/>)"}) {
         const Ending ending = endingOf(document);
         EXPECT_EQ(ending.fault, Fault::notWellFormed) << document;
         EXPECT_THAT(ending.message, HasSubstr("expected")) << document;
