@@ -322,8 +322,12 @@ ValueError::ValueError(CMPIrc code, const std::string& message) : std::runtime_e
 std::string readNameSpace(const Element& element)
 {
     std::string nameSpace;
-    for (const Element& part : childrenAmong(element, {"NAMESPACE"}))
-        nameSpace += (nameSpace.empty() ? "" : "/") + attribute(part, "NAME");
+    for (const Element& part : childrenAmong(element, {"NAMESPACE"})) {
+        const std::string& name = attribute(part, "NAME");
+        if (('/' + name + '/').find("//") != std::string::npos)
+            failAt(part, "the name \"" + cim::excerpt(name) + '"', "names between slashes");
+        nameSpace += (nameSpace.empty() ? "" : "/") + name;
+    }
     if (element.children.empty())
         failAt(element, "nothing", "NAMESPACE");
     return nameSpace;

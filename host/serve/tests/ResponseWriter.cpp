@@ -74,11 +74,13 @@ TEST(ResponseWriter, givesEachOperationItsForm)
     EXPECT_EQ(bodyOf(Operation::getInstance, instances), returned(instanceXml));
     EXPECT_EQ(bodyOf(Operation::execQuery, instances),
               returned("<VALUE.OBJECT>" + instanceXml + "</VALUE.OBJECT>"));
-    for (const Operation operation : {Operation::associators, Operation::references})
-        EXPECT_EQ(bodyOf(operation, instances),
-                  returned("<VALUE.OBJECTWITHPATH>" + pathXml + instanceXml + "</VALUE.OBJECTWITHPATH>"));
-    for (const Operation operation : {Operation::associatorNames, Operation::referenceNames})
-        EXPECT_EQ(bodyOf(operation, paths), returned("<OBJECTPATH>" + pathXml + "</OBJECTPATH>"));
+    const std::string withPath =
+        returned("<VALUE.OBJECTWITHPATH>" + pathXml + instanceXml + "</VALUE.OBJECTWITHPATH>");
+    EXPECT_EQ(bodyOf(Operation::associators, instances), withPath);
+    EXPECT_EQ(bodyOf(Operation::references, instances), withPath);
+    EXPECT_EQ(bodyOf(Operation::associatorNames, paths),
+              returned("<OBJECTPATH>" + pathXml + "</OBJECTPATH>"));
+    EXPECT_EQ(bodyOf(Operation::referenceNames, paths), returned("<OBJECTPATH>" + pathXml + "</OBJECTPATH>"));
     EXPECT_EQ(bodyOf(Operation::modifyInstance, {}), "");
     EXPECT_EQ(bodyOf(Operation::deleteInstance, {}), "");
     EXPECT_EQ(bodyOf(Operation::associators, {}), returned(""));

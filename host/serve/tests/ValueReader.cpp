@@ -104,6 +104,20 @@ TEST(KeyReader, refusesKeysThatRepeatOrHaveNoName)
                 HasSubstr("found a key without its name, expected KEYBINDING"));
 }
 
+TEST(NameSpaceReader, joinsNames)
+{
+    const auto read = [](const std::string& first, const std::string& second) {
+        return readNameSpace(parse("<LOCALNAMESPACEPATH><NAMESPACE NAME=\"" + first +
+                                   "\"/><NAMESPACE NAME=\"" + second + "\"/></LOCALNAMESPACEPATH>"));
+    };
+    EXPECT_EQ(read("root", "a"), "root/a");
+    EXPECT_EQ(read("root/a", "b"), "root/a/b");
+    for (const char* name : {"", "/", "/a", "a/", "a//b"})
+        EXPECT_THAT(errorOf<RequestError>([&] { read("root", name); }),
+                    HasSubstr("expected names between slashes"))
+            << name;
+}
+
 TEST(ReferenceReader, readsPathsOfEveryLength)
 {
     const std::string name = "<INSTANCENAME CLASSNAME=\"CIM_B\"/>";
