@@ -400,9 +400,9 @@ constexpr Route routes[] = {
 };
 
 /// Exact, letter case included; a null text equals nothing.
-bool equals(const char* text, const char* other)
+bool equals(const char* text, const char* name)
 {
-    return text != nullptr && other != nullptr && std::strcmp(text, other) == 0;
+    return text != nullptr && std::strcmp(text, name) == 0;
 }
 
 } // namespace

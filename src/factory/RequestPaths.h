@@ -20,8 +20,6 @@ inline void setNameSpaceOf(const CMPIObjectPath* path, const CMPIObjectPath* ref
 /// Sets the namespace of `ref` and this system's name on a path. A null path is left alone.
 inline void setOrigin(const CMPIObjectPath* path, const CMPIObjectPath* ref, CMPIStatus* rc)
 {
-    if (path == nullptr)
-        return;
     setNameSpaceOf(path, ref, rc);
     Cmpi::setHostname(path, getSystemName());
 }

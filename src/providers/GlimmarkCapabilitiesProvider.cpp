@@ -61,9 +61,7 @@ CMPIStatus GlimmarkCapabilities_EnumInstances(CMPIInstanceMI* mi, const CMPICont
     const GlimmarkFactory factory(false, true);
     std::vector<CMPIInstance*> instances;
     reserveFor(factory, instances);
-    if (factory.getAllGlimmarkCapabilitiesCMPIInstances(broker, ref, properties, false, instances, &status) !=
-        0)
-        return status;
+    factory.getAllGlimmarkCapabilitiesCMPIInstances(broker, ref, properties, false, instances, &status);
     returnInstances(rslt, instances);
 
     Cmpi::returnDone(rslt);
@@ -87,25 +85,16 @@ int returnByInstanceID(const CMPIResult* rslt, const CMPIObjectPath* cop, CMPISt
     return result;
 }
 
-/// Returns every instance whose whole path is the one asked for. \return the factory's result
-int returnByPath(const CMPIResult* rslt, const CMPIObjectPath* cop, const char** properties,
-                 CMPIStatus& status)
+/// Makes the instances among which the path asked for is searched. \return the factory's result
+int searchByPath(const CMPIObjectPath* cop, const char** properties, CMPIStatus& status)
 {
-    // Meant: collected are the alarm devices and not the capabilities, so that this way finds nothing. A
-    // client without the InstanceID is told "not found" by its broker.
+    // Meant: collected are the alarm devices and not the capabilities, so that there is nothing to compare
+    // and this way finds nothing. A client without the InstanceID is told "not found" by its broker.
     const GlimmarkFactory factory(true, false);
     std::vector<CMPIInstance*> instances;
     reserveFor(factory, instances);
-    const int result =
-        factory.getAllGlimmarkCapabilitiesCMPIInstances(broker, cop, properties, false, instances, &status);
-    if (result == 0) {
-        // Unlike the alarm device provider, the walk goes on after a match.
-        forEach(instances, [&](const CMPIInstance* instance) {
-            if (isAt(instance, cop, false, status))
-                Cmpi::returnInstance(rslt, instance);
-        });
-    }
-    return result;
+    return factory.getAllGlimmarkCapabilitiesCMPIInstances(broker, cop, properties, false, instances,
+                                                           &status);
 }
 
 } // namespace
@@ -126,7 +115,7 @@ CMPIStatus GlimmarkCapabilities_GetInstance(CMPIInstanceMI* mi, const CMPIContex
         CMPIString* const instanceID = Cmpi::stringKeyOf(cop, "InstanceID", &status);
         const int result = instanceID != nullptr
                                ? returnByInstanceID(rslt, cop, instanceID, properties, status)
-                               : returnByPath(rslt, cop, properties, status);
+                               : searchByPath(cop, properties, status);
         if (result != 0)
             return status;
     }

@@ -57,8 +57,7 @@ CMPIStatus Glimmark_EnumInstances(CMPIInstanceMI* mi, const CMPIContext* ctx, co
     const GlimmarkFactory factory(true, false);
     std::vector<CMPIInstance*> instances;
     reserveFor(factory, instances);
-    if (factory.getAllGlimmarkCMPIInstances(broker, ref, properties, false, instances, &status) != 0)
-        return status;
+    factory.getAllGlimmarkCMPIInstances(broker, ref, properties, false, instances, &status);
     returnInstances(rslt, instances);
 
     Cmpi::returnDone(rslt);
@@ -91,8 +90,7 @@ int returnByPath(const CMPIResult* rslt, const CMPIObjectPath* cop, const char**
     reserveFor(factory, instances);
     const int result =
         factory.getAllGlimmarkCMPIInstances(broker, cop, properties, false, instances, &status);
-    if (result == 0)
-        returnFirstAt(rslt, instances, cop, false, status);
+    returnFirstAt(rslt, instances, cop, false, status);
     return result;
 }
 
