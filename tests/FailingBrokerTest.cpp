@@ -22,8 +22,11 @@
 
 namespace cim = cimhost::cim;
 
+using ::testing::AnyOf;
+using ::testing::Contains;
 using ::testing::IsEmpty;
 using ::testing::Not;
+using ::testing::StartsWith;
 
 namespace {
 
@@ -31,13 +34,15 @@ class FailingBroker : public ProviderFixture
 {
 protected:
     /// Runs an operation in the open request.
-    CMPIStatus run(const Operation& operation)
+    CMPIStatus run(const Operation& operation) { return run(operation, host.cmpiBroker()); }
+
+    CMPIStatus run(const Operation& operation, const CMPIBroker* servingBroker)
     {
         const auto path = [this](const cim::ObjectPath& wanted) {
             const Allocations::Pause pause;
             return ref(wanted);
         };
-        return operation.run({host.cmpiBroker(), ctx(), rslt(), path});
+        return operation.run({servingBroker, ctx(), rslt(), path});
     }
 
     /// The calls of one whole request of its own.
@@ -155,6 +160,7 @@ protected:
     }
 
     CMPIStatus run() { return FailingBroker::run(GetParam()); }
+    CMPIStatus runServedBy(const CMPIBroker& other) { return FailingBroker::run(GetParam(), &other); }
     std::vector<std::string> wholeRequest() { return FailingBroker::wholeRequest(GetParam()); }
 };
 
@@ -191,6 +197,31 @@ TEST_P(EveryCall, FailsAsDescribed)
     }
     EXPECT_EQ(wholeRequest(library), whole) << "the next request is whole";
     std::cout << runs << " runs with one failing call each\n";
+}
+
+TEST_P(EveryOperation, OutlivesABrokerThatLacksServices)
+{
+    const std::vector<std::string> whole = wholeRequest();
+    const CMPIBrokerEncFT noServices{};
+    const CMPIBrokerFT noUpCalls{};
+    CMPIBroker bare = *host.cmpiBroker();
+    bare.eft = &noServices;
+    bare.bft = &noUpCalls;
+    newRequest();
+    const CMPIStatus status = runServedBy(bare);
+    // Not found: what the path says of a key that it lacks.
+    const auto expected = AnyOf(CMPI_RC_OK, CMPI_RC_ERR_FAILED, CMPI_RC_ERR_NOT_FOUND);
+    EXPECT_THAT(status.rc, expected);
+    EXPECT_EQ(status.msg, nullptr) << "there is nobody who makes strings";
+    EXPECT_THAT(broker.calls(), Not(Contains(StartsWith("new"))));
+    EXPECT_EQ(MadeInventory::openCursors(), 0);
+
+    // Without up-calls alone, the broker has no computer systems.
+    bare.eft = host.cmpiBroker()->eft;
+    newRequest();
+    EXPECT_THAT(runServedBy(bare).rc, expected);
+    EXPECT_THAT(broker.calls(), Not(Contains(StartsWith("enumerate"))));
+    EXPECT_EQ(wholeRequest(), whole) << "the next request is whole";
 }
 
 TEST_P(EveryOperation, HandsAnExhaustedMemoryOnToTheBroker)

@@ -6,6 +6,7 @@
 
 #include <cstdint>
 #include <limits>
+#include <ostream>
 #include <type_traits>
 #include <utility>
 #include <vector>
@@ -64,6 +65,11 @@ struct Translation
     unsigned int healthState;
     States operationalStatus;
 };
+
+void PrintTo(const Translation& row, std::ostream* stream)
+{
+    *stream << "node status " << row.nodeStatus;
+}
 
 class NodeStatus : public ::testing::TestWithParam<Translation>
 {};
