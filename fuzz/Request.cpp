@@ -1,5 +1,5 @@
-// Request messages of CIM-XML: read, or refused with a line that may go to a terminal. What is read is answered, and
-// an instance that was read is written so that it is read again as the same.
+// Request messages of CIM-XML: read, or refused with a line that may go to a terminal. What is read is
+// answered, and an instance that was read is written so that it is read again as the same.
 
 #include "FuzzTarget.h"
 
@@ -29,7 +29,8 @@ void checkRoundTrip(cim::Instance instance)
     XmlWriter xml;
     writeInstance(xml, instance);
     instance.path = {"", "", instance.path.className, {}};
-    Fuzz::require(readInstance(parse(xml.document()), wide) == instance, "an instance is read as it was written");
+    Fuzz::require(readInstance(parse(xml.document()), wide) == instance,
+                  "an instance is read as it was written");
 }
 
 void checkResponse(const RequestMessage& message)
@@ -40,7 +41,8 @@ void checkResponse(const RequestMessage& message)
         answer.status = *status;
     } else {
         const auto& request = std::get<OperationRequest>(message.content);
-        Fuzz::require(request.target.nameSpace == message.nameSpace, "a request is for the message's namespace");
+        Fuzz::require(request.target.nameSpace == message.nameSpace,
+                      "a request is for the message's namespace");
         answer.paths.push_back(request.target);
         answer.instances.push_back(request.instance);
     }
@@ -60,7 +62,8 @@ int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size)
         // A reference to nothing; a request may have it, a provider may not return it.
     } catch (const RequestError& error) {
         const std::string message = error.what();
-        Fuzz::require(!message.empty() && cim::printable(message) == message, "a refusal may go to a terminal");
+        Fuzz::require(!message.empty() && cim::printable(message) == message,
+                      "a refusal may go to a terminal");
     }
     return 0;
 }

@@ -88,6 +88,22 @@ TEST(Arguments, graphTakesNoTarget)
     EXPECT_NE(errorOf({"graph", "C"}), "");
 }
 
+TEST(Arguments, serveTakesAnAddressAndAPort)
+{
+    const Serve usual = std::get<Serve>(parse({"serve"}).command);
+    EXPECT_EQ(usual.address, "127.0.0.1");
+    EXPECT_EQ(usual.port, 5988);
+    const Serve other = std::get<Serve>(parse({"serve", "--address", "::1", "--port", "0"}).command);
+    EXPECT_EQ(other.address, "::1");
+    EXPECT_EQ(other.port, 0);
+    for (const char* port : {"-1", "65536", "x", ""})
+        EXPECT_THAT(errorOf({"serve", "--port", port}), HasSubstr("--port")) << port;
+    EXPECT_THAT(errorOf({"serve", "--address", ""}),
+                StartsWith("--address: expected the name of a network address"));
+    EXPECT_EQ(errorOf({"serve", "--format", "json"}), "--format has no meaning for serve, which writes XML");
+    EXPECT_NE(errorOf({"serve", "C"}), "");
+}
+
 TEST(Arguments, theTargetHasANamespaceOfItsOwnOrTheCommonOne)
 {
     EXPECT_EQ(requestOf({"ein", "C"}).target, (cim::ObjectPath{"", "root/cimv2", "C", {}}));
@@ -281,7 +297,7 @@ TEST(Arguments, helpIsForAllOrForOneCommand)
 {
     EXPECT_THAT(noticeOf({"--help"}), HasSubstr("Exit status"));
     EXPECT_THAT(noticeOf({"--help"}), HasSubstr("--provider-dir DIR"));
-    for (const char* command : {"ein", "ei", "gi", "ain", "ai", "rin", "ri", "graph"})
+    for (const char* command : {"ein", "ei", "gi", "ain", "ai", "rin", "ri", "graph", "serve"})
         EXPECT_THAT(noticeOf({"--help"}), HasSubstr(std::string("\n  ") + command)) << command;
     EXPECT_THAT(noticeOf({"ei", "--help"}), HasSubstr("PROPERTY"));
     EXPECT_THAT(noticeOf({"ai", "--help"}), HasSubstr("--result-role ROLE"));

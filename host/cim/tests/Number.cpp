@@ -1,0 +1,32 @@
+#include "cim/Number.h"
+
+#include "cim/Values.h"
+#include "cim/tests/Print.h"
+
+#include <cstdint>
+
+#include <gtest/gtest.h>
+
+using namespace cimhost::cim;
+
+namespace {
+
+TEST(Number, hasTheWidestTypeThatItNeeds)
+{
+    EXPECT_EQ(parseNumber("0"), unsignedValue(0));
+    EXPECT_EQ(parseNumber("+7"), unsignedValue(7));
+    EXPECT_EQ(parseNumber("18446744073709551615"), unsignedValue(UINT64_MAX));
+    EXPECT_EQ(parseNumber("-0"), unsignedValue(0));
+    EXPECT_EQ(parseNumber("-9223372036854775808"), signedValue(INT64_MIN));
+    EXPECT_EQ(parseNumber("1."), realValue(1));
+    EXPECT_EQ(parseNumber("-2.5E-1"), realValue(-0.25));
+}
+
+TEST(Number, isAllOfTheTextAndFits)
+{
+    for (const char* text : {"", " 1", "1 ", "+", "-", "+-1", "--1", "1-", "0x1", "one", "nan", "inf",
+                             "nan(e)", "1e999", "18446744073709551616", "-9223372036854775809"})
+        EXPECT_EQ(parseNumber(text), std::nullopt) << text;
+}
+
+} // namespace
