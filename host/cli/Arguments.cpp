@@ -5,6 +5,8 @@
 
 #include <algorithm>
 #include <array>
+#include <chrono>
+#include <cmath>
 #include <functional>
 #include <map>
 #include <sstream>
@@ -28,6 +30,7 @@ Examples:
   cimhost ai -ac ASSOC 'CLASS.Key="value"' what an association ties to it
   cimhost graph | dot -Tsvg > graph.svg    the whole picture
   cimhost serve                            for CIM clients on this machine
+  cimhost watch                            this server's indicators, live
 
 Environment:
   CIMHOST_PROVIDER_DIR   directories of provider libraries, separated by colons
@@ -55,6 +58,9 @@ void translateFieldSpellings(std::vector<std::string>& arguments)
 /// Of CIM-XML over HTTP without encryption, as registered with IANA (wbem-http).
 constexpr std::uint16_t standardPort = 5988;
 
+constexpr double leastInterval = 0.1;    ///< seconds
+constexpr double mostInterval = 86400.0; ///< seconds
+
 /// What the options and positionals write into.
 struct Arguments
 {
@@ -64,6 +70,8 @@ struct Arguments
     std::string format;
     OperationRequest request;
     Serve serve{"127.0.0.1", standardPort};
+    std::string watched = "TAVRO_Glimmark";
+    double interval = 2; ///< seconds
     Settings settings;
 };
 
@@ -236,13 +244,41 @@ void addServe(CLI::App& app, Serve& serve)
         ->capture_default_str();
 }
 
+void addWatch(CLI::App& app, Arguments& arguments)
+{
+    CLI::App& command = addCommand(app, "watch", "Show a class's instances live, and what changes");
+    command.add_option("CLASS", arguments.watched, "The class, such as root/cimv2:CLASS")
+        ->type_name("")
+        ->capture_default_str();
+    command.add_option("--interval", arguments.interval, "Seconds from one look to the next")
+        ->type_name("SECONDS")
+        ->check(CLI::Range(leastInterval, mostInterval))
+        ->capture_default_str();
+}
+
+/// The class that a command takes.
+cim::ObjectPath readClass(const std::string& command, const std::string& text, const std::string& nameSpace)
+{
+    cim::ObjectPath path = readTarget(text, nameSpace);
+    if (!path.keys.empty())
+        throw UsageError(command + " takes a class; gi gets the one instance of a path");
+    return path;
+}
+
+Watch watchOf(const Arguments& arguments)
+{
+    constexpr double millisecondsASecond = 1000;
+    return {readClass("watch", arguments.watched, arguments.nameSpace),
+            std::chrono::milliseconds(std::llround(arguments.interval * millisecondsASecond))};
+}
+
 Ask questionOf(const QuestionEntry& entry, Arguments& arguments)
 {
     OperationRequest& request = arguments.request;
     request.operation = entry.operation;
-    request.target = readTarget(arguments.target, arguments.nameSpace);
-    if (entry.target == Target::classPath && !request.target.keys.empty())
-        throw UsageError(std::string(entry.name) + " takes a class; gi gets the one instance of a path");
+    request.target = entry.target == Target::classPath
+                         ? readClass(entry.name, arguments.target, arguments.nameSpace)
+                         : readTarget(arguments.target, arguments.nameSpace);
     if (!arguments.properties.empty())
         request.properties = arguments.properties;
     Ask ask{request, {}};
@@ -259,12 +295,16 @@ Command commandOf(const CLI::App& app, Arguments& arguments)
                                      [&](const QuestionEntry& candidate) { return candidate.name == name; });
     if (entry != questionEntries.end())
         return questionOf(*entry, arguments);
-    const bool isGraph = name == "graph";
+    static const std::map<std::string, const char*> forms{
+        {"graph", "writes DOT"},
+        {"serve", "writes XML"},
+        {"watch", "shows a table, or a line for each change"}};
     if (!arguments.format.empty())
-        throw UsageError("--format has no meaning for " + name + ", which writes " +
-                         (isGraph ? "DOT" : "XML"));
-    if (isGraph)
+        throw UsageError("--format has no meaning for " + name + ", which " + forms.at(name));
+    if (name == "graph")
         return DrawGraph{arguments.nameSpace};
+    if (name == "watch")
+        return watchOf(arguments);
     return arguments.serve;
 }
 
@@ -302,6 +342,7 @@ std::variant<Invocation, Notice> parseArguments(std::vector<std::string> argumen
         addQuestion(app, entry, result);
     addCommand(app, "graph", "Write a namespace's instances as a Graphviz graph");
     addServe(app, result.serve);
+    addWatch(app, result);
 
     translateFieldSpellings(arguments);
     std::reverse(arguments.begin(), arguments.end()); // the parser takes them off the back

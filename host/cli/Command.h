@@ -5,6 +5,7 @@
 
 #include "broker/OperationRequest.h"
 
+#include <chrono>
 #include <cstdint>
 #include <optional>
 #include <string>
@@ -49,7 +50,14 @@ struct Serve
     std::uint16_t port = 0; ///< 0: any that is free
 };
 
-using Command = std::variant<Ask, DrawGraph, Serve>;
+/// Shows the instances of a class live until a signal ends it.
+struct Watch
+{
+    cim::ObjectPath target;             ///< the class, with a namespace
+    std::chrono::milliseconds interval; ///< from one answer to the next question
+};
+
+using Command = std::variant<Ask, DrawGraph, Serve, Watch>;
 
 /// What the broker is to be started with.
 struct Settings

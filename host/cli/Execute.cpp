@@ -3,6 +3,7 @@
 #include "cli/Graph.h"
 #include "cli/Output.h"
 #include "cli/Serve.h"
+#include "cli/Watch.h"
 
 #include <ostream>
 
@@ -37,6 +38,11 @@ struct Execution
     }
 
     ExitStatus operator()(const Serve& command) const { return serveUntilSignal(command, broker, err); }
+
+    ExitStatus operator()(const Watch& command) const
+    {
+        return watchUntilSignal(command, broker, isTerminal, err);
+    }
 };
 
 } // namespace

@@ -10,7 +10,7 @@
 
 namespace cimhost::cli {
 
-/// Asks, draws or serves.
+/// Asks, draws, serves or watches.
 /// \param isTerminal  whether a person looks at `out`
 /// \return exitAnswered, or exitError after an answer with an error status, which goes to `err`;
 /// what such an answer brought is not shown, as brokers do not send it

@@ -127,6 +127,24 @@ bool isAlarmDevice(const cim::Instance& instance)
                        [&](const std::string& column) { return findValue(instance, column) != nullptr; });
 }
 
+bool hasWord(const cim::Property& property)
+{
+    return std::any_of(property.value.items.begin(), property.value.items.end(), [&](const auto& item) {
+        const auto* const number = std::get_if<std::uint64_t>(&item);
+        return number != nullptr && valueWord(property.name, *number).has_value();
+    });
+}
+
+std::vector<std::string> wordedProperties(const std::vector<cim::Instance>& instances)
+{
+    std::vector<std::string> names;
+    for (const cim::Instance& instance : instances)
+        for (const cim::Property& property : instance.properties)
+            if (hasWord(property))
+                addOnce(names, property.name);
+    return names;
+}
+
 std::size_t widestName(const cim::Instance& instance)
 {
     std::size_t width = 0;
@@ -188,6 +206,25 @@ std::string instanceTable(const std::vector<cim::Instance>& instances, const cim
     if (std::all_of(instances.begin(), instances.end(), isAlarmDevice))
         return columnsTable(deviceColumns(), instances);
     return instanceBlocks(instances);
+}
+
+std::string stateTable(const std::vector<cim::Instance>& instances)
+{
+    const bool areAlarmDevices = std::all_of(instances.begin(), instances.end(), isAlarmDevice);
+    return instanceTable(instances, areAlarmDevices ? cim::PropertyList() : wordedProperties(instances));
+}
+
+std::string shortName(const cim::ObjectPath& path)
+{
+    std::string text;
+    for (const std::string& key : tellingKeyNames({path}))
+        text += (text.empty() ? "" : ", ") + cellText(key, *cim::findKey(path, key), wordOnly);
+    return text;
+}
+
+std::string valueText(std::string_view property, const cim::Value& value)
+{
+    return cellText(property, value, wordOnly);
 }
 
 std::string instanceBlocks(const std::vector<cim::Instance>& instances)

@@ -6,6 +6,7 @@
 #include "cim/Model.h"
 
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace cimhost::cli {
@@ -17,6 +18,16 @@ std::string nameTable(const std::vector<cim::ObjectPath>& paths);
 /// those properties; for devices that all have a health and an alarm state, these; for anything else
 /// a block for each instance, as instanceBlocks().
 std::string instanceTable(const std::vector<cim::Instance>& instances, const cim::PropertyList& properties);
+
+/// One row for each instance, whatever its class: as instanceTable() for alarm devices, for anything else the
+/// keys that tell the instances apart and the properties whose numbers have words. "No instances." for none.
+std::string stateTable(const std::vector<cim::Instance>& instances);
+
+/// What tells the instance from others of its class: the values of such keys.
+std::string shortName(const cim::ObjectPath& path);
+
+/// The value of a property, as in a table: numbers of well-known properties in words, nothing for a null.
+std::string valueText(std::string_view property, const cim::Value& value);
 
 /// The path, and under it one line for each property.
 std::string instanceBlocks(const std::vector<cim::Instance>& instances);

@@ -1,5 +1,6 @@
 #include "cli/Serve.h"
 
+#include "cli/Signals.h"
 #include "serve/CimBinding.h"
 #include "serve/HttpServer.h"
 
@@ -14,32 +15,6 @@ namespace cimhost::cli {
 
 namespace {
 
-/// Keeps the signals that end the server from this thread and those that it starts, to be waited for.
-class EndSignals
-{
-public:
-    EndSignals()
-    {
-        sigemptyset(&signals_);
-        sigaddset(&signals_, SIGINT);
-        sigaddset(&signals_, SIGTERM);
-        pthread_sigmask(SIG_BLOCK, &signals_, &before_);
-    }
-    ~EndSignals() { pthread_sigmask(SIG_SETMASK, &before_, nullptr); }
-    EndSignals(const EndSignals&) = delete;
-    EndSignals& operator=(const EndSignals&) = delete;
-
-    void wait() const
-    {
-        int signal = 0;
-        sigwait(&signals_, &signal);
-    }
-
-private:
-    sigset_t signals_{};
-    sigset_t before_{};
-};
-
 std::string hostName()
 {
     std::array<char, 256> name{};
@@ -50,7 +25,7 @@ std::string hostName()
 
 ExitStatus serveUntilSignal(const Serve& command, Broker& broker, std::ostream& err)
 {
-    const EndSignals signals;
+    const HeldSignals signals{SIGINT, SIGTERM};
     const serve::CimBinding binding(broker, hostName());
     const serve::HttpServer server({command.address, command.port}, binding);
     err << "cimhost: listening on http://" << textOf(server.endpoint())

@@ -104,6 +104,23 @@ TEST(Arguments, serveTakesAnAddressAndAPort)
     EXPECT_NE(errorOf({"serve", "C"}), "");
 }
 
+TEST(Arguments, watchHasAClassAndAnInterval)
+{
+    const auto watchOf = [](std::vector<std::string> arguments) {
+        return std::get<Watch>(parse(std::move(arguments)).command);
+    };
+    EXPECT_EQ(watchOf({"watch"}).target, (cim::ObjectPath{"", "root/cimv2", "TAVRO_Glimmark", {}}));
+    EXPECT_EQ(watchOf({"watch"}).interval, std::chrono::seconds(2));
+    EXPECT_EQ(watchOf({"watch", "root/x:C", "--interval", "0.25"}).target,
+              (cim::ObjectPath{"", "root/x", "C", {}}));
+    EXPECT_EQ(watchOf({"watch", "--interval", "0.25"}).interval, std::chrono::milliseconds(250));
+    for (const char* const interval : {"0", "-1", "0.05", "86401", "nan", "inf", "2s", ""})
+        EXPECT_NE(errorOf({"watch", "--interval", interval}), "") << interval;
+    EXPECT_EQ(errorOf({"watch", "C.K=1"}), "watch takes a class; gi gets the one instance of a path");
+    EXPECT_EQ(errorOf({"watch", "--format", "json"}),
+              "--format has no meaning for watch, which shows a table, or a line for each change");
+}
+
 TEST(Arguments, theTargetHasANamespaceOfItsOwnOrTheCommonOne)
 {
     EXPECT_EQ(requestOf({"ein", "C"}).target, (cim::ObjectPath{"", "root/cimv2", "C", {}}));

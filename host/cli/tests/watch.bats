@@ -1,0 +1,122 @@
+#!/usr/bin/env bats
+# cimhost watch as a person and a pipe see it. The terminal is that of tmux.
+
+setup() {
+    cd "$BATS_TEST_TMPDIR"
+    export TAVRO_INVENTORY=$BATS_TEST_TMPDIR/inventory.json LC_ALL=C.UTF-8
+    inventory 1 1
+}
+
+teardown() {
+    tmux_here kill-server 2>/dev/null || true
+    [ -z "${watcher-}" ] || kill "$watcher" 2>/dev/null || true
+}
+
+bats_require_minimum_version 1.5.0
+
+# The status and alarm state of the one indicator; moved into place, so that nobody reads half of it.
+inventory() {
+    cat >inventory.new <<END
+{"nodes": [{"kind": 36, "description": "Fan", "path": "/fan", "status": $1, "alarmState": $2}]}
+END
+    mv inventory.new inventory.json
+}
+
+# Tries a command until it succeeds.
+eventually() {
+    local try
+    for ((try = 0; try < 300; try++)); do
+        "$@" && return
+        sleep 0.1
+    done
+    echo "never: $*"
+    screen
+    return 1
+}
+
+tmux_here() { tmux -S "$BATS_TEST_TMPDIR/tmux" -f /dev/null "$@"; }
+screen() { tmux_here capture-pane -p -t watch "$@" 2>/dev/null || cat out; }
+shows() { screen | grep -qF -- "$1"; }
+shows_not() { ! shows "$1"; }
+
+# A terminal with a shell in it.
+terminal() {
+    tmux_here new-session -d -s watch -x 100 -y 20 "env PS1='shell> ' sh"
+    eventually shows 'shell>'
+}
+
+keys() { tmux_here send-keys -t watch "$@"; }
+
+@test "shows the indicators and what changes, and gives the terminal back" {
+    terminal
+    keys "echo before; '$CIMHOST' watch --interval 0.1; echo status \$?; stty -a | grep -c ' echo '" Enter
+    eventually shows 'TAVRO_Glimmark in root/cimv2, 1 at '
+    shows_not before
+    shows '  Fan:/fan'
+    inventory 21 3
+    eventually shows '* Fan:/fan'
+    shows 'Degraded/Warning'
+    shows 'Fan:/fan: AlarmState from Off to Alternating'
+    screen -e | grep -qF $'\e[1m\e[33m* Fan'
+    tmux_here resize-window -t watch -x 30 -y 10
+    eventually shows_not 'AlarmState'
+    keys C-c
+    eventually shows 'status 0'
+    shows before
+    shows_not TAVRO_Glimmark
+    eventually shows 1
+}
+
+@test "stops and goes on as other programs do" {
+    terminal
+    keys "set -m; '$CIMHOST' watch" Enter
+    eventually shows 'TAVRO_Glimmark in root/cimv2, 1 at '
+    keys C-z
+    eventually shows 'shell>'
+    shows_not 'TAVRO_Glimmark in'
+    keys fg Enter
+    eventually shows 'TAVRO_Glimmark in root/cimv2, 1 at '
+    keys C-c
+    eventually shows_not 'TAVRO_Glimmark in'
+}
+
+@test "uses no colours where NO_COLOR asks for none" {
+    terminal
+    keys "NO_COLOR=1 '$CIMHOST' watch" Enter
+    eventually shows '  Fan:/fan'
+    run ! grep -qF $'\e[32m' <(screen -e)
+    keys C-c
+}
+
+@test "prints a line for each change where there is no terminal, and ends well at SIGTERM" {
+    "$CIMHOST" watch --interval 0.1 >out 3>&- &
+    watcher=$!
+    eventually grep -qE '^[0-9T:+-]+ Fan:/fan is there: HealthState OK, OperationalStatus OK, In Service, AlarmState Off$' out
+    inventory 1 2
+    eventually grep -qE '^[0-9T:+-]+ Fan:/fan: AlarmState from Off to Steady$' out
+    echo '{"nodes": []}' >inventory.new
+    mv inventory.new inventory.json
+    eventually grep -qE '^[0-9T:+-]+ Fan:/fan is gone$' out
+    [ "$(wc -l <out)" -eq 3 ]
+    kill -TERM "$watcher"
+    wait "$watcher"
+}
+
+@test "ends when nobody reads it any more" {
+    mkfifo pipe
+    "$CIMHOST" watch --interval 0.1 >pipe 3>&- &
+    watcher=$!
+    exec 4<pipe
+    read -r first <&4
+    [[ "$first" == *'Fan:/fan is there'* ]]
+    exec 4<&-
+    inventory 21 3
+    local status=0
+    wait "$watcher" || status=$?
+    [ "$status" -eq 1 ]
+}
+
+@test "a class that answers an error ends it at once" {
+    run -1 "$CIMHOST" watch CIM_Fan
+    [[ "$output" == *CMPI_RC_ERR_INVALID_CLASS* ]]
+}
