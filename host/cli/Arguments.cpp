@@ -252,7 +252,6 @@ void addWatch(CLI::App& app, Arguments& arguments)
         ->capture_default_str();
     command.add_option("--interval", arguments.interval, "Seconds from one look to the next")
         ->type_name("SECONDS")
-        ->check(CLI::Range(leastInterval, mostInterval))
         ->capture_default_str();
 }
 
@@ -268,6 +267,8 @@ cim::ObjectPath readClass(const std::string& command, const std::string& text, c
 Watch watchOf(const Arguments& arguments)
 {
     constexpr double millisecondsASecond = 1000;
+    if (!(arguments.interval >= leastInterval && arguments.interval <= mostInterval)) // nor is NaN one
+        throw UsageError("--interval: expected 0.1 to 86400 seconds");
     return {readClass("watch", arguments.watched, arguments.nameSpace),
             std::chrono::milliseconds(std::llround(arguments.interval * millisecondsASecond))};
 }
