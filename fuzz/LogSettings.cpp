@@ -1,5 +1,5 @@
-// The environment of the logging library, a variable a line: settings that can be used, and a complaint for each
-// variable that cannot.
+// The environment of the logging library, a variable a line: settings that can be used, and a complaint for
+// each variable that cannot.
 
 #include "FuzzTarget.h"
 
@@ -28,6 +28,7 @@ int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size)
     for (const std::string& category : settings.categories)
         Fuzz::require(!category.empty(), "a category has a name");
     MVLog::isWanted(settings.categories, "Mavrel.Glimmark");
-    Fuzz::require(settings.complaints.size() <= variables.size(), "there is one complaint a variable at most");
+    Fuzz::require(settings.complaints.size() <= variables.size(),
+                  "there is one complaint a variable at most");
     return 0;
 }

@@ -2,7 +2,7 @@
 # cimhost watch as a person and a pipe see it. The terminal is that of tmux.
 
 setup() {
-    cd "$BATS_TEST_TMPDIR"
+    cd "$BATS_TEST_TMPDIR" || exit
     export TAVRO_INVENTORY=$BATS_TEST_TMPDIR/inventory.json LC_ALL=C.UTF-8
     inventory 1 1
 }
