@@ -1,8 +1,11 @@
 #include "Allocations.h"
 
+#include <algorithm>
 #include <cstdlib>
 #include <limits>
 #include <new>
+
+#include <malloc.h>
 
 namespace Allocations {
 
@@ -14,6 +17,8 @@ struct State
     std::size_t bytes = std::numeric_limits<std::size_t>::max();
     bool failed = false;
     int pauses = 0;
+    bool counting = false;
+    Use use;
 };
 
 thread_local State state;
@@ -30,12 +35,36 @@ bool failsNow(std::size_t size)
     return true;
 }
 
+bool countsNow()
+{
+    return state.counting && state.pauses == 0;
+}
+
+/// \return null when there is no memory
 void* allocate(std::size_t size)
 {
     void* const memory = failsNow(size) ? nullptr : std::malloc(size > 0 ? size : 1);
+    if (memory != nullptr && countsNow()) {
+        ++state.use.count;
+        state.use.held += static_cast<std::ptrdiff_t>(malloc_usable_size(memory));
+        state.use.peak = std::max(state.use.peak, state.use.held);
+    }
+    return memory;
+}
+
+void* allocateOrThrow(std::size_t size)
+{
+    void* const memory = allocate(size);
     if (memory == nullptr)
         throw std::bad_alloc();
     return memory;
+}
+
+void release(void* memory)
+{
+    if (countsNow())
+        state.use.held -= static_cast<std::ptrdiff_t>(malloc_usable_size(memory));
+    std::free(memory);
 }
 
 } // namespace
@@ -59,6 +88,18 @@ bool stop()
     return failed;
 }
 
+void startCounting()
+{
+    state.use = Use();
+    state.counting = true;
+}
+
+Use stopCounting()
+{
+    state.counting = false;
+    return state.use;
+}
+
 Pause::Pause()
 {
     ++state.pauses;
@@ -72,16 +113,16 @@ Pause::~Pause()
 
 void* operator new(std::size_t size)
 {
-    return Allocations::allocate(size);
+    return Allocations::allocateOrThrow(size);
 }
 void* operator new[](std::size_t size)
 {
-    return Allocations::allocate(size);
+    return Allocations::allocateOrThrow(size);
 }
 
 void* operator new(std::size_t size, const std::nothrow_t& /*tag*/) noexcept
 {
-    return Allocations::failsNow(size) ? nullptr : std::malloc(size > 0 ? size : 1);
+    return Allocations::allocate(size);
 }
 
 void* operator new[](std::size_t size, const std::nothrow_t& tag) noexcept
@@ -91,17 +132,17 @@ void* operator new[](std::size_t size, const std::nothrow_t& tag) noexcept
 
 void operator delete(void* memory) noexcept
 {
-    std::free(memory);
+    Allocations::release(memory);
 }
 void operator delete[](void* memory) noexcept
 {
-    std::free(memory);
+    Allocations::release(memory);
 }
 void operator delete(void* memory, std::size_t) noexcept
 {
-    std::free(memory);
+    Allocations::release(memory);
 }
 void operator delete[](void* memory, std::size_t) noexcept
 {
-    std::free(memory);
+    Allocations::release(memory);
 }

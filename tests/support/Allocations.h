@@ -1,6 +1,6 @@
 /// \file
-/// Lets allocations of the tests' process fail: operator new of this executable stands before that of the
-/// run-time library, for the provider library too. All functions are about the calling thread alone.
+/// Lets allocations of this process fail, and counts them: operator new of this executable stands before that
+/// of the run-time library, for the provider library too. All functions are about the calling thread alone.
 #ifndef TESTS_SUPPORT_ALLOCATIONS_H
 #define TESTS_SUPPORT_ALLOCATIONS_H
 
@@ -17,7 +17,22 @@ void failFrom(std::size_t bytes);
 /// Lets none fail any more. \return whether one has failed
 bool stop();
 
-/// While it lives, allocations are neither counted nor do they fail: for what is not the library's.
+/// What was allocated and freed since startCounting().
+struct Use
+{
+    std::size_t count = 0;   ///< allocations
+    std::ptrdiff_t held = 0; ///< bytes in use, as the C library rounds them up
+    std::ptrdiff_t peak = 0; ///< the most bytes in use at a time
+};
+
+/// From now on, counts.
+void startCounting();
+
+/// Counts no more. \return what was counted
+Use stopCounting();
+
+/// While it lives, allocations are not counted and do not fail, and what is freed is not counted either: for
+/// what is not the library's.
 class Pause
 {
 public:

@@ -256,7 +256,7 @@ std::vector<std::string> ProviderFixture::timeline() const
 {
     const std::vector<std::string> flow = Logged::flow();
     const std::vector<std::string> calls = broker.calls();
-    const std::vector<std::size_t> linesBefore = broker.linesBeforeCalls();
+    const std::vector<std::size_t> linesBefore = broker.othersBeforeCalls();
     std::vector<std::string> all;
     std::size_t line = 0;
     for (std::size_t call = 0; call < calls.size(); ++call) {

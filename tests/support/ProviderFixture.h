@@ -111,7 +111,7 @@ protected:
     const CMPIResult* rslt() { return request->result(); }
 
     cimhost::Broker host;
-    RecordingBroker broker{host};
+    RecordingBroker broker{host, RecordedLog::count};
     std::unique_ptr<cimhost::Request> request;
 };
 

@@ -2,8 +2,6 @@
 
 #include "Allocations.h"
 
-#include "RecordedLog.h"
-
 #include <algorithm>
 #include <type_traits>
 
@@ -370,9 +368,10 @@ bool beginsWith(const std::string& call, const std::string& service)
 
 } // namespace
 
-RecordingBroker::RecordingBroker(cimhost::Broker& recordedBroker)
+RecordingBroker::RecordingBroker(cimhost::Broker& recordedBroker, std::size_t (*countOfOthers)())
     : broker(recordedBroker),
-      originalTables(recordedBroker.tables())
+      originalTables(recordedBroker.tables()),
+      othersSoFar(countOfOthers)
 {
     active = this;
     activeTables = &broker.tables();
@@ -400,7 +399,7 @@ void RecordingBroker::clear()
 {
     const std::lock_guard lock(mutex);
     recorded.clear();
-    linesBefore.clear();
+    othersBefore.clear();
     names.clear();
     counters.clear();
 }
@@ -419,10 +418,10 @@ std::vector<std::string> RecordingBroker::calls() const
     return recorded;
 }
 
-std::vector<std::size_t> RecordingBroker::linesBeforeCalls() const
+std::vector<std::size_t> RecordingBroker::othersBeforeCalls() const
 {
     const std::lock_guard lock(mutex);
-    return linesBefore;
+    return othersBefore;
 }
 
 std::vector<std::string> RecordingBroker::calls(const std::vector<std::string>& services) const
@@ -465,7 +464,7 @@ std::optional<Failure> RecordingBroker::record(const std::string& service,
         call += (i == 0 ? "" : ", ") + arguments[i];
     const std::lock_guard lock(mutex);
     recorded.push_back(call + ")");
-    linesBefore.push_back(RecordedLog::count());
+    othersBefore.push_back(othersSoFar != nullptr ? othersSoFar() : 0);
     std::optional<Failure> failure;
     for (Plan& plan : plans) {
         if ((plan.service.empty() || plan.service == service) && --plan.remaining == 0)

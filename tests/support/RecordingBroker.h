@@ -36,7 +36,9 @@ enum class Failure
 class RecordingBroker
 {
 public:
-    explicit RecordingBroker(cimhost::Broker& broker);
+    /// \param othersSoFar  the number of other things that were recorded so far, asked at each call; may be
+    /// null
+    explicit RecordingBroker(cimhost::Broker& broker, std::size_t (*othersSoFar)() = nullptr);
     ~RecordingBroker();
     RecordingBroker(const RecordingBroker&) = delete;
     RecordingBroker& operator=(const RecordingBroker&) = delete;
@@ -52,8 +54,8 @@ public:
 
     std::vector<std::string> calls() const;
 
-    /// For each of calls(), how many lines the logging library had been given before it.
-    std::vector<std::size_t> linesBeforeCalls() const;
+    /// For each of calls(), how many other things had been recorded before it.
+    std::vector<std::size_t> othersBeforeCalls() const;
 
     /// Those calls that begin with one of the services' names.
     std::vector<std::string> calls(const std::vector<std::string>& services) const;
@@ -85,9 +87,10 @@ private:
 
     cimhost::Broker& broker;
     cimhost::FunctionTables originalTables;
+    std::size_t (*othersSoFar)();
     mutable std::mutex mutex;
     std::vector<std::string> recorded;
-    std::vector<std::size_t> linesBefore;
+    std::vector<std::size_t> othersBefore;
     std::map<const void*, std::string> names;
     std::map<const void*, std::string> givenNames;
     std::map<std::string, int> counters;

@@ -1,0 +1,73 @@
+/// \file
+/// Two things measured in turn: each iteration of a benchmark is a pair, one run of the first and one of the
+/// second, and what is told of the pairs is the median, of both times and of the ratio of each pair.
+#ifndef BENCH_PAIRS_H
+#define BENCH_PAIRS_H
+
+#include <algorithm>
+#include <cstddef>
+#include <ctime>
+#include <vector>
+
+#include <benchmark/benchmark.h>
+
+namespace bench {
+
+inline double median(std::vector<double> values)
+{
+    const auto middle = values.begin() + static_cast<std::ptrdiff_t>(values.size() / 2);
+    std::nth_element(values.begin(), middle, values.end());
+    return *middle;
+}
+
+/// The processor's time that this thread has had: what others do on the machine is not in it.
+inline double threadSeconds()
+{
+    timespec time{};
+    clock_gettime(CLOCK_THREAD_CPUTIME_ID, &time);
+    return static_cast<double>(time.tv_sec) + static_cast<double>(time.tv_nsec) * 1e-9;
+}
+
+template <class Run>
+double secondsOf(Run run)
+{
+    const double begin = threadSeconds();
+    run();
+    return threadSeconds() - begin;
+}
+
+/// Lets the benchmark run pairs, and counts them out. \param first, second  each runs once and returns
+/// seconds
+template <class First, class Second>
+void comparePairs(benchmark::State& state, First first, Second second)
+{
+    std::vector<double> firsts;
+    std::vector<double> seconds;
+    std::vector<double> ratios;
+    first(); // what is made once, on both sides
+    second();
+    bool firstGoesFirst = true;
+    for ([[maybe_unused]] auto _ : state) {
+        double a = 0;
+        double b = 0;
+        if (firstGoesFirst) {
+            a = first();
+            b = second();
+        } else {
+            b = second();
+            a = first();
+        }
+        firstGoesFirst = !firstGoesFirst;
+        firsts.push_back(a);
+        seconds.push_back(b);
+        ratios.push_back(a / b);
+        state.SetIterationTime(a + b);
+    }
+    state.counters["first_ns"] = median(firsts) * 1e9;
+    state.counters["second_ns"] = median(seconds) * 1e9;
+    state.counters["ratio"] = median(ratios);
+}
+
+} // namespace bench
+
+#endif
