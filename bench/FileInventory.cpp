@@ -32,6 +32,7 @@ public:
 
 } // namespace
 
+// NOLINTNEXTLINE(performance-unnecessary-value-param): the signature is that of the inventory in memory
 void MadeInventory::set(std::vector<Node> nodes)
 {
     static const InventoryFile file;
