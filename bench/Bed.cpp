@@ -1,6 +1,7 @@
 #include "Bed.h"
 
 #include <cstdlib>
+#include <stdexcept>
 
 namespace cim = cimhost::cim;
 
@@ -10,24 +11,22 @@ namespace {
 
 cimhost::Broker makeHost()
 {
-    ::setenv("TAVRO_COMPUTER_SYSTEMS", "alpha", 1);
+    ::setenv("TAVRO_COMPUTER_SYSTEMS", "one", 1);
     return {cimhost::readRegistrationFile(BENCH_COMPUTER_SYSTEM_REGISTRATION), {BENCH_PROVIDER_DIRECTORY}};
 }
 
-/// What the operation makes of a path: runs it once, on an empty inventory.
+/// The path that the operation asks for: runs it once, on an empty inventory.
 cim::ObjectPath pathOf(const Operation& operation, cimhost::Broker& host)
 {
-    cim::ObjectPath asked{"", "root/cimv2", "", {}};
+    cim::ObjectPath path;
     cimhost::Request request(host);
-    const auto makePath = [&](const std::string& className, const std::string& key,
-                              const std::string& value) {
-        asked.className = className;
-        if (!key.empty())
-            asked.keys.push_back({key, {CMPI_string, false, {value}}});
-        return request.path(asked);
+    const auto makePath = [&](const cim::ObjectPath& wanted) {
+        path = wanted;
+        path.nameSpace = "root/cimv2";
+        return request.path(path);
     };
     operation.run({host.cmpiBroker(), request.context(), request.result(), makePath});
-    return asked;
+    return path;
 }
 
 } // namespace
@@ -37,8 +36,12 @@ std::vector<Task> allTasks()
     MadeInventory::set({});
     cimhost::Broker host = makeHost();
     std::vector<Task> tasks;
-    for (const Operation& operation : allOperations())
-        tasks.push_back({operation, floorOf(operation.name), pathOf(operation, host)});
+    for (const Operation& operation : allOperations()) {
+        if (const FloorOperation floor = floorOf(operation.name))
+            tasks.push_back({operation, floor, pathOf(operation, host)});
+    }
+    if (tasks.size() != floorCount())
+        throw std::logic_error("a floor is that of no operation");
     return tasks;
 }
 

@@ -23,7 +23,7 @@ struct Task
     cimhost::cim::ObjectPath path;
 };
 
-/// Every operation of tests/support/Operations.h.
+/// Every operation of tests/support/Operations.h that has a floor.
 std::vector<Task> allTasks();
 
 enum class Side

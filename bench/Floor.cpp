@@ -228,11 +228,20 @@ void returnDone(const FloorRequest& request)
     request.rslt->ft->returnDone(request.rslt);
 }
 
-/// Compares the path of each instance with the request's, which is that of none of them.
+/// Compares the path of each instance with the request's, which is that of none but the last of them.
 void compareAll(const Instances& instances, bool deep, const FloorRequest& request, CMPIStatus* rc)
 {
     for (const CMPIInstance* instance : instances)
         Tavro::isObjPathsEqual(request.ref, objectPathOf(instance, rc), deep);
+}
+
+/// Compares deep, and returns the last instance if it is the one asked for.
+void compareAndReturn(const Instances& instances, bool lastIsAsked, const FloorRequest& request,
+                      CMPIStatus* rc)
+{
+    compareAll(instances, true, request, rc);
+    if (lastIsAsked)
+        returnInstance(instances.back(), request);
 }
 
 // Collections.
@@ -599,10 +608,13 @@ void enumerateElements(const FloorRequest& request)
     returnDone(request);
 }
 
+/// \tparam Named  whether the request names the last of the instances, or none
+template <bool Named>
 void getElement(const FloorRequest& request)
 {
     static Flow flow(elements, "GlimmarkElementCapabilities_GetInstance");
-    get(flow, request, false, [&](CMPIStatus* rc) { compareAll(makeElements(request), true, request, rc); });
+    get(flow, request, false,
+        [&](CMPIStatus* rc) { compareAndReturn(makeElements(request), Named, request, rc); });
 }
 
 // Instance operations of the system devices.
@@ -677,11 +689,13 @@ void enumerateSystemDevices(const FloorRequest& request)
     returnDone(request);
 }
 
+/// \tparam Named  whether the request names the last of the instances, or none
+template <bool Named>
 void getSystemDevice(const FloorRequest& request)
 {
     static Flow flow(systems, "GlimmarkSystemDevice_GetInstance");
     get(flow, request, true,
-        [&](CMPIStatus* rc) { compareAll(makeSystemDevices(request), true, request, rc); });
+        [&](CMPIStatus* rc) { compareAndReturn(makeSystemDevices(request), Named, request, rc); });
 }
 
 // Traversals.
@@ -941,9 +955,7 @@ void systemReferenceNames(const FloorRequest& request)
     });
 }
 
-} // namespace
-
-FloorOperation floorOf(const std::string& name)
+const std::map<std::string, FloorOperation>& floors()
 {
     static const std::map<std::string, FloorOperation> operations = {
         {"TAVRO_Glimmark_EnumInstanceNames", enumerateDeviceNames},
@@ -957,10 +969,12 @@ FloorOperation floorOf(const std::string& name)
         {"TAVRO_GlimmarkCapabilities_GetInstance_ByPath", getCapabilitiesByPath},
         {"TAVRO_GlimmarkElementCapabilities_EnumInstanceNames", enumerateElementNames},
         {"TAVRO_GlimmarkElementCapabilities_EnumInstances", enumerateElements},
-        {"TAVRO_GlimmarkElementCapabilities_GetInstance_ByPath", getElement},
+        {"TAVRO_GlimmarkElementCapabilities_GetInstance_ByPath", getElement<true>},
+        {"TAVRO_GlimmarkElementCapabilities_GetInstance_OfNothing", getElement<false>},
         {"TAVRO_GlimmarkSystemDevice_EnumInstanceNames", enumerateSystemDeviceNames},
         {"TAVRO_GlimmarkSystemDevice_EnumInstances", enumerateSystemDevices},
-        {"TAVRO_GlimmarkSystemDevice_GetInstance_ByPath", getSystemDevice},
+        {"TAVRO_GlimmarkSystemDevice_GetInstance_ByPath", getSystemDevice<true>},
+        {"TAVRO_GlimmarkSystemDevice_GetInstance_OfNothing", getSystemDevice<false>},
         {"TAVRO_GlimmarkElementCapabilities_Associators_From_TAVRO_Glimmark", elementAssociators<false>},
         {"TAVRO_GlimmarkElementCapabilities_AssociatorNames_From_TAVRO_Glimmark",
          elementAssociatorNames<false>},
@@ -984,7 +998,20 @@ FloorOperation floorOf(const std::string& name)
         {"TAVRO_GlimmarkSystemDevice_References_From_TAVRO_ComputerSystem", systemReferences<true>},
         {"TAVRO_GlimmarkSystemDevice_ReferenceNames_From_TAVRO_ComputerSystem", systemReferenceNames<true>},
     };
-    return operations.at(name);
+    return operations;
+}
+
+} // namespace
+
+FloorOperation floorOf(const std::string& name)
+{
+    const auto found = floors().find(name);
+    return found != floors().end() ? found->second : nullptr;
+}
+
+std::size_t floorCount()
+{
+    return floors().size();
 }
 
 void collectOnly(const FloorRequest& request)

@@ -8,6 +8,7 @@
 
 #include "Indicators.h"
 
+#include <cstddef>
 #include <string>
 
 #include <cmpift.h>
@@ -27,8 +28,11 @@ struct FloorRequest
 using FloorOperation = void (*)(const FloorRequest& request);
 
 /// \param name  that of an operation of tests/support/Operations.h
-/// \return never null: an operation without a floor throws std::out_of_range
+/// \return null for one without a floor: those that are asked for nothing there is have none
 FloorOperation floorOf(const std::string& name);
+
+/// How many operations have a floor.
+std::size_t floorCount();
 
 /// The collection of the indicators alone: reading them from the inventory, without anything of the broker.
 void collectOnly(const FloorRequest& request);
