@@ -72,6 +72,12 @@ if(NOT GLIMMARK_SANITIZE AND NOT GLIMMARK_COVERAGE AND NOT CMAKE_CXX_FLAGS MATCH
                                                        $<${GLIMMARK_FORTIFY}:-D_FORTIFY_SOURCE=2>)
 endif()
 
+# What is shipped is the same whichever folder it is built in. Debuggers and the counting of lines want the folder.
+set(CMAKE_BUILD_RPATH_USE_ORIGIN ON)
+if(NOT GLIMMARK_COVERAGE)
+    add_compile_options($<$<NOT:$<CONFIG:Debug>>:-ffile-prefix-map=${PROJECT_SOURCE_DIR}=.>)
+endif()
+
 if(GLIMMARK_SANITIZE)
     add_compile_options(-fsanitize=${GLIMMARK_SANITIZE} -fno-sanitize-recover=all -fno-omit-frame-pointer)
     add_link_options(-fsanitize=${GLIMMARK_SANITIZE})

@@ -1,0 +1,133 @@
+#!/usr/bin/env bats
+# The packages in PACKAGES, and those of another run in AGAIN. SOURCE is the folder that they were built in.
+
+# The order of the lists.
+export LC_ALL=C
+lists=$BATS_TEST_DIRNAME
+
+setup_file() {
+    export TREE=$BATS_FILE_TMPDIR/tree RPM_TREE=$BATS_FILE_TMPDIR/rpm-tree
+    mkdir "$TREE" "$RPM_TREE"
+    local package
+    for package in "$PACKAGES"/*.deb; do
+        dpkg-deb -x "$package" "$TREE"
+    done
+    for package in "$PACKAGES"/*.rpm; do
+        rpm2archive - <"$package" | tar -xz -C "$RPM_TREE"
+    done
+}
+
+triplet() { dpkg-architecture -q DEB_HOST_MULTIARCH; }
+
+# asks ARGUMENT...: the unpacked cimhost, with nothing set but the inventory
+asks() {
+    env -u LD_LIBRARY_PATH -u CIMHOST_PROVIDER_DIR -u CIMHOST_REGISTRATION \
+        "$TREE/usr/bin/cimhost" --inventory "$TREE/usr/share/glimmark-provider/inventories/small-server.json" "$@"
+}
+
+files_of_debian_packages() {
+    local package name
+    for package in "$PACKAGES"/*.deb; do
+        name=$(dpkg-deb -f "$package" Package)
+        dpkg-deb -c "$package" | sed "s|$(triplet)|TRIPLET|" |
+            awk -v name="$name" '$1 !~ /^d/ { print name, $1, $2, substr($6, 2), $7, $8 }' | sed 's/ *$//'
+    done | sort
+}
+
+files_of_rpm_packages() {
+    rpm -qp --qf '[%{=NAME} %{FILEMODES:perms} %{FILEUSERNAME}/%{FILEGROUPNAME} %{FILENAMES} %{FILELINKTOS}\n]' \
+        "$PACKAGES"/*.rpm | sed 's/ *$//' | sort
+}
+
+@test "the Debian packages have these files and no others" {
+    diff "$lists/debian-files" <(files_of_debian_packages)
+}
+
+@test "the RPM packages have these files and no others" {
+    diff "$lists/rpm-files" <(files_of_rpm_packages)
+}
+
+depends() { dpkg-deb -f "$PACKAGES/$1"_*.deb Depends | sed 's/ *([^)]*)//g; s/, /\n/g' | sort | paste -sd ' '; }
+
+@test "the Debian packages depend on what they load" {
+    [ "$(depends glimmark-provider)" = \
+        "libc6 libgcc-s1 libmvlog1 libstdc++6 libtavro-common1 libtavro-instrumentation1 libtavro-locale1" ]
+    [ "$(depends glimmark-computer-system)" = "libc6 libgcc-s1 libstdc++6 libtavro-common1" ]
+    [ "$(depends libtavro-instrumentation1)" = "libc6 libgcc-s1 libmvlog1 libstdc++6" ]
+    [ "$(depends libtavro-dev)" = "libmvlog1 libtavro-common1 libtavro-instrumentation1 libtavro-locale1" ]
+    [[ " $(depends cimhost) " == *" libstdc++6 "* ]]
+}
+
+@test "another package can stand for each support library" {
+    for library in tavro-instrumentation tavro-common tavro-locale mvlog; do
+        # A version here would shut out a package that provides the name.
+        [[ $(dpkg-deb -f "$PACKAGES"/glimmark-provider_*.deb Depends) =~ (^|, )lib${library}1(,|$) ]]
+        [ "$(dpkg-deb -I "$PACKAGES/lib${library}1"_*.deb shlibs)" = "lib$library 1 lib${library}1" ]
+        rpm -qp --requires "$PACKAGES"/glimmark-provider-*.rpm | grep -qxF "lib$library.so.1()(64bit)"
+        rpm -qp --provides "$PACKAGES/lib${library}1"-*.rpm | grep -qxF "lib$library.so.1()(64bit)"
+    done
+}
+
+@test "every package says what it is" {
+    for package in "$PACKAGES"/*.deb; do
+        dpkg-deb -f "$package" Description | head -n 1
+        [ "$(dpkg-deb -f "$package" Maintainer)" = "Tavro <glimmark@tavro.example>" ]
+    done >"$BATS_TEST_TMPDIR/descriptions"
+    [ "$(sort -u "$BATS_TEST_TMPDIR/descriptions" | wc -l)" -eq 8 ]
+}
+
+@test "the provider answers from the unpacked packages" {
+    [ "$(asks ein TAVRO_Glimmark | grep -c 'TAVRO_Glimmark.CreationClassName=')" -eq 13 ]
+    [ "$(asks ein TAVRO_GlimmarkElementCapabilities | wc -l)" -eq 13 ]
+    [ "$(asks ein TAVRO_GlimmarkSystemDevice | wc -l)" -eq 13 ]
+    [ "$(asks ai 'TAVRO_GlimmarkCapabilities.InstanceID="TAVRO:GlimmarkCapabilities1"' \
+        -ac TAVRO_GlimmarkElementCapabilities --format mof | grep -c '^instance of TAVRO_Glimmark$')" -eq 13 ]
+}
+
+@test "it loads the libraries of the packages and no others of the project's" {
+    LD_LIBRARY_PATH='' ldd "$TREE/usr/lib/$(triplet)/cmpi/libGlimmarkProvider.so" >"$BATS_TEST_TMPDIR/loaded"
+    for library in tavro-instrumentation tavro-common tavro-locale mvlog; do
+        file=$(awk -v name="lib$library.so.1" '$1 == name { print $3 }' "$BATS_TEST_TMPDIR/loaded")
+        [ "$(readlink -f "$file")" = "$(readlink -f "$TREE/usr/lib/$(triplet)/lib$library.so.1")" ]
+    done
+}
+
+@test "the unpacked glimmark-register finds its files" {
+    mkdir -p "$BATS_TEST_TMPDIR/bin" "$BATS_TEST_TMPDIR/stage"
+    for tool in sfcbstage sfcbrepos; do
+        printf '#!/bin/sh\n' >"$BATS_TEST_TMPDIR/bin/$tool"
+        chmod +x "$BATS_TEST_TMPDIR/bin/$tool"
+    done
+    PATH=$BATS_TEST_TMPDIR/bin:$PATH run "$TREE/usr/sbin/glimmark-register" --broker sfcb \
+        --stage-dir "$BATS_TEST_TMPDIR/stage" --dry-run register
+    [ "$status" -eq 0 ]
+    [[ $output == *"$TREE/usr/share/glimmark-provider/schema/TAVRO_Glimmark.mof"* ]]
+}
+
+# Programs and libraries in a tree.
+binaries() { find "$1" -type f \( -name '*.so*' -o -path '*/bin/*' \); }
+
+@test "no debug information, and nothing of the folder of the build" {
+    [ "$(binaries "$TREE" | wc -l)" -eq 7 ]
+    for file in $(binaries "$TREE"); do
+        [ "$(readelf --wide --sections "$file" | grep -c '\.debug_')" -eq 0 ]
+        [ "$(strings --all "$file" | grep -cF "$SOURCE")" -eq 0 ]
+    done
+    [ "$(grep -rlF "$SOURCE" "$TREE" | wc -l)" -eq 0 ]
+}
+
+@test "packages that are built twice are the same" {
+    diff <(cd "$PACKAGES" && ls) <(cd "$AGAIN" && ls)
+    for package in "$PACKAGES"/*; do
+        cmp "$package" "$AGAIN/${package##*/}"
+    done
+}
+
+# The two kinds of package come from two folders of the build. The way to the catalogues, which is another in each kind,
+# is compiled into the locale library, that to the providers into cimhost.
+@test "libraries that are built in two folders are the same" {
+    for file in libtavro-instrumentation.so.1 libtavro-common.so.1 libmvlog.so.1 \
+        cmpi/libGlimmarkProvider.so cmpi/libTavroComputerSystem.so; do
+        cmp "$TREE/usr/lib/$(triplet)/$file" "$RPM_TREE/usr/lib64/$file"
+    done
+}
