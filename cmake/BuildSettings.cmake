@@ -75,7 +75,9 @@ endif()
 # What is shipped is the same whichever folder it is built in. Debuggers and the counting of lines want the folder.
 set(CMAKE_BUILD_RPATH_USE_ORIGIN ON)
 if(NOT GLIMMARK_COVERAGE)
-    add_compile_options($<$<NOT:$<CONFIG:Debug>>:-ffile-prefix-map=${PROJECT_SOURCE_DIR}=.>)
+    # Of two that match, the compiler takes the later.
+    add_compile_options($<$<NOT:$<CONFIG:Debug>>:-ffile-prefix-map=${PROJECT_SOURCE_DIR}=.>
+                        $<$<NOT:$<CONFIG:Debug>>:-ffile-prefix-map=${PROJECT_BINARY_DIR}=build>)
 endif()
 
 if(GLIMMARK_SANITIZE)

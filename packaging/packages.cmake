@@ -57,9 +57,9 @@ where no provider of the server's maker does.")
 glimmark_package(
     tavro-instrumentation libtavro-instrumentation1 libs "hardware inventory of the Glimmark provider, stand-in"
     "Stands in for the support library of a server's maker: reads the hardware
-inventory from a file. Sample inventories come along.")
+inventory from sysfs or a file. Sample inventories come along.")
 glimmark_package(
-    tavro-common libtavro-common1 libs "helpers of the Glimmark provider, stand-in"
+    tavro-common libtavro-common1 libs "common functions of the Glimmark provider, stand-in"
     "Stands in for the support library of a server's maker: host name and comparison
 of object paths.")
 glimmark_package(
@@ -67,7 +67,7 @@ glimmark_package(
     "Stands in for the support library of a server's maker: texts in the language
 of the process.")
 glimmark_package(
-    mvlog libmvlog1 libs "log of the Glimmark provider, stand-in"
+    mvlog libmvlog1 libs "logging of the Glimmark provider, stand-in"
     "Stands in for the support library of a server's maker: log and trace lines to
 standard error or a file.")
 if(GLIMMARK_PACKAGES STREQUAL "DEB")
@@ -104,8 +104,9 @@ set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS_PRIVATE_DIRS ${CMAKE_LIBRARY_OUTPUT_DIRECTORY
 set(support_packages "libtavro-instrumentation1, libtavro-common1, libtavro-locale1, libmvlog1")
 set(CPACK_DEBIAN_PROVIDER_PACKAGE_DEPENDS "${support_packages}")
 set(CPACK_DEBIAN_PROVIDER_PACKAGE_SUGGESTS cimhost)
-set(CPACK_DEBIAN_COMPUTER-SYSTEM_PACKAGE_DEPENDS libtavro-common1)
+set(CPACK_DEBIAN_COMPUTER-SYSTEM_PACKAGE_DEPENDS "libtavro-common1, libtavro-locale1")
 set(CPACK_DEBIAN_TAVRO-INSTRUMENTATION_PACKAGE_DEPENDS libmvlog1)
+set(CPACK_DEBIAN_TAVRO-LOCALE_PACKAGE_DEPENDS libmvlog1)
 set(CPACK_DEBIAN_SUPPORT-DEVELOPMENT_PACKAGE_DEPENDS "${support_packages}")
 set(CPACK_DEBIAN_CIMHOST_PACKAGE_RECOMMENDS glimmark-provider)
 foreach(library tavro-instrumentation tavro-common tavro-locale mvlog)
@@ -124,12 +125,18 @@ set(CPACK_RPM_SUPPORT-DEVELOPMENT_PACKAGE_REQUIRES
 # Folders of the distribution's.
 set(CPACK_RPM_EXCLUDE_FROM_AUTO_FILELIST_ADDITION
     /usr/sbin
+    /usr/share/locale
     /usr/lib64/cmake
     /usr/lib64/cmpi
     /usr/lib64/pkgconfig
     /usr/share/man
     /usr/share/man/man1
     /usr/share/man/man8)
+get_property(languages GLOBAL PROPERTY GLIMMARK_LANGUAGES)
+foreach(language IN LISTS languages)
+    list(APPEND CPACK_RPM_EXCLUDE_FROM_AUTO_FILELIST_ADDITION /usr/share/locale/${language}
+         /usr/share/locale/${language}/LC_MESSAGES)
+endforeach()
 set(CPACK_RPM_PACKAGE_LICENSE "All rights reserved")
 # Without the machine, the folder and the hour of the build.
 set(CPACK_RPM_SPEC_MORE_DEFINE
