@@ -61,7 +61,9 @@ CMPIStatus GlimmarkCapabilities_EnumInstances(CMPIInstanceMI* mi, const CMPICont
     const GlimmarkFactory factory(false, true);
     std::vector<CMPIInstance*> instances;
     reserveFor(factory, instances);
-    factory.getAllGlimmarkCapabilitiesCMPIInstances(broker, ref, properties, false, instances, &status);
+    if (factory.getAllGlimmarkCapabilitiesCMPIInstances(broker, ref, properties, false, instances, &status) !=
+        0)
+        return status;
     returnInstances(rslt, instances);
 
     Cmpi::returnDone(rslt);
@@ -85,16 +87,25 @@ int returnByInstanceID(const CMPIResult* rslt, const CMPIObjectPath* cop, CMPISt
     return result;
 }
 
-/// Makes the instances among which the path asked for is searched. \return the factory's result
-int searchByPath(const CMPIObjectPath* cop, const char** properties, CMPIStatus& status)
+/// Returns every instance whose whole path is the one asked for. \return the factory's result
+int returnByPath(const CMPIResult* rslt, const CMPIObjectPath* cop, const char** properties,
+                 CMPIStatus& status)
 {
-    // Meant: collected are the alarm devices and not the capabilities, so that there is nothing to compare
-    // and this way finds nothing. A client without the InstanceID is told "not found" by its broker.
+    // Meant: collected are the alarm devices and not the capabilities, so that this way finds nothing. A
+    // client without the InstanceID is told "not found" by its broker.
     const GlimmarkFactory factory(true, false);
     std::vector<CMPIInstance*> instances;
     reserveFor(factory, instances);
-    return factory.getAllGlimmarkCapabilitiesCMPIInstances(broker, cop, properties, false, instances,
-                                                           &status);
+    const int result =
+        factory.getAllGlimmarkCapabilitiesCMPIInstances(broker, cop, properties, false, instances, &status);
+    if (result == 0) {
+        // Unlike the alarm device provider, the walk goes on after a match.
+        forEach(instances, [&](const CMPIInstance* instance) {
+            if (isAt(instance, cop, false, status))
+                Cmpi::returnInstance(rslt, instance);
+        });
+    }
+    return result;
 }
 
 } // namespace
@@ -115,7 +126,7 @@ CMPIStatus GlimmarkCapabilities_GetInstance(CMPIInstanceMI* mi, const CMPIContex
         CMPIString* const instanceID = Cmpi::stringKeyOf(cop, "InstanceID", &status);
         const int result = instanceID != nullptr
                                ? returnByInstanceID(rslt, cop, instanceID, properties, status)
-                               : searchByPath(cop, properties, status);
+                               : returnByPath(rslt, cop, properties, status);
         if (result != 0)
             return status;
     }

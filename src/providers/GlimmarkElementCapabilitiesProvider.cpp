@@ -249,21 +249,30 @@ FarEnd farEndOf(const CMPIObjectPath* target, CMPIStatus* rc)
 int getFarPaths(const GlimmarkFactory& factory, FarEnd farEnd, const CMPIObjectPath* ref,
                 std::vector<CMPIObjectPath*>& paths, CMPIStatus* rc)
 {
-    if (farEnd == FarEnd::glimmarks)
+    switch (farEnd) {
+    case FarEnd::glimmarks:
         return factory.getAllGlimmarkCMPIObjPaths(broker, ref, paths, rc);
-    if (farEnd == FarEnd::capabilities)
+    case FarEnd::capabilities:
         return factory.getAllGlimmarkCapabilitiesCMPIObjPaths(broker, ref, paths, rc);
+    case FarEnd::neither:
+        break;
+    }
     return 0;
 }
 
-/// Appends the far end's instances; none for neither class.
-void getFarInstances(const GlimmarkFactory& factory, FarEnd farEnd, const CMPIObjectPath* ref,
-                     const char** properties, std::vector<CMPIInstance*>& instances, CMPIStatus* rc)
+/// Appends the far end's instances. \return the factory's result; 0 for neither class
+int getFarInstances(const GlimmarkFactory& factory, FarEnd farEnd, const CMPIObjectPath* ref,
+                    const char** properties, std::vector<CMPIInstance*>& instances, CMPIStatus* rc)
 {
-    if (farEnd == FarEnd::glimmarks)
-        factory.getAllGlimmarkCMPIInstances(broker, ref, properties, false, instances, rc);
-    else if (farEnd == FarEnd::capabilities)
-        factory.getAllGlimmarkCapabilitiesCMPIInstances(broker, ref, properties, false, instances, rc);
+    switch (farEnd) {
+    case FarEnd::glimmarks:
+        return factory.getAllGlimmarkCMPIInstances(broker, ref, properties, false, instances, rc);
+    case FarEnd::capabilities:
+        return factory.getAllGlimmarkCapabilitiesCMPIInstances(broker, ref, properties, false, instances, rc);
+    case FarEnd::neither:
+        break;
+    }
+    return 0;
 }
 
 /// The association of the request's path with one far path. No key is compared: each far object belongs to
@@ -423,7 +432,8 @@ CMPIStatus GlimmarkElementCapabilities_Associators(CMPIAssociationMI* mi, const 
         fail(status, "Object Path is NULL in Associators.", "Object Path is NULL in Associators.");
         return status;
     }
-    getFarInstances(factory, farEndOf(target, &status), ref, properties, farInstances, &status);
+    if (getFarInstances(factory, farEndOf(target, &status), ref, properties, farInstances, &status) != 0)
+        return status;
     returnInstances(rslt, farInstances);
 
     flow.exiting(parameters());

@@ -57,7 +57,8 @@ CMPIStatus Glimmark_EnumInstances(CMPIInstanceMI* mi, const CMPIContext* ctx, co
     const GlimmarkFactory factory(true, false);
     std::vector<CMPIInstance*> instances;
     reserveFor(factory, instances);
-    factory.getAllGlimmarkCMPIInstances(broker, ref, properties, false, instances, &status);
+    if (factory.getAllGlimmarkCMPIInstances(broker, ref, properties, false, instances, &status) != 0)
+        return status;
     returnInstances(rslt, instances);
 
     Cmpi::returnDone(rslt);
@@ -90,7 +91,8 @@ int returnByPath(const CMPIResult* rslt, const CMPIObjectPath* cop, const char**
     reserveFor(factory, instances);
     const int result =
         factory.getAllGlimmarkCMPIInstances(broker, cop, properties, false, instances, &status);
-    returnFirstAt(rslt, instances, cop, false, status);
+    if (result == 0)
+        returnFirstAt(rslt, instances, cop, false, status);
     return result;
 }
 

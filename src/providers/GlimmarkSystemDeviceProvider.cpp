@@ -261,10 +261,14 @@ bool isWanted(FarEnd farEnd, const char* resultClass)
     const auto is = [&](const char* name) { return strcasecmp(resultClass, name) == 0; };
     if (resultClass == nullptr)
         return true;
-    if (farEnd == FarEnd::computerSystems)
+    switch (farEnd) {
+    case FarEnd::computerSystems:
         return is(ComputerSystemClass) || is("CIM_ComputerSystem");
-    if (farEnd == FarEnd::glimmarks)
+    case FarEnd::glimmarks:
         return is(GlimmarkClass) || is("CIM_AlarmDevice");
+    case FarEnd::neither:
+        break;
+    }
     return true;
 }
 
@@ -369,7 +373,8 @@ CMPIStatus GlimmarkSystemDevice_Associators(CMPIAssociationMI* mi, const CMPICon
     } else if (farEnd == FarEnd::glimmarks) {
         std::vector<CMPIInstance*> devices;
         reserveFor(factory, devices);
-        factory.getAllGlimmarkCMPIInstances(broker, ref, properties, false, devices, &status);
+        if (factory.getAllGlimmarkCMPIInstances(broker, ref, properties, false, devices, &status) != 0)
+            return status;
         forEach(devices, [&](const CMPIInstance* device) {
             if (device != nullptr)
                 Cmpi::returnInstance(rslt, device);
