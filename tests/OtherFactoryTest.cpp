@@ -23,10 +23,10 @@ using ::testing::StartsWith;
 
 namespace {
 
-/// What stands for getting all instances of either class.
-using GetAll =
+/// What stands for getting the instances of either class, one or all.
+using GetInstances =
     std::function<int(const CMPIBroker*, const CMPIObjectPath*, std::vector<CMPIInstance*>&, CMPIStatus*)>;
-GetAll getAll;
+GetInstances getInstances;
 
 } // namespace
 
@@ -36,7 +36,7 @@ int GlimmarkFactory::getAllGlimmarkCMPIInstances(const CMPIBroker* broker, const
                                                  const char** /*properties*/, bool /*isObjPath*/,
                                                  std::vector<CMPIInstance*>& instances, CMPIStatus* rc) const
 {
-    return getAll(broker, ref, instances, rc);
+    return getInstances(broker, ref, instances, rc);
 }
 
 int GlimmarkFactory::getAllGlimmarkCapabilitiesCMPIInstances(const CMPIBroker* broker,
@@ -45,7 +45,23 @@ int GlimmarkFactory::getAllGlimmarkCapabilitiesCMPIInstances(const CMPIBroker* b
                                                              std::vector<CMPIInstance*>& instances,
                                                              CMPIStatus* rc) const
 {
-    return getAll(broker, ref, instances, rc);
+    return getInstances(broker, ref, instances, rc);
+}
+
+int GlimmarkFactory::getOneGlimmarkCMPIInstance(const CMPIBroker* broker, const CMPIObjectPath* ref,
+                                                CMPIString* /*key*/, const char** /*properties*/,
+                                                std::vector<CMPIInstance*>& instances, CMPIStatus* rc) const
+{
+    return getInstances(broker, ref, instances, rc);
+}
+
+int GlimmarkFactory::getOneGlimmarkCapabilitiesCMPIInstance(const CMPIBroker* broker,
+                                                            const CMPIObjectPath* ref, CMPIString* /*key*/,
+                                                            const char** /*properties*/,
+                                                            std::vector<CMPIInstance*>& instances,
+                                                            CMPIStatus* rc) const
+{
+    return getInstances(broker, ref, instances, rc);
 }
 
 } // namespace Tavro::GlimmarkProvider
@@ -69,7 +85,7 @@ class OperationsOfAFailingFactory : public ProviderFixture, public ::testing::Wi
 {
 protected:
     OperationsOfAFailingFactory() { MadeInventory::set({{"b", "2"}}); }
-    ~OperationsOfAFailingFactory() override { getAll = nullptr; }
+    ~OperationsOfAFailingFactory() override { getInstances = nullptr; }
 
     static Operation operation()
     {
@@ -80,9 +96,10 @@ protected:
 };
 
 INSTANTIATE_TEST_SUITE_P(
-    ThatGetAllInstances, OperationsOfAFailingFactory,
-    ::testing::Values("TAVRO_Glimmark_EnumInstances", "TAVRO_Glimmark_GetInstance_ByPath",
-                      "TAVRO_GlimmarkCapabilities_EnumInstances",
+    ThatGetInstances, OperationsOfAFailingFactory,
+    ::testing::Values("TAVRO_Glimmark_EnumInstances", "TAVRO_Glimmark_GetInstance_ByIdentifier",
+                      "TAVRO_Glimmark_GetInstance_ByPath", "TAVRO_GlimmarkCapabilities_EnumInstances",
+                      "TAVRO_GlimmarkCapabilities_GetInstance_ByIdentifier",
                       "TAVRO_GlimmarkCapabilities_GetInstance_ByPath",
                       "TAVRO_GlimmarkElementCapabilities_Associators_From_TAVRO_Glimmark",
                       "TAVRO_GlimmarkElementCapabilities_Associators_From_"
@@ -93,14 +110,14 @@ INSTANTIATE_TEST_SUITE_P(
 class CapabilitiesOfAnotherFactory : public ProviderFixture
 {
 protected:
-    ~CapabilitiesOfAnotherFactory() override { getAll = nullptr; }
+    ~CapabilitiesOfAnotherFactory() override { getInstances = nullptr; }
 };
 
 } // namespace
 
 TEST_P(OperationsOfAFailingFactory, EndAtOnceWithTheirStatus)
 {
-    getAll = failWithOneInstance;
+    getInstances = failWithOneInstance;
     const Outcome outcome = ask(host, operation());
     EXPECT_EQ(outcome.answer.status.code, CMPI_RC_ERR_FAILED);
     EXPECT_THAT(outcome.answer.instances, IsEmpty());
@@ -115,8 +132,8 @@ TEST_P(OperationsOfAFailingFactory, EndAtOnceWithTheirStatus)
 // The alarm device provider stops at the first.
 TEST_F(CapabilitiesOfAnotherFactory, AreReturnedForEachMatchOfTheWholePath)
 {
-    getAll = [](const CMPIBroker* maker, const CMPIObjectPath* ref, std::vector<CMPIInstance*>& instances,
-                CMPIStatus* /*rc*/) {
+    getInstances = [](const CMPIBroker* maker, const CMPIObjectPath* ref,
+                      std::vector<CMPIInstance*>& instances, CMPIStatus* /*rc*/) {
         const auto* const other = maker->eft->newObjectPath(maker, "root/cimv2", "TAVRO_Other", nullptr);
         instances = {instanceAt(maker, ref), nullptr, instanceAt(maker, other), instanceAt(maker, ref)};
         return 0;

@@ -73,7 +73,7 @@ CMPIStatus GlimmarkCapabilities_EnumInstances(CMPIInstanceMI* mi, const CMPICont
 
 namespace {
 
-/// Returns the instance with the InstanceID asked for, if there is one. \return the factory's result
+/// Returns the instance with the InstanceID asked for. \return the factory's result
 int returnByInstanceID(const CMPIResult* rslt, const CMPIObjectPath* cop, CMPIString* instanceID,
                        const char** properties, CMPIStatus& status)
 {
@@ -82,7 +82,8 @@ int returnByInstanceID(const CMPIResult* rslt, const CMPIObjectPath* cop, CMPISt
     reserveFor(factory, instances);
     const int result = factory.getOneGlimmarkCapabilitiesCMPIInstance(broker, cop, instanceID, properties,
                                                                       instances, &status);
-    returnInstances(rslt, instances);
+    if (result == 0)
+        returnInstances(rslt, instances);
     return result;
 }
 

@@ -68,7 +68,7 @@ CMPIStatus Glimmark_EnumInstances(CMPIInstanceMI* mi, const CMPIContext* ctx, co
 
 namespace {
 
-/// Returns the instance with the DeviceID asked for, if there is one. \return the factory's result
+/// Returns the instance with the DeviceID asked for. \return the factory's result
 int returnByDeviceID(const CMPIResult* rslt, const CMPIObjectPath* cop, CMPIString* deviceID,
                      const char** properties, CMPIStatus& status)
 {
@@ -77,7 +77,8 @@ int returnByDeviceID(const CMPIResult* rslt, const CMPIObjectPath* cop, CMPIStri
     reserveFor(factory, instances);
     const int result =
         factory.getOneGlimmarkCMPIInstance(broker, cop, deviceID, properties, instances, &status);
-    returnInstances(rslt, instances);
+    if (result == 0)
+        returnInstances(rslt, instances);
     return result;
 }
 
