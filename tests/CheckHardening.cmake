@@ -36,13 +36,17 @@ if(undefined)
     message(SEND_ERROR "Missing in its libraries: ${undefined}")
 endif()
 
-# Stacks are watched. The debug information says what each source was compiled with, for one compiler.
+# Stacks are watched. The debug information says what each source was compiled with, for one compiler; the sanitizers'
+# own sources in an executable are of another standard.
 run_tool(symbols ${NM} --dynamic --undefined-only --format=posix ${FILE})
 if("stack-protector-strong" IN_LIST PROTECTIONS AND NOT symbols MATCHES "__stack_chk_fail")
     message(SEND_ERROR "No function watches its stack")
 endif()
 run_tool(information ${READELF} --debug-dump=info --dwarf-depth=1 ${FILE})
-string(REGEX MATCHALL "DW_AT_producer[^\n]*GNU C[^\n]*" compilations "${information}")
+string(REGEX MATCHALL "DW_AT_producer[^\n]*GNU C\\+\\+17[^\n]*" compilations "${information}")
+if("stack-protector-strong" IN_LIST PROTECTIONS AND NOT compilations)
+    message(SEND_ERROR "No source in the debug information")
+endif()
 foreach(compilation IN LISTS compilations)
     foreach(protection IN LISTS PROTECTIONS)
         if(NOT compilation MATCHES " -f${protection}")
