@@ -107,7 +107,7 @@ TEST(Xml, isTextInUtf8)
         EXPECT_THAT(
             endingOf(std::string("<?xml version=\"1.0\" encoding=\"") + encoding + "\"?><CIM/>").message,
             HasSubstr(encoding));
-    EXPECT_EQ(endingOf("\xff\xfe<\0C\0").fault, Fault::notWellFormed);
+    EXPECT_EQ(endingOf(std::string("\xff\xfe<\0C\0", 6)).fault, Fault::notWellFormed);
     EXPECT_EQ(endingOf(std::string("<\0C\0I\0M\0/\0>\0", 12)).fault, Fault::notWellFormed);
     EXPECT_EQ(endingOf("<CIM>\xed\xa0\x80</CIM>").fault, Fault::notWellFormed) << "half a surrogate pair";
 }
