@@ -17,7 +17,6 @@
 #include <gtest/gtest.h>
 
 using ::testing::Contains;
-using ::testing::ElementsAre;
 using ::testing::IsEmpty;
 using ::testing::StartsWith;
 

@@ -109,9 +109,9 @@ class Mutants(unittest.TestCase):
 
     def test_a_draw_takes_from_each_rule(self):
         mutants = list(mutate.plant("file.cpp", 'f("a b c d e f g");\nif (!a) f("h i j k");\n'))
-        drawn = mutate.draw(mutants, len({mutant.rule for mutant in mutants}), seed=1)
+        drawn = mutate.draw(mutants, len({mutant.rule for mutant in mutants}), number=1)
         self.assertEqual(sorted(m.rule for m in drawn), sorted({m.rule for m in mutants}))
-        self.assertEqual([m.key() for m in drawn], [m.key() for m in mutate.draw(mutants, len(drawn), seed=1)])
+        self.assertEqual([m.key() for m in drawn], [m.key() for m in mutate.draw(mutants, len(drawn), number=1)])
 
 
 class Explanations(unittest.TestCase):
