@@ -38,7 +38,7 @@ class RecordingBroker
 public:
     /// \param othersSoFar  the number of other things that were recorded so far, asked at each call; may be
     /// null
-    explicit RecordingBroker(cimhost::Broker& broker, std::size_t (*othersSoFar)() = nullptr);
+    explicit RecordingBroker(cimhost::Broker& recordedBroker, std::size_t (*countOfOthers)() = nullptr);
     ~RecordingBroker();
     RecordingBroker(const RecordingBroker&) = delete;
     RecordingBroker& operator=(const RecordingBroker&) = delete;
