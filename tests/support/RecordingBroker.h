@@ -36,7 +36,7 @@ enum class Failure
 class RecordingBroker
 {
 public:
-    /// \param othersSoFar  the number of other things that were recorded so far, asked at each call; may be
+    /// \param countOfOthers  the number of other things that were recorded so far, asked at each call; may be
     /// null
     explicit RecordingBroker(cimhost::Broker& recordedBroker, std::size_t (*countOfOthers)() = nullptr);
     ~RecordingBroker();
