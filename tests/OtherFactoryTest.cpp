@@ -1,5 +1,5 @@
-// What the operations make of answers that the factory of today never gives: getting all instances with a
-// result other than 0, and instances where it collects none. Two functions of the factory stand here in the
+// What the operations make of answers that the factory of today never gives: instances beside a result other
+// than 0, instances of another class, lists with null pointers. Functions of the factory stand here in the
 // place of the library's, whose calls the loader binds to those of the executable.
 
 #include "GlimmarkFactory.h"
@@ -10,6 +10,7 @@
 
 #include <algorithm>
 #include <functional>
+#include <stdexcept>
 #include <string>
 #include <vector>
 
@@ -26,6 +27,9 @@ namespace {
 using GetInstances =
     std::function<int(const CMPIBroker*, const CMPIObjectPath*, std::vector<CMPIInstance*>&, CMPIStatus*)>;
 GetInstances getInstances;
+
+/// What stands for getting the paths of all indicators.
+std::function<int(const CMPIBroker*, const CMPIObjectPath*, std::vector<CMPIObjectPath*>&)> getPaths;
 
 } // namespace
 
@@ -63,9 +67,23 @@ int GlimmarkFactory::getOneGlimmarkCapabilitiesCMPIInstance(const CMPIBroker* br
     return getInstances(broker, ref, instances, rc);
 }
 
+int GlimmarkFactory::getAllGlimmarkCMPIObjPaths(const CMPIBroker* broker, const CMPIObjectPath* ref,
+                                                std::vector<CMPIObjectPath*>& paths, CMPIStatus* /*rc*/) const
+{
+    return getPaths(broker, ref, paths);
+}
+
 } // namespace Tavro::GlimmarkProvider
 
 namespace {
+
+Operation operationCalled(const std::string& name)
+{
+    const auto all = allOperations();
+    const auto found =
+        std::find_if(all.begin(), all.end(), [&](const Operation& one) { return one.name == name; });
+    return found != all.end() ? *found : throw std::invalid_argument("There is no operation " + name);
+}
 
 CMPIInstance* instanceAt(const CMPIBroker* broker, const CMPIObjectPath* path)
 {
@@ -85,13 +103,6 @@ class OperationsOfAFailingFactory : public ProviderFixture, public ::testing::Wi
 protected:
     OperationsOfAFailingFactory() { MadeInventory::set({{"b", "2"}}); }
     ~OperationsOfAFailingFactory() override { getInstances = nullptr; }
-
-    static Operation operation()
-    {
-        const auto all = allOperations();
-        return *std::find_if(all.begin(), all.end(),
-                             [](const Operation& one) { return one.name == GetParam(); });
-    }
 };
 
 INSTANTIATE_TEST_SUITE_P(
@@ -112,12 +123,27 @@ protected:
     ~CapabilitiesOfAnotherFactory() override { getInstances = nullptr; }
 };
 
+class ReferencesFromAComputerSystem : public ProviderFixture
+{
+protected:
+    ReferencesFromAComputerSystem()
+    {
+        getPaths = [](const CMPIBroker* maker, const CMPIObjectPath* /*ref*/,
+                      std::vector<CMPIObjectPath*>& paths) {
+            paths = {nullptr, maker->eft->newObjectPath(maker, "root/cimv2", "TAVRO_Glimmark", nullptr),
+                     nullptr};
+            return 0;
+        };
+    }
+    ~ReferencesFromAComputerSystem() override { getPaths = nullptr; }
+};
+
 } // namespace
 
 TEST_P(OperationsOfAFailingFactory, EndAtOnceWithTheirStatus)
 {
     getInstances = failWithOneInstance;
-    const Outcome outcome = ask(host, operation());
+    const Outcome outcome = ask(host, operationCalled(GetParam()));
     EXPECT_EQ(outcome.answer.status.code, CMPI_RC_ERR_FAILED);
     EXPECT_THAT(outcome.answer.instances, IsEmpty());
     EXPECT_EQ(outcome.doneCount, 0);
@@ -137,12 +163,23 @@ TEST_F(CapabilitiesOfAnotherFactory, AreReturnedForEachMatchOfTheWholePath)
         instances = {instanceAt(maker, ref), nullptr, instanceAt(maker, other), instanceAt(maker, ref)};
         return 0;
     };
-    const auto all = allOperations();
-    const auto search = std::find_if(all.begin(), all.end(), [](const Operation& one) {
-        return one.name == "TAVRO_GlimmarkCapabilities_GetInstance_ByPath";
-    });
-    ASSERT_NE(search, all.end());
-    const Outcome outcome = ask(host, *search);
+    const Outcome outcome = ask(host, operationCalled("TAVRO_GlimmarkCapabilities_GetInstance_ByPath"));
     EXPECT_EQ(outcome.answer.instances.size(), 2U);
     EXPECT_EQ(outcome.doneCount, 1);
+}
+
+TEST_F(ReferencesFromAComputerSystem, AreNoneForANullPointer)
+{
+    const Outcome outcome =
+        ask(host, operationCalled("TAVRO_GlimmarkSystemDevice_References_From_TAVRO_ComputerSystem"));
+    EXPECT_EQ(outcome.answer.status.code, CMPI_RC_OK);
+    EXPECT_EQ(outcome.answer.instances.size(), 1U);
+}
+
+TEST_F(ReferencesFromAComputerSystem, HaveNoNameForANullPointer)
+{
+    const Outcome outcome =
+        ask(host, operationCalled("TAVRO_GlimmarkSystemDevice_ReferenceNames_From_TAVRO_ComputerSystem"));
+    EXPECT_EQ(outcome.answer.status.code, CMPI_RC_OK);
+    EXPECT_EQ(outcome.answer.paths.size(), 1U);
 }
