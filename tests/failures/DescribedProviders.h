@@ -6,10 +6,10 @@
 /// It shares nothing with the library and is built the other way round: one straight walk for each
 /// operation, for one thread, for requests without a property list and a result class, for inventories of
 /// fewer than 65,536 indicators, without the parameter lists of the trace lines.
-#ifndef TESTS_SUPPORT_DESCRIBEDPROVIDERS_H
-#define TESTS_SUPPORT_DESCRIBEDPROVIDERS_H
+#ifndef TESTS_FAILURES_DESCRIBEDPROVIDERS_H
+#define TESTS_FAILURES_DESCRIBEDPROVIDERS_H
 
-#include "Operations.h"
+#include "support/Operations.h"
 
 /// The providers' factory functions. Operations other than those of allOperations() are null pointers.
 EntryPoints describedEntryPoints();
