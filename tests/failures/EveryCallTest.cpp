@@ -1,8 +1,8 @@
 // A broker that lets any single call fail, in any way: each operation answers, tells and traces what is
 // described for that failure, does not crash or leak, and the next request is whole.
 
-#include "DescribedProviders.h"
 #include "FailureFixture.h"
+#include "described/Providers.h"
 
 #include "support/SampleInventories.h"
 
@@ -100,7 +100,7 @@ protected:
     }
 
     const Operation library = allOperations().at(std::get<1>(GetParam()));
-    const Operation described = allOperations(describedEntryPoints()).at(std::get<1>(GetParam()));
+    const Operation described = allOperations(described::entryPoints()).at(std::get<1>(GetParam()));
 };
 
 std::string nameOf(const ::testing::TestParamInfo<EveryCall::ParamType>& suite)
