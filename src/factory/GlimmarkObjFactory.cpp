@@ -41,10 +41,8 @@ CMPIArray* newArrayOf(const CMPIBroker* broker, const std::vector<std::uint16_t>
 {
     const std::uint16_t count = countOf(values);
     CMPIArray* const array = Cmpi::newArray(broker, count, CMPI_uint16, rc);
-    if (array != nullptr) {
-        for (std::uint16_t i = 0; i < count; ++i)
-            Cmpi::setElementAt(array, i, values.at(i));
-    }
+    for (std::uint16_t i = 0; i < count; ++i)
+        Cmpi::setElementAt(array, i, values.at(i));
     return array;
 }
 
