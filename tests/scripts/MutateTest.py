@@ -48,6 +48,15 @@ class Rules(unittest.TestCase):
         self.assertEqual(planted("{ status->rc = 1; }", "dropped statement"), ["{ ; }"])
         self.assertEqual(planted("switch (a) { case B::c: f(); }", "dropped statement"), ["switch (a) { case B::c: ; }"])
 
+    def test_values_are_not_assigned_twice(self):
+        self.assertEqual(planted("{ status->rc = 1; }", "doubled statement"), [])
+        self.assertEqual(planted("{ list[key] = take(all); }", "doubled statement"),
+                         ["{ list[key] = take(all); list[key] = take(all); }"])
+
+    def test_what_has_no_order_is_not_swapped(self):
+        self.assertEqual(planted("if (std::strcmp(a, b) == 0)", "swapped neighbours"), [])
+        self.assertEqual(planted("enum class End\n{\n    near,\n    far\n};", "swapped neighbours"), [])
+
     def test_declarations_are_not_dropped(self):
         self.assertEqual(planted("{ const Factory factory(true); int i = 0; return f(x); }", "dropped statement"), [])
 
