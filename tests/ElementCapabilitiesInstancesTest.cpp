@@ -52,7 +52,6 @@ protected:
         newRequest();
         const cim::ObjectPath path = answer(enumerateNames(ref(association))).paths.at(index);
         newRequest();
-        clearRecords();
         RecordedComparisons::clear();
         CMPIObjectPath* const handle = request->path(path);
         broker.name(handle, "ref");
@@ -430,7 +429,6 @@ TEST_F(ElementCapabilitiesInstances, InstancesThatCouldNotBeMadeAreHandedOn)
 {
     MadeInventory::set({{"a", "1"}, {"b", "2"}});
     for (const Failure failure : {Failure::nullResult, Failure::noHandle}) {
-        clearRecords();
         newRequest();
         broker.fail("newInstance", 1, failure);
         EXPECT_EQ(enumerate(ref(association)).rc, CMPI_RC_OK);

@@ -61,23 +61,14 @@ protected:
     const std::string givenDevice = "root/test:TAVRO_Glimmark.DeviceID=a:/1";
     const std::string givenCapabilities = capabilitiesText;
 
-    /// Finding the far end's class: the class of the request's path is read once for each route tried, and
-    /// the target's path, the first one made, is made of what was found; then its class is read.
+    /// Finding the far end's class and reading it off the target's path.
     Texts resolution(const std::string& nearClass, std::size_t routes, const std::string& farClass,
                      const std::string& text) const
     {
-        Texts reading;
-        for (std::size_t i = 0; i < routes; ++i)
-            reading =
-                joined(reading, Texts{"getClassName(ref, rc)", R"(getCharPtr(")" + nearClass + R"(", rc))"});
         return joined(
-            Texts{"ENTERING get_assoc_targetClass_ObjectPath", "ENTERING get_assoc_targetClass_Name"},
-            reading,
-            Texts{R"(trace(1, "GlimmarkElementCapabilitiesProvider", ")" + text + R"(", null))",
-                  "EXITING get_assoc_targetClass_Name"},
-            makingOfAPath(farClass, "path1"),
-            Texts{"EXITING get_assoc_targetClass_ObjectPath", "getClassName(path1, rc)",
-                  "getCharPtr(\"" + farClass + "\", rc)"});
+            findingOfTheTarget(nearClass, routes, farClass,
+                               R"(trace(1, "GlimmarkElementCapabilitiesProvider", ")" + text + R"(", null))"),
+            readingOfTheClass("path1", farClass));
     }
     Texts resolutionOfTheDevice() const
     {
@@ -522,7 +513,6 @@ TEST_F(ElementCapabilitiesTraversal, ReferenceNamesPassOverWhatCouldNotBeMade)
     MadeInventory::set({{"a", "1"}, {"b", "2"}});
     for (const char* service : {"newInstance", "getObjectPath"}) {
         newRequest();
-        clearRecords();
         broker.fail(service, 1, Failure::nullResult);
         const CMPIStatus status = referenceNames(capabilitiesObject());
         EXPECT_EQ(status.rc, CMPI_RC_OK);

@@ -283,7 +283,6 @@ TEST_F(GlimmarkProviderTest, GetWithANullDeviceIDSearchesAndStopsAtTheFirstMatch
     cimhost::cim::ObjectPath wanted = answer(enumerate(ref(glimmark))).instances.at(1).path;
     ASSERT_EQ(valueOf(wanted, "DeviceID"), "b:/2");
     newRequest();
-    broker.clear();
     for (const Failure failure : {Failure::nullResult, Failure::errorStatus, Failure::wrongValue}) {
         broker.clear();
         broker.fail("getKey", 1, failure);

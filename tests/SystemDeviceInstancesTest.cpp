@@ -100,22 +100,12 @@ protected:
 
     CMPIInstanceMI* mi = GlimmarkSystemDeviceProvider_Create_InstanceMI(host.cmpiBroker(), nullptr, nullptr);
     /// What EnumInstanceNames and the builder begin with.
-    const std::vector<std::string> askingForTheSystems{
-        "getNameSpace(ref, rc)", R"(getCharPtr("root/test", rc))",
-        R"(newObjectPath("root/test", "TAVRO_ComputerSystem", rc))",
-        "enumerateInstanceNames(ctx, path1, rc)"};
+    const Texts askingForTheSystems =
+        joined(readingOfTheNamespace, Texts{R"(newObjectPath("root/test", "TAVRO_ComputerSystem", rc))",
+                                            "enumerateInstanceNames(ctx, path1, rc)"});
     /// What they do to the second path, the indicator's, and the third, the association's.
-    const std::vector<std::string> makingOfTheAssociationPath{
-        "getNameSpace(ref, rc)",
-        R"(getCharPtr("root/test", rc))",
-        R"(setNameSpace(path2, "root/test"))",
-        "getNameSpace(ref, rc)",
-        R"(getCharPtr("root/test", rc))",
-        R"(newObjectPath("root/test", "TAVRO_GlimmarkSystemDevice", rc))",
-        "getNameSpace(ref, rc)",
-        R"(getCharPtr("root/test", rc))",
-        R"(setNameSpace(path3, "root/test"))",
-        "setHostname(path3, " + quotedHost + ")"};
+    const Texts makingOfTheAssociationPath =
+        joined(settingOfTheNamespace("path2"), makingOfAPath(association, "path3"));
 };
 
 // How many computer systems there are.
@@ -224,14 +214,11 @@ TEST_F(SystemDeviceInstances, NamesAreMadeOneAfterTheOtherAndReturnedAtOnce)
     EXPECT_THAT(timeline(),
                 ElementsAreArray(joined(
                     {"ENTERING " + forNames, "ENTERING setVector", "EXITING setVector"}, askingForTheSystems,
-                    std::vector<std::string>{"hasNext(enumeration1, null)", "getNext(enumeration1, null)",
-                                             "ENTERING " + forPaths},
-                    makingOfTheDevicePath("path2"), std::vector<std::string>{"EXITING " + forPaths},
-                    makingOfTheAssociationPath,
-                    std::vector<std::string>{"addKey(path3, \"GroupComponent\", path4, ref)",
-                                             "addKey(path3, \"PartComponent\", path2, ref)",
-                                             "returnObjectPath(path3)", "hasNext(enumeration1, null)",
-                                             "EXITING " + forNames, "returnDone()"})));
+                    Texts{"hasNext(enumeration1, null)", "getNext(enumeration1, null)"},
+                    makingOfTheDevicePath("path2"), makingOfTheAssociationPath,
+                    Texts{"addKey(path3, \"GroupComponent\", path4, ref)",
+                          "addKey(path3, \"PartComponent\", path2, ref)", "returnObjectPath(path3)",
+                          "hasNext(enumeration1, null)", "EXITING " + forNames, "returnDone()"})));
 }
 
 TEST_F(SystemDeviceInstances, NamesAreTraced)
@@ -322,7 +309,7 @@ TEST_P(WithoutSystemProvider, NamesEndWithTheBrokersStatus)
 TEST_F(SystemDeviceInstances, NamesOfNoEnumerationAreNone)
 {
     for (const Failure failure : {Failure::nullResult, Failure::noHandle}) {
-        startAnew();
+        newRequest();
         broker.fail("enumerateInstanceNames", 1, failure);
         expectEmptyAnswer(enumerateNames());
         EXPECT_EQ(Logged::flow().back(), "EXITING " + forNames);
@@ -334,7 +321,7 @@ TEST_F(SystemDeviceInstances, ASystemThatSaysItIsNullIsSkippedWhateverItsValuePo
     setComputerSystems({"one", "two"});
     broker.fail("getNext", 1, Failure::nullState);
     EXPECT_THAT(pairsOf(answer(enumerateNames()).paths), ElementsAre("two a:/1", "two b:/2"));
-    startAnew();
+    newRequest();
     setComputerSystems({"one", "two"});
     broker.fail("getNext", 1, Failure::nullState);
     EXPECT_THAT(pairsOf(answer(enumerate()).instances), ElementsAre("two a:/1", "two b:/2"));
@@ -343,7 +330,7 @@ TEST_F(SystemDeviceInstances, ASystemThatSaysItIsNullIsSkippedWhateverItsValuePo
 TEST_F(SystemDeviceInstances, NamesSkipASystemThatIsNone)
 {
     for (const Failure failure : {Failure::nullResult, Failure::wrongValue}) {
-        startAnew();
+        newRequest();
         setComputerSystems({"two"});
         broker.fail("getNext", 1, failure);
         const CMPIStatus status = enumerateNames();
@@ -448,18 +435,14 @@ TEST_F(SystemDeviceInstances, InstancesAreBuiltFirstAndThenReturned)
         timeline(),
         ElementsAreArray(joined(
             {"ENTERING " + forInstances, "ENTERING " + forBuilder, "ENTERING setVector", "EXITING setVector"},
-            askingForTheSystems,
-            std::vector<std::string>{"hasNext(enumeration1, null)", "getNext(enumeration1, null)",
-                                     "ENTERING " + forPaths},
-            makingOfTheDevicePath("path2"), std::vector<std::string>{"EXITING " + forPaths},
-            makingOfTheAssociationPath,
-            std::vector<std::string>{"newInstance(path3, null)",
-                                     "setPropertyFilter(instance1, null, [GroupComponent PartComponent])",
-                                     "setProperty(instance1, \"GroupComponent\", path4, ref)",
-                                     "setProperty(instance1, \"PartComponent\", path2, ref)",
-                                     "hasNext(enumeration1, null)", "EXITING " + forBuilder,
-                                     "returnInstance(instance1)", "EXITING " + forInstances,
-                                     "returnDone()"})));
+            askingForTheSystems, Texts{"hasNext(enumeration1, null)", "getNext(enumeration1, null)"},
+            makingOfTheDevicePath("path2"), makingOfTheAssociationPath,
+            Texts{"newInstance(path3, null)",
+                  "setPropertyFilter(instance1, null, [GroupComponent PartComponent])",
+                  "setProperty(instance1, \"GroupComponent\", path4, ref)",
+                  "setProperty(instance1, \"PartComponent\", path2, ref)", "hasNext(enumeration1, null)",
+                  "EXITING " + forBuilder, "returnInstance(instance1)", "EXITING " + forInstances,
+                  "returnDone()"})));
 }
 
 TEST_F(SystemDeviceInstances, InstancesAreFilteredByTheBroker)
@@ -520,7 +503,7 @@ TEST_F(SystemDeviceInstances, InstancesNeedTheClassPathOfTheSystems)
     const std::string traceText =
         "Create CMPIObjectPath failed for" + thirteenBlanks + "ComputerSystemClass.";
     for (const Failure failure : {Failure::nullResult, Failure::noHandle, Failure::errorStatus}) {
-        startAnew();
+        newRequest();
         broker.fail("newObjectPath", 1, failure);
         expectEmptyAnswer(enumerate());
         EXPECT_THAT(timeline(),
@@ -552,7 +535,7 @@ TEST_P(WithoutSystemProvider, InstancesAreNone)
 TEST_F(SystemDeviceInstances, InstancesOfNoEnumerationAreNoneAndTheBuildIsComplete)
 {
     for (const Failure failure : {Failure::nullResult, Failure::noHandle}) {
-        startAnew();
+        newRequest();
         broker.fail("enumerateInstanceNames", 1, failure);
         expectEmptyAnswer(enumerate());
         EXPECT_THAT(Logged::linesOf(forBuilder), SizeIs(2));
@@ -562,7 +545,7 @@ TEST_F(SystemDeviceInstances, InstancesOfNoEnumerationAreNoneAndTheBuildIsComple
 TEST_F(SystemDeviceInstances, InstancesSkipASystemThatIsNone)
 {
     for (const Failure failure : {Failure::nullResult, Failure::wrongValue}) {
-        startAnew();
+        newRequest();
         setComputerSystems({"two"});
         broker.fail("getNext", 1, failure);
         const CMPIStatus status = enumerate();
@@ -599,7 +582,7 @@ TEST_F(SystemDeviceInstances, AnAssociationPathThatCannotBeMadeIsReportedAndLeav
 {
     const std::string traceText = "Create CMPIObjectPath failed for" + twentyOneBlanks + "HostedAccessPoint.";
     for (const Failure failure : {Failure::nullResult, Failure::noHandle, Failure::errorStatus}) {
-        startAnew();
+        newRequest();
         broker.fail("newObjectPath", 4, failure); // the first association's
         const CMPIStatus status = enumerate();
         EXPECT_EQ(status.rc, CMPI_RC_OK);
@@ -676,7 +659,7 @@ TEST_F(SystemDeviceInstances, GetAnswersTheInstanceOfThePath)
     setComputerSystems({"one", "two"});
     for (const char* system : {"one", "two"}) {
         for (const char* device : {"a:/1", "b:/2"}) {
-            startAnew();
+            newRequest();
             const CMPIStatus status = get(refTo(system, device));
             EXPECT_EQ(status.rc, CMPI_RC_OK);
             EXPECT_EQ(message(status), std::nullopt);
@@ -691,7 +674,7 @@ TEST_F(SystemDeviceInstances, GetAnswersThePathsThatTheEnumerationReturned)
     const auto paths = answer(enumerateNames()).paths;
     ASSERT_THAT(paths, SizeIs(2));
     for (const auto& path : paths) {
-        startAnew();
+        newRequest();
         const CMPIStatus status = get(refTo(path));
         EXPECT_THAT(pairsOf(answer(status).instances), ElementsAre(SystemDevice::pairAmong(path.keys)));
     }
@@ -754,7 +737,7 @@ TEST_F(SystemDeviceInstances, GetOfAnUnknownPathAnswersNothing)
     const cim::ObjectPath otherKeys{"", "root/test", association, {{"Anything", text("else")}}};
     for (const auto& path :
          {pathOf("alpha", "c:/3"), pathOf("beta", "a:/1"), otherClass, oneKey, otherKeys}) {
-        startAnew();
+        newRequest();
         expectEmptyAnswer(get(refTo(path)));
         EXPECT_THAT(broker.calls({"newInstance"}), SizeIs(2)) << "class and keys are not looked at before";
         EXPECT_THAT(Logged::linesOf(forOne), SizeIs(2));
@@ -774,7 +757,7 @@ TEST_F(SystemDeviceInstances, GetComparesReferencesAsPathsAndNotAsText)
 TEST_F(SystemDeviceInstances, GetSkipsInstancesThatCouldNotBeMade)
 {
     for (const Failure failure : {Failure::nullResult, Failure::noHandle}) {
-        startAnew();
+        newRequest();
         broker.fail("newInstance", 1, failure);
         const CMPIStatus status = get(refTo("alpha", "b:/2"));
         EXPECT_EQ(status.rc, CMPI_RC_OK);
@@ -821,7 +804,7 @@ TEST_F(SystemDeviceInstances, GetWithoutSystemsOrDevicesAnswersNothing)
     setComputerSystems({});
     expectEmptyAnswer(get(refTo("alpha", "a:/1")));
 
-    startAnew();
+    newRequest();
     setComputerSystems({"alpha"});
     MadeInventory::set({});
     expectEmptyAnswer(get(refTo("alpha", "a:/1")));

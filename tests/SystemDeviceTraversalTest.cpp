@@ -19,6 +19,7 @@ using SystemDevice::enumerationFailed;
 using SystemDevice::joined;
 using SystemDevice::module;
 using SystemDevice::statusText;
+using SystemDevice::Texts;
 using SystemDevice::warning;
 
 namespace {
@@ -28,10 +29,7 @@ const std::string systemClass = "TAVRO_ComputerSystem";
 const std::string deviceClass = "TAVRO_Glimmark";
 const std::string forTargetPath = "get_assoc_targetClass_ObjectPath";
 const std::string forTargetName = "get_assoc_targetClass_Name";
-const std::string forPaths = "getAllGlimmarkCMPIObjPaths";
 const std::string forDevices = "getAllGlimmarkCMPIInstances";
-
-using Texts = std::vector<std::string>;
 
 /// A client's arguments besides the path. Where an operation has no such argument, it is left out.
 struct Asked
@@ -77,46 +75,20 @@ protected:
     /// Calls and lines of the way to the target path, which is path1, after the operation's own entry.
     Texts findingTheTarget(const std::string& from, const std::string& to) const
     {
-        Texts events{"ENTERING setVector", "EXITING setVector", "ENTERING " + forTargetPath,
-                     "ENTERING " + forTargetName};
         // The way from a system is tested first, that from a device second.
-        for (int way = 1; way <= (from == systemClass ? 1 : 2); ++way) {
-            events.emplace_back("getClassName(ref, rc)");
-            events.push_back("getCharPtr(\"" + from + "\", rc)");
-        }
+        const std::size_t ways = from == systemClass ? 1 : 2;
         const std::string target = to == deviceClass ? "GlimmarkClass" : "ComputerSystemClass";
-        return joined(
-            events,
-            Texts{R"(trace(1, "GlimmarkSystemDeviceProvider", "Target Class is )" + target + R"(", null))",
-                  "EXITING " + forTargetName, "getNameSpace(ref, rc)", R"(getCharPtr("root/test", rc))",
-                  R"(newObjectPath("root/test", ")" + to + R"(", rc))", "getNameSpace(ref, rc)",
-                  R"(getCharPtr("root/test", rc))", R"(setNameSpace(path1, "root/test"))",
-                  "setHostname(path1, " + quotedHost + ")", "EXITING " + forTargetPath});
+        return joined(Texts{"ENTERING setVector", "EXITING setVector"},
+                      findingOfTheTarget(from, ways, to,
+                                         R"(trace(1, "GlimmarkSystemDeviceProvider", "Target Class is )" +
+                                             target + R"(", null))"));
     }
-    static Texts readingTheTargetsClass(const std::string& to)
-    {
-        return {"getClassName(path1, rc)", "getCharPtr(\"" + to + "\", rc)"};
-    }
-    Texts makingOfTheAssociationPath() const
-    {
-        return {"getNameSpace(ref, rc)",
-                R"(getCharPtr("root/test", rc))",
-                R"(newObjectPath("root/test", "TAVRO_GlimmarkSystemDevice", rc))",
-                "getNameSpace(ref, rc)",
-                R"(getCharPtr("root/test", rc))",
-                R"(setNameSpace(path2, "root/test"))",
-                "setHostname(path2, " + quotedHost + ")"};
-    }
-    /// \param path  the recording's name of what the indicator's path becomes
-    Texts makingOfTheDevicePaths(const std::string& path) const
-    {
-        return joined({"ENTERING " + forPaths}, makingOfTheDevicePath(path), Texts{"EXITING " + forPaths});
-    }
+    static Texts readingTheTargetsClass(const std::string& to) { return readingOfTheClass("path1", to); }
+    Texts makingOfTheAssociationPath() const { return makingOfAPath(association, "path2"); }
     /// Gives a path the namespace of the request and returns it.
-    static Texts returning(const std::string& path)
+    Texts returning(const std::string& path) const
     {
-        return {"getNameSpace(ref, rc)", R"(getCharPtr("root/test", rc))",
-                "setNameSpace(" + path + R"(, "root/test"))", "returnObjectPath(" + path + ")"};
+        return joined(settingOfTheNamespace(path), Texts{"returnObjectPath(" + path + ")"});
     }
 
     CMPIAssociationMI* mi =
@@ -320,7 +292,7 @@ TEST_F(SystemDeviceTraversal, NamesFromASystemAreMadeBeforeTheFirstIsReturned)
     const std::string function = "GlimmarkSystemDevice_AssociatorNames";
     EXPECT_THAT(timeline(),
                 ElementsAreArray(joined({"ENTERING " + function}, findingTheTarget(systemClass, deviceClass),
-                                        readingTheTargetsClass(deviceClass), makingOfTheDevicePaths("path2"),
+                                        readingTheTargetsClass(deviceClass), makingOfTheDevicePath("path2"),
                                         returning("path2"), Texts{"EXITING " + function})));
 }
 
@@ -510,7 +482,7 @@ TEST_F(SystemDeviceTraversal, AssociatorsOfADeviceDoNotCheckTheStatus)
 TEST_F(SystemDeviceTraversal, AssociatorsOfNoEnumerationAreNone)
 {
     for (const Failure failure : {Failure::nullResult, Failure::noHandle}) {
-        startAnew();
+        newRequest();
         broker.fail("enumerateInstances", 1, failure);
         const CMPIStatus status = associators(refToDevice());
         EXPECT_EQ(status.rc, CMPI_RC_OK);
@@ -560,7 +532,7 @@ TEST_P(AssociatorOperations, AnswerNothingWhereNothingIsAssociated)
          {Start{"CIM_AlarmDevice", association}, Start{"tavro_glimmark", association},
           Start{"TAVRO_GlimmarkCapabilities", association}, Start{systemClass, capabilities},
           Start{systemClass, "CIM_SystemDevice"}, Start{deviceClass, "tavro_glimmarksystemdevice"}}) {
-        startAnew();
+        newRequest();
         Asked asked;
         asked.assocClass = start.assocClass;
         expectNothing(traverse(ref(start.className), asked));
@@ -580,7 +552,7 @@ TEST_P(AssociatorOperations, AnswerAGoodStatusWhereTheSourceClassCannotBeRead)
 TEST_P(AssociatorOperations, AnswerAGoodStatusWhereTheTargetPathCannotBeMade)
 {
     for (const Failure failure : {Failure::nullResult, Failure::noHandle, Failure::errorStatus}) {
-        startAnew();
+        newRequest();
         broker.fail("newObjectPath", 1, failure);
         expectNothing(traverse(refToDevice()));
         EXPECT_THAT(Logged::linesOf(function), SizeIs(1));
@@ -593,7 +565,7 @@ TEST_P(AssociatorOperations, GoToTheEndForATargetThatTheyDoNotServe)
     Asked asked;
     asked.assocClass = capabilities;
     for (const char* resultClass : {static_cast<const char*>(nullptr), "TAVRO_GlimmarkCapabilities", "Any"}) {
-        startAnew();
+        newRequest();
         asked.resultClass = resultClass;
         expectNothing(traverse(refToDevice(), asked));
         EXPECT_THAT(Logged::linesOf(function), SizeIs(2)) << "with an exit";
@@ -631,7 +603,7 @@ TEST_P(AssociatorOperations, SkipASystemThatSaysItIsNull)
 TEST_P(AssociatorOperations, SkipASystemThatIsNone)
 {
     for (const Failure failure : {Failure::nullResult, Failure::wrongValue}) {
-        startAnew();
+        newRequest();
         broker.fail("getNext", 1, failure);
         const CMPIStatus status = traverse(refToDevice());
         EXPECT_EQ(status.rc, CMPI_RC_OK);
@@ -667,7 +639,7 @@ TEST_P(AssociatorOperations, EndTheParameterListAtTheFirstNullText)
     for (const Asked& asked : {Asked{association, nullptr, "role", "resultRole"},
                                Asked{association, "CIM_AlarmDevice", nullptr, "x"},
                                Asked{association, "CIM_AlarmDevice", "role", nullptr}}) {
-        startAnew();
+        newRequest();
         const CMPIObjectPath* const path = refToSystem();
         traverse(path, asked);
         EXPECT_THAT(Logged::linesOf(function), upTo(path, asked));
@@ -752,7 +724,7 @@ TEST_F(SystemDeviceTraversal, ReferencesOfASystemAreReturnedOneByOne)
     EXPECT_THAT(timeline(),
                 ElementsAreArray(joined({"ENTERING " + function}, findingTheTarget(systemClass, deviceClass),
                                         makingOfTheAssociationPath(), readingTheTargetsClass(deviceClass),
-                                        makingOfTheDevicePaths("path3"),
+                                        makingOfTheDevicePath("path3"),
                                         Texts{"newInstance(path2, rc)",
                                               "setProperty(instance1, \"GroupComponent\", ref, ref)",
                                               "setProperty(instance1, \"PartComponent\", path3, ref)",
@@ -768,8 +740,7 @@ TEST_F(SystemDeviceTraversal, ReferenceNamesOfASystemArePathsOfInstances)
         timeline(),
         ElementsAreArray(joined(
             {"ENTERING " + function}, findingTheTarget(systemClass, deviceClass),
-            makingOfTheAssociationPath(), readingTheTargetsClass(deviceClass),
-            makingOfTheDevicePaths("path3"),
+            makingOfTheAssociationPath(), readingTheTargetsClass(deviceClass), makingOfTheDevicePath("path3"),
             Texts{"newInstance(path2, rc)", "setProperty(instance1, \"GroupComponent\", ref, ref)",
                   "setProperty(instance1, \"PartComponent\", path3, ref)", "getObjectPath(instance1, rc)"},
             returning("path4"), Texts{"EXITING " + function})));
@@ -843,7 +814,7 @@ TEST_F(SystemDeviceTraversal, ReferenceNamesAreTraced)
 TEST_P(ReferenceOperations, EndTheParameterListAtTheFirstNullText)
 {
     for (const Asked& asked : {Asked{association, nullptr, "role"}, Asked{association, "Any", nullptr}}) {
-        startAnew();
+        newRequest();
         const CMPIObjectPath* const path = refToSystem();
         traverse(path, asked);
         const auto parameters =
@@ -859,7 +830,7 @@ TEST_P(ReferenceOperations, AnswerWhateverTheResultClassAndTheRole)
 {
     for (const std::string& from : {systemClass, deviceClass}) {
         for (const char* text : {"", "CIM_Unrelated", "GroupComponent", "PartComponent"}) {
-            startAnew();
+            newRequest();
             setComputerSystems({"one", "two"});
             const CMPIStatus status = traverse(ref(from, {{"Any", "key"}}), {association, text, text});
             EXPECT_EQ(status.rc, CMPI_RC_OK);
@@ -884,7 +855,7 @@ TEST_P(ReferenceOperations, FindTheTargetByTheirOwnAssociation)
 TEST_P(ReferenceOperations, FailWithoutATarget)
 {
     for (const char* from : {"CIM_AlarmDevice", "TAVRO_GlimmarkCapabilities", "tavro_computersystem"}) {
-        startAnew();
+        newRequest();
         const CMPIStatus status = traverse(ref(from, {{"Any", "key"}}));
         EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
         EXPECT_EQ(message(status), noTarget);
@@ -898,7 +869,7 @@ TEST_P(ReferenceOperations, FailWithoutATarget)
 TEST_P(ReferenceOperations, FailWhereTheTargetPathCannotBeMade)
 {
     for (const Failure failure : {Failure::nullResult, Failure::noHandle, Failure::errorStatus}) {
-        startAnew();
+        newRequest();
         broker.fail("newObjectPath", 1, failure);
         const CMPIStatus status = traverse(refToDevice());
         EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
@@ -922,7 +893,7 @@ TEST_P(ReferenceOperations, AnswerNothingWithoutAnAssociationPath)
 {
     setComputerSystems({"one", "two"});
     for (const std::string& from : {systemClass, deviceClass}) {
-        startAnew();
+        newRequest();
         broker.fail("newObjectPath", 2, Failure::nullResult);
         expectNothing(traverse(ref(from, {{"Any", "key"}})));
         EXPECT_THAT(broker.calls({"newInstance", "setProperty", "newString"}), IsEmpty());
@@ -945,7 +916,7 @@ TEST_P(ReferenceOperations, SkipAnInstanceThatCouldNotBeMade)
     setComputerSystems({"one", "two"});
     for (const std::string& from : {systemClass, deviceClass}) {
         for (const Failure failure : {Failure::nullResult, Failure::noHandle}) {
-            startAnew();
+            newRequest();
             broker.fail("newInstance", 1, failure);
             const CMPIStatus status = traverse(ref(from, {{"Any", "key"}}));
             EXPECT_EQ(status.rc, CMPI_RC_OK);
@@ -992,7 +963,7 @@ TEST_P(ReferenceOperations, CountASystemThatIsNone)
 {
     // What the enumeration brings is not looked at.
     for (const Failure failure : {Failure::nullResult, Failure::wrongValue}) {
-        startAnew();
+        newRequest();
         broker.fail("getNext", 1, failure);
         const CMPIStatus status = traverse(refToDevice());
         EXPECT_EQ(status.rc, CMPI_RC_OK);
@@ -1026,7 +997,7 @@ TEST_P(NameEnumeratingOperations, EndAtAFailedEnumeration)
 TEST_P(NameEnumeratingOperations, TakeNoEnumerationForAnEmptyOne)
 {
     for (const Failure failure : {Failure::nullResult, Failure::noHandle}) {
-        startAnew();
+        newRequest();
         broker.fail("enumerateInstanceNames", 1, failure);
         expectNothing(traverse(refToDevice()));
         EXPECT_THAT(Logged::linesOf(function), SizeIs(2));
@@ -1085,7 +1056,7 @@ TEST_P(WithoutRegistration, ASystemIsAnsweredAllTheSame)
 TEST_P(AllTraversals, AreNeverDone)
 {
     for (const std::string& from : {systemClass, deviceClass, std::string("CIM_AlarmDevice")}) {
-        startAnew();
+        newRequest();
         traverse(ref(from, {{"Any", "key"}}));
         EXPECT_EQ(request->doneCount(), 0);
     }

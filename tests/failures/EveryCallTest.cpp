@@ -91,7 +91,6 @@ protected:
     Course courseOf(const Operation& operation, std::size_t nth, Failure failure)
     {
         newRequest();
-        RecordedLog::clear();
         if (nth > 0)
             broker.fail("", static_cast<int>(nth), failure);
         const CMPIStatus status = run(operation);

@@ -30,7 +30,6 @@ protected:
     std::vector<std::string> wholeRequest(const Operation& operation)
     {
         newRequest();
-        RecordedLog::clear();
         run(operation);
         return broker.calls();
     }

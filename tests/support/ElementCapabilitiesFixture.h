@@ -3,8 +3,8 @@
 #ifndef TESTS_SUPPORT_ELEMENTCAPABILITIESFIXTURE_H
 #define TESTS_SUPPORT_ELEMENTCAPABILITIESFIXTURE_H
 
+#include "AssociationFixture.h"
 #include "EntryPoints.h"
-#include "ProviderFixture.h"
 
 #include <Tavro/Common.h>
 
@@ -19,7 +19,9 @@ inline constexpr auto module = "GlimmarkElementCapabilitiesProvider";
 inline constexpr auto glimmark = "TAVRO_Glimmark";
 inline constexpr auto capabilities = "TAVRO_GlimmarkCapabilities";
 
-using Texts = std::vector<std::string>;
+using Recorded::joined;
+using Recorded::statusText;
+using Recorded::Texts;
 
 /// A run of blanks inside a text.
 inline std::string blanks(std::size_t count)
@@ -27,24 +29,10 @@ inline std::string blanks(std::size_t count)
     return std::string().append(count, ' ');
 }
 
-/// The broker's trace of a failure, as the recording writes it.
+/// The broker's trace of a failure.
 inline std::string warning(const std::string& text)
 {
-    return R"(trace(2, "GlimmarkElementCapabilitiesProvider", ")" + text + "\", null)";
-}
-
-/// The making of a status message.
-inline std::string statusText(const std::string& text)
-{
-    return "newString(\"" + text + "\", null)";
-}
-
-/// Lists of calls and lines, one after the other.
-template <class... Lists>
-Texts joined(Texts first, const Lists&... others)
-{
-    (first.insert(first.end(), others.begin(), others.end()), ...);
-    return first;
+    return Recorded::warning(module, text);
 }
 
 /// The last of a list.
@@ -54,42 +42,16 @@ inline Texts lastOf(const Texts& list, std::size_t count)
 }
 
 /// With one indicator unless a test makes others.
-class Fixture : public ProviderFixture
+class Fixture : public AssociationFixture
 {
 protected:
     Fixture() { MadeInventory::set({{"a", "1"}}); }
 
-    // Runs of calls and lines, of which the operations consist. `path` is the recording's name of a path.
+    // Runs of calls and lines.
 
     const Texts collection{"ENTERING setVector", "EXITING setVector",
                            "ENTERING getGlimmarkCapabilitiesInstances",
                            "EXITING getGlimmarkCapabilitiesInstances"};
-    const Texts readingOfTheNamespace{"getNameSpace(ref, rc)", R"(getCharPtr("root/test", rc))"};
-
-    Texts settingOfTheNamespace(const std::string& path) const
-    {
-        return joined(readingOfTheNamespace, Texts{"setNameSpace(" + path + R"(, "root/test"))"});
-    }
-
-    /// A new path of the request's.
-    Texts makingOfAPath(const std::string& className, const std::string& path) const
-    {
-        return joined(readingOfTheNamespace,
-                      Texts{R"(newObjectPath("root/test", ")" + className + R"(", rc))"},
-                      settingOfTheNamespace(path), Texts{"setHostname(" + path + ", " + quotedHost + ")"});
-    }
-
-    /// The factory's answer with the only indicator's path.
-    Texts makingOfTheDevicePath(const std::string& path) const
-    {
-        const std::string addKey = "addKey(" + path;
-        return joined(Texts{"ENTERING getAllGlimmarkCMPIObjPaths"}, makingOfAPath(glimmark, path),
-                      Texts{addKey + R"(, "CreationClassName", "TAVRO_Glimmark", chars))",
-                            addKey + R"(, "DeviceID", "a:/1", chars))",
-                            addKey + R"(, "SystemCreationClassName", "TAVRO_ComputerSystem", chars))",
-                            addKey + R"(, "SystemName", )" + quotedHost + ", chars)",
-                            "EXITING getAllGlimmarkCMPIObjPaths"});
-    }
 
     /// The factory's answer with the path of the capabilities.
     Texts makingOfTheCapabilitiesPath(const std::string& path) const
@@ -110,8 +72,6 @@ protected:
     const std::string capabilitiesText =
         "root/test:TAVRO_GlimmarkCapabilities.InstanceID=TAVRO:GlimmarkCapabilities1";
 
-    const std::string quotedHost = '"' + Tavro::getSystemName() + '"';
-    const Texts resultServices{"returnObjectPath", "returnInstance", "returnDone"};
     const Texts reports{"newString", "trace"};
 };
 

@@ -211,6 +211,7 @@ void ProviderFixture::newRequest()
     request.reset(); // requests nest: the old one ends before the new one begins
     request = std::make_unique<cimhost::Request>(host);
     broker.forget();
+    RecordedLog::clear();
     broker.name(request->context(), "ctx");
 }
 

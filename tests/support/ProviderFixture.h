@@ -92,7 +92,7 @@ protected:
     /// The same for keys of any type. A path without a namespace is put into "root/test".
     CMPIObjectPath* ref(cimhost::cim::ObjectPath path);
 
-    /// Ends the open request with all of its objects, and opens another.
+    /// Ends the open request with all of its objects, and opens another, with nothing recorded so far.
     void newRequest();
 
     /// What the operation answered. \param status  what it returned

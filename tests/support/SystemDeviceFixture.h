@@ -3,8 +3,8 @@
 #ifndef TESTS_SUPPORT_SYSTEMDEVICEFIXTURE_H
 #define TESTS_SUPPORT_SYSTEMDEVICEFIXTURE_H
 
+#include "AssociationFixture.h"
 #include "EntryPoints.h"
-#include "ProviderFixture.h"
 
 #include <Tavro/Common.h>
 
@@ -19,6 +19,10 @@ namespace SystemDevice {
 inline constexpr auto association = "TAVRO_GlimmarkSystemDevice";
 inline constexpr auto module = "GlimmarkSystemDeviceProvider";
 
+using Recorded::joined;
+using Recorded::statusText;
+using Recorded::Texts;
+
 /// The line of a failed enumeration of the computer systems, as Logged::lines() gives it.
 inline const std::string enumerationFailed =
     "6000 Mavrel.GlimmarkSystemDeviceProvider MESSAGE [File: GlimmarkSystemDeviceProvider.cpp, Line]: "
@@ -27,13 +31,7 @@ inline const std::string enumerationFailed =
 /// The broker's trace of a failure.
 inline std::string warning(const std::string& text)
 {
-    return R"(trace(2, "GlimmarkSystemDeviceProvider", ")" + text + R"(", null))";
-}
-
-/// The making of a status message.
-inline std::string statusText(const std::string& text)
-{
-    return R"(newString(")" + text + R"(", null))";
+    return Recorded::warning(module, text);
 }
 
 /// The path that a key or property of one of the types refers to; fails the test where there is none.
@@ -95,53 +93,15 @@ inline cimhost::Registration unloadable()
 }
 
 /// With two indicators unless a test makes others.
-class Fixture : public ProviderFixture
+class Fixture : public AssociationFixture
 {
 protected:
     Fixture() { MadeInventory::set({{"b", "2"}, {"a", "1"}}); }
-    explicit Fixture(cimhost::Registration registration) : ProviderFixture(std::move(registration))
+    explicit Fixture(cimhost::Registration registration) : AssociationFixture(std::move(registration))
     {
         MadeInventory::set({{"b", "2"}, {"a", "1"}});
     }
-
-    /// Ends the request and opens another, with nothing recorded so far.
-    void startAnew()
-    {
-        request.reset();
-        request = std::make_unique<cimhost::Request>(host);
-        clearRecords();
-        broker.name(request->context(), "ctx");
-    }
-
-    /// What makes and fills in the path of the only indicator, once its factory function was entered.
-    /// \param path  the recording's name of that path
-    std::vector<std::string> makingOfTheDevicePath(const std::string& path) const
-    {
-        return {"getNameSpace(ref, rc)",
-                R"(getCharPtr("root/test", rc))",
-                R"(newObjectPath("root/test", "TAVRO_Glimmark", rc))",
-                "getNameSpace(ref, rc)",
-                R"(getCharPtr("root/test", rc))",
-                "setNameSpace(" + path + R"(, "root/test"))",
-                "setHostname(" + path + ", " + quotedHost + ")",
-                "addKey(" + path + R"(, "CreationClassName", "TAVRO_Glimmark", chars))",
-                "addKey(" + path + R"(, "DeviceID", "a:/1", chars))",
-                "addKey(" + path + R"(, "SystemCreationClassName", "TAVRO_ComputerSystem", chars))",
-                "addKey(" + path + R"(, "SystemName", )" + quotedHost + ", chars)"};
-    }
-
-    const std::string quotedHost = '"' + Tavro::getSystemName() + '"';
-    const std::vector<std::string> resultServices{"returnObjectPath", "returnInstance", "returnDone"};
 };
-
-/// Lists of calls and lines, one after the other.
-template <class... Lists>
-std::vector<std::string> joined(const std::vector<std::string>& first, const Lists&... others)
-{
-    std::vector<std::string> all = first;
-    (all.insert(all.end(), others.begin(), others.end()), ...);
-    return all;
-}
 
 } // namespace SystemDevice
 
