@@ -1,6 +1,6 @@
 # Installs the build into an empty prefix and asks the provider from there, with nothing set in the environment. Run as
 #   cmake -DBUILD_DIR=DIR -DPREFIX=DIR -DINVENTORY=FILE -DPROVIDERDIR=lib/... -DLIBDIR=lib -DREADELF=... -DCOMPILER=...
-#         -DSANITIZED=BOOL -DREPLACEMENTS=DIR -DWORK_DIR=DIR -P THIS
+#         -DGENERATOR=... -DSANITIZED=BOOL -DREPLACEMENTS=DIR -DWORK_DIR=DIR -P THIS
 
 cmake_minimum_required(VERSION 3.20)
 
@@ -64,8 +64,9 @@ set(moved ${WORK_DIR}/moved)
 file(RENAME ${PREFIX} ${moved})
 set(maker ${WORK_DIR}/maker)
 execute_process(
-    COMMAND ${CMAKE_COMMAND} -S ${CMAKE_CURRENT_LIST_DIR}/development -B ${maker} -DCMAKE_PREFIX_PATH=${moved}
-            -DCMAKE_CXX_COMPILER=${COMPILER} -DREPLACEMENT=${REPLACEMENTS}/Instrumentation.cpp -DSANITIZED=${SANITIZED}
+    COMMAND ${CMAKE_COMMAND} -G ${GENERATOR} -S ${CMAKE_CURRENT_LIST_DIR}/development -B ${maker}
+            -DCMAKE_PREFIX_PATH=${moved} -DCMAKE_CXX_COMPILER=${COMPILER}
+            -DREPLACEMENT=${REPLACEMENTS}/Instrumentation.cpp -DSANITIZED=${SANITIZED}
     OUTPUT_QUIET COMMAND_ERROR_IS_FATAL ANY)
 execute_process(COMMAND ${CMAKE_COMMAND} --build ${maker} OUTPUT_QUIET COMMAND_ERROR_IS_FATAL ANY)
 

@@ -8,8 +8,11 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+using ::testing::AllOf;
 using ::testing::Contains;
+using ::testing::Each;
 using ::testing::ElementsAre;
+using ::testing::HasSubstr;
 using ::testing::IsEmpty;
 using ::testing::Not;
 using ::testing::SizeIs;
@@ -317,6 +320,13 @@ TEST_F(GlimmarkCapabilitiesProviderTest, GetFindsNothingEvenAtTheCapabilitiesOwn
         EXPECT_EQ(status.rc, failure == Failure::errorStatus ? CMPI_RC_ERR_FAILED : CMPI_RC_OK);
         expectFruitlessSearch();
     }
+}
+
+TEST_F(GlimmarkCapabilitiesProviderTest, GetWithoutAnInstanceIDSearchesWholeInstances)
+{
+    get(ref(capabilities, {{"CreationClassName", capabilities}}));
+    EXPECT_THAT(Logged::linesOf("getAllGlimmarkCapabilitiesCMPIInstances"),
+                AllOf(SizeIs(2), Each(HasSubstr(" isObjPath=0 "))));
 }
 
 TEST_F(GlimmarkCapabilitiesProviderTest, GetTakesAStringWithoutAnObjectBehindItForNoInstanceID)

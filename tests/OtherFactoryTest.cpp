@@ -123,10 +123,11 @@ protected:
     ~CapabilitiesOfAnotherFactory() override { getInstances = nullptr; }
 };
 
-class ReferencesFromAComputerSystem : public ProviderFixture
+class TraversalsFromAComputerSystem : public ProviderFixture,
+                                      public ::testing::WithParamInterface<const char*>
 {
 protected:
-    ReferencesFromAComputerSystem()
+    TraversalsFromAComputerSystem()
     {
         getPaths = [](const CMPIBroker* maker, const CMPIObjectPath* /*ref*/,
                       std::vector<CMPIObjectPath*>& paths) {
@@ -135,7 +136,7 @@ protected:
             return 0;
         };
     }
-    ~ReferencesFromAComputerSystem() override { getPaths = nullptr; }
+    ~TraversalsFromAComputerSystem() override { getPaths = nullptr; }
 };
 
 } // namespace
@@ -168,18 +169,16 @@ TEST_F(CapabilitiesOfAnotherFactory, AreReturnedForEachMatchOfTheWholePath)
     EXPECT_EQ(outcome.doneCount, 1);
 }
 
-TEST_F(ReferencesFromAComputerSystem, AreNoneForANullPointer)
-{
-    const Outcome outcome =
-        ask(host, operationCalled("TAVRO_GlimmarkSystemDevice_References_From_TAVRO_ComputerSystem"));
-    EXPECT_EQ(outcome.answer.status.code, CMPI_RC_OK);
-    EXPECT_EQ(outcome.answer.instances.size(), 1U);
-}
+INSTANTIATE_TEST_SUITE_P(
+    OverPaths, TraversalsFromAComputerSystem,
+    ::testing::Values("TAVRO_GlimmarkSystemDevice_AssociatorNames_From_TAVRO_ComputerSystem",
+                      "TAVRO_GlimmarkSystemDevice_References_From_TAVRO_ComputerSystem",
+                      "TAVRO_GlimmarkSystemDevice_ReferenceNames_From_TAVRO_ComputerSystem"),
+    [](const auto& tested) { return std::string(tested.param); });
 
-TEST_F(ReferencesFromAComputerSystem, HaveNoNameForANullPointer)
+TEST_P(TraversalsFromAComputerSystem, PassOverNullPointers)
 {
-    const Outcome outcome =
-        ask(host, operationCalled("TAVRO_GlimmarkSystemDevice_ReferenceNames_From_TAVRO_ComputerSystem"));
+    const Outcome outcome = ask(host, operationCalled(GetParam()));
     EXPECT_EQ(outcome.answer.status.code, CMPI_RC_OK);
-    EXPECT_EQ(outcome.answer.paths.size(), 1U);
+    EXPECT_EQ(outcome.answer.paths.size() + outcome.answer.instances.size(), 1U);
 }

@@ -249,14 +249,10 @@ FarEnd farEndOf(const CMPIObjectPath* target, CMPIStatus* rc)
 int getFarPaths(const GlimmarkFactory& factory, FarEnd farEnd, const CMPIObjectPath* ref,
                 std::vector<CMPIObjectPath*>& paths, CMPIStatus* rc)
 {
-    switch (farEnd) {
-    case FarEnd::glimmarks:
+    if (farEnd == FarEnd::glimmarks)
         return factory.getAllGlimmarkCMPIObjPaths(broker, ref, paths, rc);
-    case FarEnd::capabilities:
+    if (farEnd == FarEnd::capabilities)
         return factory.getAllGlimmarkCapabilitiesCMPIObjPaths(broker, ref, paths, rc);
-    case FarEnd::neither:
-        break;
-    }
     return 0;
 }
 
@@ -264,14 +260,10 @@ int getFarPaths(const GlimmarkFactory& factory, FarEnd farEnd, const CMPIObjectP
 int getFarInstances(const GlimmarkFactory& factory, FarEnd farEnd, const CMPIObjectPath* ref,
                     const char** properties, std::vector<CMPIInstance*>& instances, CMPIStatus* rc)
 {
-    switch (farEnd) {
-    case FarEnd::glimmarks:
+    if (farEnd == FarEnd::glimmarks)
         return factory.getAllGlimmarkCMPIInstances(broker, ref, properties, false, instances, rc);
-    case FarEnd::capabilities:
+    if (farEnd == FarEnd::capabilities)
         return factory.getAllGlimmarkCapabilitiesCMPIInstances(broker, ref, properties, false, instances, rc);
-    case FarEnd::neither:
-        break;
-    }
     return 0;
 }
 

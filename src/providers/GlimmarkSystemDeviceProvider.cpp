@@ -261,14 +261,10 @@ bool isWanted(FarEnd farEnd, const char* resultClass)
     const auto is = [&](const char* name) { return strcasecmp(resultClass, name) == 0; };
     if (resultClass == nullptr)
         return true;
-    switch (farEnd) {
-    case FarEnd::computerSystems:
+    if (farEnd == FarEnd::computerSystems)
         return is(ComputerSystemClass) || is("CIM_ComputerSystem");
-    case FarEnd::glimmarks:
+    if (farEnd == FarEnd::glimmarks)
         return is(GlimmarkClass) || is("CIM_AlarmDevice");
-    case FarEnd::neither:
-        break;
-    }
     return true;
 }
 
