@@ -274,11 +274,9 @@ CMPIInstance* newReference(const CMPIObjectPath* path, FarEnd farEnd, const CMPI
                            const CMPIObjectPath* far, CMPIStatus* rc)
 {
     CMPIInstance* const instance = path != nullptr ? Cmpi::newInstance(broker, path, rc) : nullptr;
-    if (instance != nullptr) {
-        const bool farIsDevice = farEnd == FarEnd::glimmarks;
-        Cmpi::setProperty(instance, "ManagedElement", farIsDevice ? far : ref);
-        Cmpi::setProperty(instance, "Capabilities", farIsDevice ? ref : far);
-    }
+    const bool farIsDevice = farEnd == FarEnd::glimmarks;
+    Cmpi::setProperty(instance, "ManagedElement", farIsDevice ? far : ref);
+    Cmpi::setProperty(instance, "Capabilities", farIsDevice ? ref : far);
     return instance;
 }
 
