@@ -29,6 +29,9 @@ target_compile_options(
               -Wlogical-op
               -Wuseless-cast>)
 
+# The compiler clears its memory up less often: a twentieth of its time for some hundred megabytes.
+target_compile_options(glimmark_settings INTERFACE $<$<CXX_COMPILER_ID:GNU>:--param=ggc-min-heapsize=1000000>)
+
 # Every symbol is found at link time, in an executable as in a library; a provider that a broker
 # loads with RTLD_NOW must not lack one. The sanitizers' own symbols come with the process.
 if(NOT GLIMMARK_SANITIZE)

@@ -1,19 +1,31 @@
-# What every executable of tests is built with: link against glimmark::test-settings. Its tests become ctest's by
+# What every program of tests is built with: link against glimmark::test-settings. Its tests become ctest's by
 # glimmark_add_tests_of().
 
 find_package(GTest 1.12 REQUIRED)
-include(GoogleTest)
 
 add_library(glimmark_test_settings INTERFACE)
 add_library(glimmark::test-settings ALIAS glimmark_test_settings)
-target_link_libraries(glimmark_test_settings INTERFACE glimmark::settings GTest::gmock)
+add_library(glimmark_compiled_together INTERFACE)
+target_link_libraries(glimmark_test_settings INTERFACE glimmark::settings glimmark_compiled_together GTest::gmock)
 
-# Optimising a test takes three times as long as compiling it and shows nothing: what it tests stays as shipped.
-target_compile_options(glimmark_test_settings INTERFACE -O0)
+# Optimising a test takes three times as long as compiling it and shows nothing: what it tests stays as shipped. Debug
+# information is for the preset debug; a failed test says its line itself.
+target_compile_options(glimmark_test_settings INTERFACE -O0 $<$<CONFIG:RelWithDebInfo>:-g0>)
 
+# Where the files of a program are compiled together, they see each other's names. The preset asan compiles each on its
+# own, and holds what is not held here.
+if(CMAKE_UNITY_BUILD)
+    target_compile_options(glimmark_compiled_together INTERFACE -Wno-shadow -Wno-subobject-linkage)
+endif()
+
+# The test framework's headers, compiled once for all programs of tests. All of these are compiled as libraries are
+# (-fPIC), as what is compiled before must be compiled alike.
+target_compile_options(glimmark_test_settings INTERFACE -fPIC)
+add_library(test-headers OBJECT ${CMAKE_CURRENT_LIST_DIR}/Empty.cpp)
+target_link_libraries(test-headers PRIVATE glimmark::test-settings)
 target_precompile_headers(
-    glimmark_test_settings
-    INTERFACE
+    test-headers
+    PRIVATE
     <gmock/gmock.h>
     <gtest/gtest.h>
     <map>
@@ -26,25 +38,22 @@ target_precompile_headers(
 # sanitizer has nothing to find.
 add_custom_target(threads)
 
-# glimmark_add_tests_of(EXECUTABLE [THREADS] [TEST_PREFIX PREFIX] [NO_PRETTY_VALUES])
+# glimmark_add_tests_of(PROGRAM [THREADS])
 #   THREADS: some of them run several threads
 #
-# Each test of the executable as one of ctest's, in a process of its own. A sanitizer takes longer to start a process
-# than most tests take: there the executable runs as a whole, in as many processes as there are jobs.
-function(glimmark_add_tests_of executable)
+# The program's tests as two of ctest's, half of them each, so that two run at a time. A process for each test would
+# take as long to start as most tests take to run. ./test NAME runs single ones.
+function(glimmark_add_tests_of program)
     cmake_parse_arguments(PARSE_ARGV 1 of "THREADS" "" "")
-    set(labels)
+    target_precompile_headers(${program} REUSE_FROM test-headers)
+    set(labels programs)
     if(of_THREADS)
-        set(labels LABELS threads)
-        add_dependencies(threads ${executable})
+        list(APPEND labels threads)
+        add_dependencies(threads ${program})
     endif()
-    if(NOT GLIMMARK_SANITIZE)
-        gtest_discover_tests(${executable} DISCOVERY_TIMEOUT 60 ${of_UNPARSED_ARGUMENTS} PROPERTIES ${labels})
-        return()
-    endif()
-    foreach(part IN ITEMS 0 1)
-        add_test(NAME ${executable}.${part} COMMAND ${executable} --gtest_brief=1)
-        set_tests_properties(${executable}.${part} PROPERTIES ENVIRONMENT "GTEST_TOTAL_SHARDS=2;GTEST_SHARD_INDEX=${part}"
-                                                              ${labels})
+    foreach(half IN ITEMS 0 1)
+        add_test(NAME ${program}.${half} COMMAND ${program} --gtest_brief=1)
+        set_tests_properties(${program}.${half} PROPERTIES ENVIRONMENT "GTEST_TOTAL_SHARDS=2;GTEST_SHARD_INDEX=${half}"
+                                                           LABELS "${labels}")
     endforeach()
 endfunction()

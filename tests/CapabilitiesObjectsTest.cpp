@@ -8,6 +8,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+namespace CapabilitiesObjectsTests {
+
 using Tavro::GlimmarkProvider::GlimmarkCapabilities;
 using Tavro::GlimmarkProvider::GlimmarkFactory;
 using ::testing::ElementsAre;
@@ -534,3 +536,5 @@ TEST_F(CapabilitiesObjectsTest, PathsAreTraced)
     EXPECT_THAT(Logged::lines(), ElementsAre(Logged::line(module, "ENTERING", allPaths, parameters),
                                              Logged::line(module, "EXITING", allPaths, parameters)));
 }
+
+} // namespace CapabilitiesObjectsTests

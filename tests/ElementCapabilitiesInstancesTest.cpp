@@ -9,7 +9,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-using namespace ElementCapabilities;
+namespace ElementCapabilities::InstancesTests {
+
 using ::testing::Contains;
 using ::testing::Each;
 using ::testing::ElementsAre;
@@ -575,3 +576,5 @@ TEST_F(ElementCapabilitiesInstances, GetKeepsTheStatusThatGetObjectPathLeaves)
     EXPECT_EQ(message(status), "injected");
     EXPECT_THAT(broker.calls(resultServices), ElementsAre("returnDone()"));
 }
+
+} // namespace ElementCapabilities::InstancesTests

@@ -8,7 +8,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-using namespace ElementCapabilities;
+namespace ElementCapabilities::TraversalTests {
+
 using ::testing::Each;
 using ::testing::ElementsAre;
 using ::testing::ElementsAreArray;
@@ -704,3 +705,5 @@ TEST_F(ElementCapabilitiesTraversal, AssociatorsAreReturnedBesideTheFactorysFail
     EXPECT_THAT(broker.calls(resultServices), ElementsAre("returnInstance(instance1)"));
     EXPECT_THAT(Logged::linesOf(associatorsName), SizeIs(2));
 }
+
+} // namespace ElementCapabilities::TraversalTests

@@ -7,6 +7,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+namespace EntryPointsTests {
+
 using ::testing::IsEmpty;
 
 namespace {
@@ -207,3 +209,5 @@ TEST_P(AssociationProviders, WithoutABrokerReportFailuresWithoutAMessage)
     EXPECT_EQ(names.msg, nullptr);
     EXPECT_THAT(broker.calls({"newString", "newObjectPath", "trace"}), IsEmpty());
 }
+
+} // namespace EntryPointsTests

@@ -8,6 +8,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+namespace GlimmarkCapabilitiesProviderTests {
+
 using ::testing::AllOf;
 using ::testing::Contains;
 using ::testing::Each;
@@ -343,3 +345,5 @@ TEST_F(GlimmarkCapabilitiesProviderTest, GetTakesAStringWithoutAnObjectBehindItF
     get(refTo(identifier));
     expectFruitlessSearch();
 }
+
+} // namespace GlimmarkCapabilitiesProviderTests

@@ -8,6 +8,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+namespace GlimmarkFactoryTests {
+
 using Tavro::GlimmarkProvider::Glimmark;
 using Tavro::GlimmarkProvider::GlimmarkFactory;
 using ::testing::Contains;
@@ -642,3 +644,5 @@ TEST_F(GlimmarkFactoryTest, PathsAreTraced)
                 ElementsAre(Logged::line(module, "ENTERING", function, parameters),
                             Logged::line(module, "EXITING", function, parameters)));
 }
+
+} // namespace GlimmarkFactoryTests

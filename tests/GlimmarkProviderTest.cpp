@@ -8,6 +8,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+namespace GlimmarkProviderTests {
+
 using ::testing::ElementsAre;
 using ::testing::IsEmpty;
 using ::testing::SizeIs;
@@ -422,3 +424,5 @@ TEST_F(GlimmarkProviderTest, NothingIsKeptBetweenRequests)
     newRequest();
     EXPECT_THAT(valuesOf(answer(enumerateNames(ref(glimmark))).paths, "DeviceID"), ElementsAre("new:/9"));
 }
+
+} // namespace GlimmarkProviderTests

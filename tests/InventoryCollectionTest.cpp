@@ -15,6 +15,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+namespace InventoryCollectionTests {
+
 using MadeInventory::Node;
 using Tavro::Instrumentation;
 using Tavro::ProviderException;
@@ -278,3 +280,5 @@ TEST_F(InventoryCollection, CapabilitiesAreTraced)
         ElementsAre(Logged::line("Glimmark", "ENTERING", "getGlimmarkCapabilitiesInstances", parameters),
                     Logged::line("Glimmark", "EXITING", "getGlimmarkCapabilitiesInstances", parameters)));
 }
+
+} // namespace InventoryCollectionTests

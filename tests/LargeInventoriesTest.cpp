@@ -12,6 +12,8 @@
 
 #include <gtest/gtest.h>
 
+namespace LargeInventoriesTests {
+
 namespace {
 
 #if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
@@ -198,3 +200,5 @@ TEST_F(LargeInventories, AreCountedForEachComputerSystemOfTheNames)
     // The list of all instances is cut where it is returned.
     EXPECT_EQ(ask(operationNamed("TAVRO_GlimmarkSystemDevice_EnumInstances")).answer.instances.size(), 464U);
 }
+
+} // namespace LargeInventoriesTests

@@ -14,6 +14,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+namespace RecordsTests {
+
 using Tavro::ProviderException;
 using Tavro::GlimmarkProvider::Glimmark;
 using Tavro::GlimmarkProvider::GlimmarkCapabilities;
@@ -206,3 +208,5 @@ TEST(ProviderException, IsAStandardException)
         EXPECT_STREQ(caught.what(), "text");
     }
 }
+
+} // namespace RecordsTests

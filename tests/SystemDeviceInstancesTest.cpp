@@ -5,6 +5,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+namespace SystemDeviceInstancesTests {
+
 using ::testing::Each;
 using ::testing::ElementsAre;
 using ::testing::ElementsAreArray;
@@ -810,3 +812,5 @@ TEST_F(SystemDeviceInstances, GetWithoutSystemsOrDevicesAnswersNothing)
     expectEmptyAnswer(get(refTo("alpha", "a:/1")));
     EXPECT_EQ(timeline().back(), "EXITING " + forOne);
 }
+
+} // namespace SystemDeviceInstancesTests

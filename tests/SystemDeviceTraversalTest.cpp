@@ -5,6 +5,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+namespace SystemDeviceTraversalTests {
+
 using ::testing::Contains;
 using ::testing::Each;
 using ::testing::ElementsAre;
@@ -1074,3 +1076,5 @@ TEST_P(AllTraversals, DoNotLookAtTheRoles)
     const CMPIStatus status = traverse(refToSystem(), {association, nullptr, "NoRole", "NoRole"});
     EXPECT_EQ(answered(status), 2U);
 }
+
+} // namespace SystemDeviceTraversalTests

@@ -9,6 +9,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+namespace TargetResolutionTests {
+
 using Tavro::GlimmarkProvider::GlimmarkFactory;
 using ::testing::Contains;
 using ::testing::Each;
@@ -374,3 +376,5 @@ TEST_F(TargetResolution, WithoutABrokerThereIsNoClassPath)
     EXPECT_THAT(Logged::flow(), ElementsAre("ENTERING " + forPath, "ENTERING " + forName,
                                             "EXITING " + forName, "EXITING " + forPath));
 }
+
+} // namespace TargetResolutionTests

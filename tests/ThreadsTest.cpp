@@ -18,6 +18,8 @@
 
 #include <gtest/gtest.h>
 
+namespace ThreadsTests {
+
 namespace {
 
 using Nodes = std::vector<MadeInventory::Node>;
@@ -181,3 +183,5 @@ TEST_F(Threads, GetTheAnswersThatOneAloneGetsFromOneOfTheInventories)
     std::cout << requests << " requests by " << threads << " threads, " << used << " of "
               << inventories.size() << " inventories seen, " << lines.size() << " trace lines\n";
 }
+
+} // namespace ThreadsTests

@@ -15,6 +15,8 @@
 #include <gtest/gtest.h>
 #include <rapidcheck/gtest.h>
 
+namespace TraceTests {
+
 using Tavro::FunctionTrace;
 using Tavro::MessageType;
 using Tavro::parameterList;
@@ -245,3 +247,5 @@ TEST_F(FunctionTraceTest, KeepsTheLinesOfThreadsApart)
         ASSERT_EQ(line.text, expected);
     }
 }
+
+} // namespace TraceTests

@@ -19,7 +19,7 @@ constexpr std::uint64_t secondsPerDay = 86'400;
 constexpr std::uint64_t lastPoint = 253'402'300'800 * microsPerSecond - 1;
 constexpr std::uint64_t lastInterval = 100'000'000 * secondsPerDay * microsPerSecond - 1;
 
-bool isDigit(char c)
+bool isDigitOrStar(char c)
 {
     return (c >= '0' && c <= '9') || c == '*';
 }
@@ -89,7 +89,7 @@ bool isDateTime(std::string_view text)
     if (sign != '+' && sign != '-' && sign != ':')
         return false;
     for (std::size_t i = 0; i < length; ++i)
-        if (i != pointAt && i != signAt && !isDigit(text[i]))
+        if (i != pointAt && i != signAt && !isDigitOrStar(text[i]))
             return false;
     if (!inRange(text, 8, 0, 23) || !inRange(text, 10, 0, 59) || !inRange(text, 12, 0, 59))
         return false;

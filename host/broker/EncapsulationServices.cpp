@@ -9,8 +9,6 @@ namespace cimhost {
 
 namespace {
 
-constexpr const char* theObject = "the object";
-
 CMPIInstance* newInstance(const CMPIBroker* broker, const CMPIObjectPath* path, CMPIStatus* rc)
 {
     return serve("CMPIBrokerEncFT.newInstance", rc, static_cast<CMPIInstance*>(nullptr), [&](Call& call) {
@@ -123,7 +121,7 @@ CMPIString* toString(const CMPIBroker* broker, const void* object, CMPIStatus* r
 {
     return serve("CMPIBrokerEncFT.toString", rc, static_cast<CMPIString*>(nullptr), [&](Call& call) {
         call.broker(broker);
-        return call.makeString(objectText(call.resolve(object, theObject)));
+        return call.makeString(objectText(call.resolve(object, "the object")));
     });
 }
 
@@ -131,7 +129,7 @@ CMPIBoolean isOfType(const CMPIBroker* broker, const void* object, const char* t
 {
     return serve("CMPIBrokerEncFT.isOfType", rc, CMPIBoolean{0}, [&](Call& call) {
         call.broker(broker);
-        const Handle& handle = call.resolve(object, theObject);
+        const Handle& handle = call.resolve(object, "the object");
         const bool same = call.text(type, "the type") == std::string(typeName(handle.kind));
         return static_cast<CMPIBoolean>(same ? 1 : 0);
     });
@@ -141,7 +139,7 @@ CMPIString* getType(const CMPIBroker* broker, const void* object, CMPIStatus* rc
 {
     return serve("CMPIBrokerEncFT.getType", rc, static_cast<CMPIString*>(nullptr), [&](Call& call) {
         call.broker(broker);
-        return call.makeString(typeName(call.resolve(object, theObject).kind));
+        return call.makeString(typeName(call.resolve(object, "the object").kind));
     });
 }
 
@@ -166,7 +164,7 @@ CMPIString* getMessage2(const CMPIBroker* broker, const char* /*id*/, CMPIMsgFil
     return defaultMessage("CMPIBrokerEncFT.getMessage2", broker, message, rc);
 }
 
-std::string given(const char* text)
+std::string textOrEmpty(const char* text)
 {
     return text == nullptr ? std::string() : std::string(text);
 }
@@ -175,7 +173,7 @@ std::string given(const char* text)
 std::string textOf(Call& call, const char* text, const CMPIString* string)
 {
     if (text != nullptr || string == nullptr)
-        return given(text);
+        return textOrEmpty(text);
     return call.use<StringObject>(string, "the string").text;
 }
 
@@ -184,7 +182,7 @@ CMPIStatus logMessage(const CMPIBroker* broker, CMPISeverity severity, const cha
 {
     return perform("CMPIBrokerEncFT.logMessage", [&](Call& call) {
         Core& core = call.broker(broker);
-        core.tell(LogRecord{severity, given(id), textOf(call, text, string)});
+        core.tell(LogRecord{severity, textOrEmpty(id), textOf(call, text, string)});
     });
 }
 
@@ -193,7 +191,7 @@ CMPIStatus trace(const CMPIBroker* broker, CMPILevel level, const char* componen
 {
     return perform("CMPIBrokerEncFT.trace", [&](Call& call) {
         Core& core = call.broker(broker);
-        core.tell(TraceRecord{level, given(component), textOf(call, text, string)});
+        core.tell(TraceRecord{level, textOrEmpty(component), textOf(call, text, string)});
     });
 }
 
@@ -204,9 +202,9 @@ CMPIError* newCMPIError(const CMPIBroker* broker, const char* owner, const char*
     return serve("CMPIBrokerEncFT.newCMPIError", rc, static_cast<CMPIError*>(nullptr), [&](Call& call) {
         call.broker(broker);
         ErrorObject error;
-        error.owningEntity = given(owner);
-        error.messageId = given(id);
-        error.message = given(message);
+        error.owningEntity = textOrEmpty(owner);
+        error.messageId = textOrEmpty(id);
+        error.message = textOrEmpty(message);
         error.severity = severity;
         error.probableCause = cause;
         error.statusCode = statusCode;

@@ -10,8 +10,6 @@ namespace cimhost {
 
 namespace {
 
-constexpr const char* theObject = "the object";
-
 /// A new block of zeroes that lives as long as the objects that are made now.
 void* allocate(Core& core, std::size_t size)
 {
@@ -128,7 +126,7 @@ void freeObject(const char* service, const CMPIBroker* broker, const EnvelopeOf<
 {
     perform(service, [&](Call& call) {
         call.broker(broker);
-        end(call.resolve(object, theObject, Traits<Object>::kind), State::released);
+        end(call.resolve(object, "the object", Traits<Object>::kind), State::released);
     });
 }
 

@@ -40,14 +40,14 @@ struct LiteralOf
     }
     std::string operator()(std::int64_t number) const { return std::to_string(number); }
     std::string operator()(double number) const { return realText(number); }
-    std::string operator()(const std::string& text) const { return quoted(text); }
+    std::string operator()(const std::string& text) const { return inQuotes(text); }
     std::string operator()(const std::shared_ptr<const ObjectPath>& path) const
     {
-        return path ? quoted(toText(*path)) : "NULL";
+        return path ? inQuotes(toText(*path)) : "NULL";
     }
     std::string operator()(const std::shared_ptr<const Instance>& instance) const
     {
-        return instance ? quoted(mof(*instance)) : "NULL";
+        return instance ? inQuotes(mof(*instance)) : "NULL";
     }
 };
 
@@ -69,7 +69,7 @@ std::string literal(const Value::Scalar& item, CMPIType type)
     return std::visit(LiteralOf{type}, item);
 }
 
-std::string quoted(std::string_view text)
+std::string inQuotes(std::string_view text)
 {
     return '"' + escaped(text, "\"") + '"';
 }

@@ -18,7 +18,7 @@ std::string literal(const Value& value);
 std::string literal(const Value::Scalar& item, CMPIType type);
 
 /// A text with quotes around it and escapes in it.
-std::string quoted(std::string_view text);
+std::string inQuotes(std::string_view text);
 
 /// The shortest text that reads back as the same number, always with a point or an exponent.
 std::string realText(double number);

@@ -360,7 +360,7 @@ bool readsAsReference(const std::string& content)
 /// A string key, with an escape that keeps it a string where it would be read as a reference.
 std::string stringKeyText(const std::string& content)
 {
-    std::string text = quoted(content);
+    std::string text = inQuotes(content);
     if (readsAsReference(content))
         text.replace(text.find('='), 1, "\\x003D");
     return text;

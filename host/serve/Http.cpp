@@ -8,7 +8,7 @@ namespace cimhost::serve {
 
 namespace {
 
-std::string_view trimmed(std::string_view text)
+std::string_view withoutBlanks(std::string_view text)
 {
     const std::size_t first = text.find_first_not_of(" \t");
     if (first == std::string_view::npos)
@@ -21,7 +21,7 @@ std::string_view takePart(std::string_view& text, char separator)
 {
     const std::string_view part = text.substr(0, text.find(separator));
     text.remove_prefix(std::min(part.size() + 1, text.size()));
-    return trimmed(part);
+    return withoutBlanks(part);
 }
 
 /// Whether a weight says "not at all", as q=0 or q=0.000 does.
@@ -78,7 +78,7 @@ std::string_view parameterOf(std::string_view value, std::string_view name)
         std::string_view parameter = takePart(value, ';');
         if (!cim::sameName(takePart(parameter, '='), name))
             continue;
-        parameter = trimmed(parameter);
+        parameter = withoutBlanks(parameter);
         const bool isQuoted = parameter.size() >= 2 && parameter.front() == '"' && parameter.back() == '"';
         return isQuoted ? parameter.substr(1, parameter.size() - 2) : parameter;
     }

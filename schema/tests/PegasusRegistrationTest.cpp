@@ -41,13 +41,13 @@ using testing::UnorderedElementsAre;
 using testing::UnorderedElementsAreArray;
 
 /// The two registrations of the same providers.
-struct Pair
+struct Registrations
 {
     const char* pegasus;
     const char* sfcb;
 };
 
-void PrintTo(const Pair& pair, std::ostream* stream)
+void PrintTo(const Registrations& pair, std::ostream* stream)
 {
     *stream << pair.pegasus;
 }
@@ -61,7 +61,7 @@ std::vector<std::string> namesOf(const std::map<std::string, WrittenValue>& valu
     return names;
 }
 
-class PegasusRegistration : public testing::TestWithParam<Pair>
+class PegasusRegistration : public testing::TestWithParam<Registrations>
 {
 protected:
     [[nodiscard]] std::vector<WrittenInstance> instancesOf(const std::string& className) const
@@ -176,7 +176,8 @@ TEST_P(PegasusRegistration, NamesNothingBeforeItIsThere)
 }
 
 INSTANTIATE_TEST_SUITE_P(Files, PegasusRegistration,
-                         testing::Values(Pair{"glimmark-pegasus.mof", "glimmark.reg"},
-                                         Pair{"computer-system-pegasus.mof", "computer-system.reg"}));
+                         testing::Values(Registrations{"glimmark-pegasus.mof", "glimmark.reg"},
+                                         Registrations{"computer-system-pegasus.mof",
+                                                       "computer-system.reg"}));
 
 } // namespace

@@ -20,19 +20,19 @@ using schema::Classes;
 using testing::ElementsAre;
 
 /// The MOF file of a registration, and the classes in both.
-struct Pair
+struct RegistrationOf
 {
     const char* mof;
     const char* registration;
     const char* location;
 };
 
-void PrintTo(const Pair& pair, std::ostream* stream)
+void PrintTo(const RegistrationOf& pair, std::ostream* stream)
 {
     *stream << pair.registration;
 }
 
-class Registration : public testing::TestWithParam<Pair>
+class Registration : public testing::TestWithParam<RegistrationOf>
 {
 protected:
     const std::string directory = SCHEMA_DIRECTORY "/";
@@ -93,8 +93,9 @@ TEST_P(Registration, NamesTheEntryPointsThatTheLibraryHas)
 }
 
 INSTANTIATE_TEST_SUITE_P(Files, Registration,
-                         testing::Values(Pair{"TAVRO_Glimmark.mof", "glimmark.reg", "GlimmarkProvider"},
-                                         Pair{"TAVRO_ComputerSystem.mof", "computer-system.reg",
-                                              "TavroComputerSystem"}));
+                         testing::Values(RegistrationOf{"TAVRO_Glimmark.mof", "glimmark.reg",
+                                                        "GlimmarkProvider"},
+                                         RegistrationOf{"TAVRO_ComputerSystem.mof", "computer-system.reg",
+                                                        "TavroComputerSystem"}));
 
 } // namespace

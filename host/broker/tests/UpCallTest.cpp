@@ -8,7 +8,7 @@ namespace {
 
 using testing::ElementsAre;
 
-Registration registration()
+Registration registrationOfBoth()
 {
     Registration classes = sampleRegistration({"Thing", "Asking"});
     classes.classes[0].association = true;
@@ -17,7 +17,7 @@ Registration registration()
 
 TEST(UpCallRequestTest, ReachTheOtherProvider)
 {
-    Broker broker(registration(), {SAMPLE_DIRECTORY});
+    Broker broker(registrationOfBoth(), {SAMPLE_DIRECTORY});
     const cim::Answer answer = broker.enumerateInstanceNames(classPath("TEST_Asking"));
     EXPECT_EQ(answer.status.code, CMPI_RC_OK);
     EXPECT_THAT(answer.paths, ElementsAre(thingPath("one"), thingPath("three")));
@@ -34,7 +34,7 @@ TEST(UpCallRequestTest, HandOnTheStatus)
 class UpCallTest : public BrokerFixture
 {
 protected:
-    UpCallTest() : BrokerFixture(registration()) {}
+    UpCallTest() : BrokerFixture(registrationOfBoth()) {}
 
     /// The texts of the names in an enumeration of paths or instances.
     std::vector<std::string> names(const CMPIEnumeration* enumeration)

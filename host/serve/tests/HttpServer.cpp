@@ -98,7 +98,7 @@ const std::string head =
     "POST /cimom HTTP/1.1\r\nHost: here\r\nContent-Type: text/xml\r\nCIMOperation: MethodCall\r\n"
     "CIMMethod: EnumerateInstanceNames\r\nCIMObject: root%2Fcimv2\r\n";
 
-std::string requestOf(const std::string& content)
+std::string httpRequest(const std::string& content)
 {
     return head + "Content-Length: " + std::to_string(content.size()) + "\r\n\r\n" + content;
 }
@@ -118,7 +118,7 @@ protected:
         return connection.receive();
     }
 
-    void expectServes() { EXPECT_THAT(ask(requestOf(body)), HasSubstr("<ERROR CODE=\"3\"")); }
+    void expectServes() { EXPECT_THAT(ask(httpRequest(body)), HasSubstr("<ERROR CODE=\"3\"")); }
 
     Broker broker{{}, {}};
     CimBinding binding{broker, "here", {4096, {}}};
@@ -129,7 +129,7 @@ TEST_F(Server, answersOnAFreePort)
 {
     start();
     EXPECT_NE(server->endpoint().port, 0);
-    const std::string response = ask(requestOf(body));
+    const std::string response = ask(httpRequest(body));
     EXPECT_THAT(response, StartsWith("HTTP/1.1 200 OK\r\n"));
     EXPECT_THAT(response, HasSubstr("CIMOperation: MethodResponse\r\n"));
     EXPECT_THAT(response, EndsWith("</MESSAGE></CIM>"));
@@ -163,12 +163,12 @@ TEST_F(Server, keepsConnections)
     start();
     Connection connection(server->endpoint());
     for (int i = 0; i < 3; ++i) {
-        connection.send(requestOf(body));
+        connection.send(httpRequest(body));
         EXPECT_THAT(connection.receive(), StartsWith("HTTP/1.1 200 OK\r\n")) << i;
     }
-    connection.send(requestOf("<CIM"));
+    connection.send(httpRequest("<CIM"));
     EXPECT_THAT(connection.receive(), HasSubstr("CIMError: request-not-well-formed\r\n"));
-    connection.send(requestOf(body) + requestOf(body));
+    connection.send(httpRequest(body) + httpRequest(body));
     EXPECT_THAT(connection.receive(), StartsWith("HTTP/1.1 200 OK\r\n")) << "after an error, and two at once";
     EXPECT_THAT(connection.receive(), StartsWith("HTTP/1.1 200 OK\r\n"));
 }
@@ -236,7 +236,7 @@ TEST_F(Server, answersOthersWhileARequestIsHalfThere)
 {
     start();
     Connection slow(server->endpoint());
-    const std::string request = requestOf(body);
+    const std::string request = httpRequest(body);
     slow.send(request.substr(0, request.size() / 2));
     expectServes();
     slow.send(request.substr(request.size() / 2));
@@ -252,7 +252,7 @@ TEST_F(Server, servesAgainAfterTooManyConnections)
         Connection first(server->endpoint());
         Connection second(server->endpoint());
         for (Connection* connection : {&first, &second}) {
-            connection->send(requestOf(body));
+            connection->send(httpRequest(body));
             EXPECT_THAT(connection->receive(), HasSubstr("200 OK"));
         }
         for (int i = 0; i < 10; ++i)
@@ -261,7 +261,7 @@ TEST_F(Server, servesAgainAfterTooManyConnections)
     // Until the server has seen that those two are gone it may close further ones.
     std::string response;
     for (int tries = 0; response.empty() && tries < 100000; ++tries)
-        response = ask(requestOf(body));
+        response = ask(httpRequest(body));
     EXPECT_THAT(response, HasSubstr("200 OK"));
 }
 
@@ -298,7 +298,7 @@ TEST_F(Server, answersWhatIsThereWhenItEnds)
     start();
     Connection idle(server->endpoint());
     Connection busy(server->endpoint());
-    busy.send(requestOf(body));
+    busy.send(httpRequest(body));
     EXPECT_THAT(busy.receive(), HasSubstr("200 OK"));
     server.reset();
     EXPECT_TRUE(idle.isClosed());
@@ -315,7 +315,7 @@ TEST_F(Server, answersManyClientsAtOnce)
         clients.emplace_back([&count, this] {
             Connection connection(server->endpoint());
             for (int i = 0; i < 20; ++i) {
-                connection.send(requestOf(body));
+                connection.send(httpRequest(body));
                 count += connection.receive().find("<ERROR CODE=\"3\"") == std::string::npos ? 0 : 1;
             }
         });

@@ -20,7 +20,7 @@ using testing::Not;
 
 namespace {
 
-RequestMessage requestOf(Operation operation)
+RequestMessage requestFor(Operation operation)
 {
     OperationRequest request;
     request.operation = operation;
@@ -30,7 +30,7 @@ RequestMessage requestOf(Operation operation)
 /// What stands inside of the response's method.
 std::string bodyOf(Operation operation, const cim::Answer& answer)
 {
-    const std::string document = writeResponse(requestOf(operation), answer, "here");
+    const std::string document = writeResponse(requestFor(operation), answer, "here");
     const std::string before =
         "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\">"
         "<MESSAGE ID=\"7 &amp; &quot;8&quot;\" PROTOCOLVERSION=\"1.0\"><SIMPLERSP><IMETHODRESPONSE NAME=\"Method\">";

@@ -16,7 +16,7 @@ using testing::HasSubstr;
 
 namespace {
 
-Element parse(const std::string& document)
+Element elementOf(const std::string& document)
 {
     return parseXml(document, {}, &isKnownElement);
 }
@@ -24,7 +24,7 @@ Element parse(const std::string& document)
 /// The one key of an INSTANCENAME.
 cim::Value keyOf(const std::string& value)
 {
-    const cim::ObjectPath path = readInstanceName(parse(
+    const cim::ObjectPath path = readInstanceName(elementOf(
         R"(<INSTANCENAME CLASSNAME="CIM_A"><KEYBINDING NAME="K">)" + value + "</KEYBINDING></INSTANCENAME>"));
     return path.keys.at(0).value;
 }
@@ -32,7 +32,7 @@ cim::Value keyOf(const std::string& value)
 /// The one property of an INSTANCE.
 cim::Value propertyOf(const std::string& property)
 {
-    return readInstance(parse("<INSTANCE CLASSNAME=\"CIM_A\">" + property + "</INSTANCE>"), {})
+    return readInstance(elementOf("<INSTANCE CLASSNAME=\"CIM_A\">" + property + "</INSTANCE>"), {})
         .properties.at(0)
         .value;
 }
@@ -94,12 +94,13 @@ TEST(KeyReader, refusesKeysThatRepeatOrHaveNoName)
 {
     const std::string key = "<KEYBINDING NAME=\"K\"><KEYVALUE/></KEYBINDING>";
     EXPECT_THAT(errorOf([&] {
-                    readInstanceName(parse("<INSTANCENAME CLASSNAME=\"C\">" + key + key + "</INSTANCENAME>"));
+                    readInstanceName(
+                        elementOf("<INSTANCENAME CLASSNAME=\"C\">" + key + key + "</INSTANCENAME>"));
                 }),
                 HasSubstr("found the key K again, expected each key once"));
     EXPECT_THAT(errorOf([&] {
                     readInstanceName(
-                        parse("<INSTANCENAME CLASSNAME=\"C\"><KEYVALUE>a</KEYVALUE></INSTANCENAME>"));
+                        elementOf("<INSTANCENAME CLASSNAME=\"C\"><KEYVALUE>a</KEYVALUE></INSTANCENAME>"));
                 }),
                 HasSubstr("found a key without its name, expected KEYBINDING"));
 }
@@ -107,8 +108,8 @@ TEST(KeyReader, refusesKeysThatRepeatOrHaveNoName)
 TEST(NameSpaceReader, joinsNames)
 {
     const auto read = [](const std::string& first, const std::string& second) {
-        return readNameSpace(parse("<LOCALNAMESPACEPATH><NAMESPACE NAME=\"" + first +
-                                   "\"/><NAMESPACE NAME=\"" + second + "\"/></LOCALNAMESPACEPATH>"));
+        return readNameSpace(elementOf("<LOCALNAMESPACEPATH><NAMESPACE NAME=\"" + first +
+                                       "\"/><NAMESPACE NAME=\"" + second + "\"/></LOCALNAMESPACEPATH>"));
     };
     EXPECT_EQ(read("root", "a"), "root/a");
     EXPECT_EQ(read("root/a", "b"), "root/a/b");
@@ -230,8 +231,11 @@ TEST(PropertyReader, boundsInstancesEmbeddedInEachOther)
         document =
             R"(<INSTANCE CLASSNAME="B"><PROPERTY NAME="P" TYPE="string" EmbeddedObject="instance"><VALUE>)" +
             escaped(document) + "</VALUE></PROPERTY></INSTANCE>";
-    EXPECT_EQ(errorOf([&] { readInstance(parse(document), {10, 100}); }), "");
-    EXPECT_THAT(errorOf([&] { readInstance(parse(document), {6, 100}); }), HasSubstr("deep in each other"));
+    EXPECT_EQ(errorOf([&] { readInstance(elementOf(document), {10, 100}); }), "");
+    EXPECT_THAT(errorOf([&] {
+                    readInstance(elementOf(document), {6, 100});
+                }),
+                HasSubstr("deep in each other"));
 }
 
 } // namespace

@@ -11,7 +11,7 @@
 namespace Tavro {
 namespace {
 
-constexpr const char* folder = "/sys/class/enclosure";
+constexpr const char* enclosureFolder = "/sys/class/enclosure";
 
 struct Light
 {
@@ -71,7 +71,7 @@ void appendEnclosures(const SysfsDirectory& enclosures, std::vector<Node>& nodes
         const SysfsDirectory enclosure(enclosures, name);
         if (!enclosure.isOpen())
             continue;
-        const Place place{devicePath(enclosures, folder, name), folder + ('/' + name)};
+        const Place place{devicePath(enclosures, enclosureFolder, name), enclosureFolder + ('/' + name)};
         for (const std::string& slotName : enclosure.names()) {
             if (!enclosure.hasDirectory(slotName))
                 continue;

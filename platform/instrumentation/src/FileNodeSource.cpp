@@ -11,7 +11,7 @@
 namespace Tavro {
 namespace {
 
-constexpr std::size_t mostBytes = 64UL * 1024 * 1024; ///< hundreds of thousands of nodes
+constexpr std::size_t mostOfAFile = 64UL * 1024 * 1024; ///< hundreds of thousands of nodes
 
 std::vector<Node> emptyInventory(const std::string& reason)
 {
@@ -24,7 +24,7 @@ std::vector<Node> emptyInventory(const std::string& reason)
 std::vector<Node> FileNodeSource::read() const
 {
     try {
-        Inventory inventory = readInventory(readFile(file_, mostBytes));
+        Inventory inventory = readInventory(readFile(file_, mostOfAFile));
         if (!inventory.sources.empty()) {
             std::vector<Node> read = SysfsNodeSource(inventory.sources).read();
             inventory.nodes.insert(inventory.nodes.end(), std::make_move_iterator(read.begin()),

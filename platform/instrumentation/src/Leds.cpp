@@ -12,7 +12,7 @@
 namespace Tavro {
 namespace {
 
-constexpr const char* folder = "/sys/class/leds";
+constexpr const char* ledFolder = "/sys/class/leds";
 
 /// The list of triggers has an entry for each processor, and so can be longer than a page.
 constexpr std::size_t longestTriggerList = 16 * SysfsDirectory::pageSize;
@@ -33,7 +33,7 @@ std::optional<Node> readLed(const SysfsDirectory& leds, const std::string& name)
     const SysfsDirectory led(leds, name);
     if (led.isAbsent() || led.errorCode() == ENOTDIR)
         return std::nullopt;
-    Node node = indicatorNode(describeLed(name), devicePath(leds, folder, name), folder + ('/' + name));
+    Node node = indicatorNode(describeLed(name), devicePath(leds, ledFolder, name), ledFolder + ('/' + name));
     if (!led.isOpen())
         return node;
 

@@ -20,7 +20,7 @@ using testing::Contains;
 using testing::IsEmpty;
 namespace NodeLexicon = Tavro::NodeLexicon;
 
-struct Indicator
+struct SampleIndicator
 {
     std::string description;
     std::string path;
@@ -28,13 +28,14 @@ struct Indicator
     std::optional<unsigned int> alarmState;
 };
 
-std::vector<Indicator> indicatorsOf(const std::string& sample)
+std::vector<SampleIndicator> indicatorsOf(const std::string& sample)
 {
     const PlatformTesting::Environment inventory("TAVRO_INVENTORY", INVENTORIES "/" + sample);
-    std::vector<Indicator> indicators;
+    std::vector<SampleIndicator> indicators;
     Instrumentation cursor;
     for (cursor.selectNode(NodeLexicon::DiagnosticIndicator); cursor; ++cursor) {
-        Indicator indicator{cursor.getNodeDescription(), cursor.getPathToNode(), cursor.getNodeStatus(), {}};
+        SampleIndicator indicator{
+            cursor.getNodeDescription(), cursor.getPathToNode(), cursor.getNodeStatus(), {}};
         if (unsigned int value = 0; cursor.getProperty(NodeLexicon::AlarmState, value))
             indicator.alarmState = value;
         indicators.push_back(indicator);
@@ -53,12 +54,12 @@ bool hasOtherKinds(const std::string& sample)
 
 TEST(Samples, theSmallServerHasEveryStatusAndAlarmState)
 {
-    const std::vector<Indicator> indicators = indicatorsOf("small-server.json");
+    const std::vector<SampleIndicator> indicators = indicatorsOf("small-server.json");
     EXPECT_GE(indicators.size(), 12U);
     std::set<unsigned int> statuses;
     std::set<std::optional<unsigned int>> alarmStates;
     std::set<std::string> paths;
-    for (const Indicator& indicator : indicators) {
+    for (const SampleIndicator& indicator : indicators) {
         statuses.insert(indicator.status);
         alarmStates.insert(indicator.alarmState);
         paths.insert(indicator.path);
@@ -73,7 +74,7 @@ TEST(Samples, theSmallServerHasEveryStatusAndAlarmState)
     EXPECT_TRUE(hasOtherKinds("small-server.json"));
 }
 
-std::string identifierOf(const Indicator& indicator)
+std::string identifierOf(const SampleIndicator& indicator)
 {
     const std::string text = indicator.description + ":" + indicator.path;
     return text.substr(text.find_first_not_of(' '),
@@ -82,10 +83,10 @@ std::string identifierOf(const Indicator& indicator)
 
 TEST(Samples, theEdgeCasesHoldWhatTheirNameSays)
 {
-    const std::vector<Indicator> indicators = indicatorsOf("edge-cases-readable.json");
+    const std::vector<SampleIndicator> indicators = indicatorsOf("edge-cases-readable.json");
     std::map<std::string, int> identifiers;
     std::string all;
-    for (const Indicator& indicator : indicators) {
+    for (const SampleIndicator& indicator : indicators) {
         ++identifiers[identifierOf(indicator)];
         all += indicator.description + indicator.path;
         EXPECT_NE(indicator.description, "");
@@ -98,16 +99,16 @@ TEST(Samples, theEdgeCasesHoldWhatTheirNameSays)
 
 TEST(Samples, theFullEdgeCasesHaveAnIndicatorWithoutDescriptionInTheMiddle)
 {
-    const std::vector<Indicator> readable = indicatorsOf("edge-cases-readable.json");
-    std::vector<Indicator> full = indicatorsOf("edge-cases.json");
+    const std::vector<SampleIndicator> readable = indicatorsOf("edge-cases-readable.json");
+    std::vector<SampleIndicator> full = indicatorsOf("edge-cases.json");
     const auto empty = std::find_if(full.begin(), full.end(),
-                                    [](const Indicator& each) { return each.description.empty(); });
+                                    [](const SampleIndicator& each) { return each.description.empty(); });
     ASSERT_NE(empty, full.end());
     EXPECT_NE(empty, full.begin());
     EXPECT_NE(empty + 1, full.end());
     full.erase(empty);
     EXPECT_TRUE(std::equal(full.begin(), full.end(), readable.begin(), readable.end(),
-                           [](const Indicator& a, const Indicator& b) {
+                           [](const SampleIndicator& a, const SampleIndicator& b) {
                                return a.description == b.description && a.path == b.path &&
                                       a.status == b.status && a.alarmState == b.alarmState;
                            }));

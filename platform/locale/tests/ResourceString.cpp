@@ -15,7 +15,7 @@ static_assert(!std::is_copy_constructible_v<ResourceString> && !std::is_copy_ass
 static_assert(!std::is_polymorphic_v<ResourceString>);
 static_assert(std::is_same_v<decltype(getResourceLibrary), std::wstring(int, const std::string&)>);
 
-constexpr const wchar_t* caption = L"MSGID_ALARMDEVICE_CAPTION";
+constexpr const wchar_t* captionId = L"MSGID_ALARMDEVICE_CAPTION";
 
 std::wstring textIn(int library, const std::string& language, const std::wstring& messageId)
 {
@@ -24,13 +24,13 @@ std::wstring textIn(int library, const std::string& language, const std::wstring
 
 TEST(ResourceString, isTheTextOfTheMessage)
 {
-    EXPECT_EQ(textIn(2, "en_US", caption), L"Diagnostic Indicator");
+    EXPECT_EQ(textIn(2, "en_US", captionId), L"Diagnostic Indicator");
 }
 
 TEST(ResourceString, isEnglishWhereTheLanguageHasNoText)
 {
     for (const char* const language : {"en", "en_GB", "tlh", "", "a/b", "\xFF", "2"})
-        EXPECT_EQ(textIn(2, language, caption), L"Diagnostic Indicator") << language;
+        EXPECT_EQ(textIn(2, language, captionId), L"Diagnostic Indicator") << language;
 }
 
 TEST(ResourceString, isTheMessageIdWhereNobodyHasAText)
@@ -43,18 +43,18 @@ TEST(ResourceString, isTheMessageIdWhereNobodyHasAText)
 TEST(ResourceString, belongsToItsLibrary)
 {
     for (const int library : {-2, 0, 1, 3, 22})
-        EXPECT_EQ(textIn(library, "en_US", caption), caption) << library;
+        EXPECT_EQ(textIn(library, "en_US", captionId), captionId) << library;
 }
 
 TEST(ResourceString, isTheMessageIdWhereTheLibraryIsNone)
 {
     for (const wchar_t* const library : {L"", L"2", L"/", L"/2", L"x/en_US", L"02/en_US"})
-        EXPECT_EQ(std::wstring(ResourceString(library, caption)), caption) << library;
+        EXPECT_EQ(std::wstring(ResourceString(library, captionId)), captionId) << library;
 }
 
 TEST(ResourceString, canBeReadMoreThanOnce)
 {
-    const ResourceString text(getResourceLibrary(2, "en_US"), caption);
+    const ResourceString text(getResourceLibrary(2, "en_US"), captionId);
     const std::wstring first = text;
     const std::wstring second = text;
     EXPECT_EQ(first, L"Diagnostic Indicator");

@@ -1,0 +1,1 @@
+// Empty: headers that are compiled once need a target with a source.
