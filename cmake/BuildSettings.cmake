@@ -84,6 +84,8 @@ if(NOT GLIMMARK_COVERAGE)
 endif()
 
 if(GLIMMARK_SANITIZE)
+    # For what a sanitizer makes too slow, or does otherwise.
+    add_compile_definitions(GLIMMARK_SANITIZED)
     add_compile_options(-fsanitize=${GLIMMARK_SANITIZE} -fno-sanitize-recover=all -fno-omit-frame-pointer)
     add_link_options(-fsanitize=${GLIMMARK_SANITIZE})
 endif()

@@ -16,7 +16,7 @@ namespace LargeInventoriesTests {
 
 namespace {
 
-#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+#ifdef GLIMMARK_SANITIZED
 // Without the size whose answers are the longest: a sanitizer takes minutes for it.
 constexpr std::size_t sizes[] = {1, 1'000, 65'536, 65'537};
 #else

@@ -9,12 +9,8 @@ namespace cimhost {
 
 namespace {
 
-// g++ tells of a sanitizer by a macro, clang++ by a feature.
-#if !defined(__has_feature)
-#define __has_feature(feature) 0
-#endif
-#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__) || __has_feature(address_sanitizer) ||     \
-    __has_feature(thread_sanitizer)
+// A sanitizer reports by the names of the library, when the process ends.
+#ifdef GLIMMARK_SANITIZED
 constexpr bool unloads = false;
 #else
 constexpr bool unloads = true;

@@ -17,7 +17,7 @@
 
 namespace {
 
-#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+#ifdef GLIMMARK_SANITIZED
 // A sanitizer keeps freed memory and finds leaks itself.
 constexpr bool memoryIsMeasured = false;
 #else

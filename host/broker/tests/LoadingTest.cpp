@@ -139,7 +139,7 @@ TEST(LoadingTest, RemembersAFailure)
     EXPECT_EQ(broker.enumerateInstanceNames(classPath("TEST_Refusing")).status.message, first);
 }
 
-#if !defined(__SANITIZE_ADDRESS__) && !defined(__SANITIZE_THREAD__)
+#ifndef GLIMMARK_SANITIZED
 
 bool isLoaded()
 {
