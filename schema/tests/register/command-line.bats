@@ -21,6 +21,8 @@ load machine
 
 @test "of two brokers one is named" {
     make_machine_of_sfcb
+    mkdir -p "$BROKER/root/PG_InterOp" "$BROKER/root/cimv2"
+    touch "$BROKER/root/PG_InterOp/class PG_ProviderModule"
     cp "$STAND_INS/"cim* "$BROKER/usr/sbin/"
     register 3 register
     says "--broker sfcb or --broker pegasus"

@@ -113,6 +113,9 @@ make_another_namespace() {
         is_as_remembered
     done
     [ -z "$(changes)" ]
+    register 0 register
+    register 3 --interop root/none status
+    says "root/none keeps no registrations"
 }
 
 @test "each step that fails is taken back" {

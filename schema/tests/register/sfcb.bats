@@ -153,6 +153,18 @@ END
     [ "$(grep -c '^\[TAVRO_' "$BROKER/running")" -eq 0 ]
 }
 
+@test "directories that are elsewhere behind links" {
+    mv "$stage" "$registered" "$BATS_TEST_TMPDIR/"
+    ln -s "$BATS_TEST_TMPDIR/stage" "$stage"
+    ln -s "$BATS_TEST_TMPDIR/registration" "$registered"
+    cp -r "$BATS_TEST_TMPDIR/stage" "$BATS_TEST_TMPDIR/registration" "$BROKER/"
+    FAIL="1 sfcbrepos -f" register 4 register
+    diff -r "$BROKER/stage" "$BATS_TEST_TMPDIR/stage"
+    diff -r "$BROKER/registration" "$BATS_TEST_TMPDIR/registration"
+    register 0 register
+    register 0 status
+}
+
 @test "staged and not built is not registered" {
     cp "$SCHEMA/glimmark.reg" "$stage/regs/"
     sfcbstage -n root/cimv2 "$SCHEMA/TAVRO_Glimmark.mof"
