@@ -60,7 +60,7 @@ teardown() { end_broker; }
     make_machine_of_sfcb
     export MISSING="libmvlog.so.1 libtavro-common.so.1"
     register 0 register
-    says "library: $cmpi/libGlimmarkProvider.so, for which the loader does not find libtavro-common.so.1 libmvlog.so.1"
+    says "library: $cmpi/libGlimmarkProvider.so, for which the loader does not find libtavro-common.so.1 libmvlog.so.1: "
     register 0 status
     says "does not find libtavro-common.so.1 libmvlog.so.1"
 }
