@@ -4,16 +4,9 @@
 load machine
 
 setup() {
-    make_machine cimmof cimprovider cimcli
-    mkdir -p "$BROKER/root/cimv2" "$BROKER/root/PG_InterOp" "$BROKER/root/interop"
-    echo CIM_AlarmDevice >"$BROKER/root/cimv2/class CIM_AlarmDevice"
-    echo PG_ProviderModule >"$BROKER/root/PG_InterOp/class PG_ProviderModule"
+    make_machine_of_pegasus
     remember_state
 }
-
-without_cimcli() { rm "$BROKER/usr/sbin/cimcli" && remember_state; }
-
-changes() { calls | grep -Ev '^(cimcli gc|cimprovider -l)'; }
 
 @test "registering compiles the classes, then the registration" {
     register 0 register
@@ -33,7 +26,7 @@ END
     says "cimmof -n root/cimv2 "
     says "compiling the registration"
     says "cimmof -n root/PG_InterOp "
-    says "registered with OpenPegasus"
+    says "registered with OpenPegasus in root/cimv2"
 }
 
 @test "registering twice changes nothing" {
@@ -46,27 +39,87 @@ END
 }
 
 @test "the interop namespace of newer ones is found" {
-    mv "$BROKER/root/PG_InterOp/class PG_ProviderModule" "$BROKER/root/interop/"
+    mv "$BROKER/root/PG_InterOp/"* "$BROKER/root/interop/"
     register 0 register
     [ -e "$BROKER/root/interop/module GlimmarkProviderModule" ]
 }
 
 @test "the interop namespace that is named" {
-    mv "$BROKER/root/PG_InterOp/class PG_ProviderModule" "$BROKER/root/interop/"
-    without_cimcli
+    mv "$BROKER/root/PG_InterOp/"* "$BROKER/root/interop/"
     register 0 --interop root/interop register
     [ -e "$BROKER/root/interop/module GlimmarkProviderModule" ]
 }
 
+make_another_namespace() {
+    cp -r "$BROKER/root/cimv2" "$BROKER/root/other"
+    remember_state
+}
+
 @test "in another namespace" {
-    mkdir "$BROKER/root/other"
+    make_another_namespace
     register 0 --namespace=root/other register
     [ -e "$BROKER/root/other/class TAVRO_Glimmark" ]
     [ "$(grep -c 'Namespaces = {"root/other"};' "$BROKER/root/PG_InterOp/module GlimmarkProviderModule")" -eq 4 ]
+    register 0 --namespace=root/other status
+    register 0 --namespace=root/OTHER status
+}
+
+@test "another namespace than the one that is served" {
+    make_another_namespace
+    register 0 register
+    remember_state
+    register 1 --namespace root/other status
+    says "not registered with OpenPegasus in root/other"
+    says "root/cimv2"
+    register 0 --namespace root/other unregister
+    says "nothing to do"
+    register 3 --namespace root/other register
+    says "glimmark-register --namespace root/cimv2 unregister"
+    is_as_remembered
+    [ -z "$(changes)" ]
+}
+
+@test "a registration that serves another namespace too is left alone" {
+    register 0 register
+    sed -i 's|{"root/cimv2"}|{"root/cimv2", "root/other"}|' "$BROKER/root/PG_InterOp/module GlimmarkProviderModule"
+    remember_state
+    register 1 status
+    says "otherwise than installed"
+    register 3 unregister
+    says "root/other"
+    is_as_remembered
+}
+
+@test "a namespace that is not there is not made" {
+    register 3 --namespace root/none register
+    says "there is no namespace root/none"
+    is_as_remembered
+    [ -z "$(changes)" ]
+}
+
+@test "without the DMTF schema nothing starts" {
+    rm "$BROKER/root/cimv2/class CIM_ElementCapabilities"
+    remember_state
+    register 3 register
+    says "the DMTF schema in root/cimv2 is missing or too old: there is no class CIM_ElementCapabilities"
+    is_as_remembered
+    [ -z "$(changes)" ]
+}
+
+@test "a namespace that keeps no registrations is not made" {
+    for interop in root/interop root/none; do
+        register 3 --interop $interop register
+        says "$interop keeps no registrations"
+        is_as_remembered
+    done
+    [ -z "$(changes)" ]
+    register 0 register
+    register 3 --interop root/none status
+    says "root/none keeps no registrations"
 }
 
 @test "each step that fails is taken back" {
-    for FAIL in "1 cimmof -n root/cimv2" "1 cimmof -n root/PG_InterOp" "2 cimprovider -l"; do
+    for FAIL in "1 cimmof -n root/cimv2" "1 cimmof -n root/PG_InterOp" "3 cimprovider -l"; do
         export FAIL
         : >"$CALLS"
         register 4 register
@@ -93,23 +146,9 @@ END
 }
 
 @test "what cannot be taken back is said" {
-    export FAIL="1 cimcli dc"
-    rm "$BROKER/root/PG_InterOp/class PG_ProviderModule"
-    register 5 register
+    FAIL=$'1 cimmof -n root/PG_InterOp\n1 cimcli dc' register 5 register
+    says "there since: class TAVRO_GlimmarkSystemDevice in root/cimv2"
     says "not all could be taken back"
-}
-
-@test "without cimcli it registers all the same" {
-    without_cimcli
-    register 0 register
-    [ -e "$BROKER/root/PG_InterOp/module GlimmarkProviderModule" ]
-}
-
-@test "without cimcli a failed step removes the registration, and says that classes may stay" {
-    without_cimcli
-    FAIL="1 cimmof -n root/PG_InterOp" register 5 register
-    says "without cimcli they cannot be deleted"
-    [ ! -e "$BROKER/root/PG_InterOp/module GlimmarkProviderModule" ]
 }
 
 @test "an interrupted step is taken back" {
@@ -134,15 +173,6 @@ END
     [ -z "$(changes)" ]
 }
 
-@test "unregistering without cimcli says that the classes stay" {
-    register 0 register
-    without_cimcli
-    register 0 unregister
-    says "the classes stay in root/cimv2"
-    [ ! -e "$BROKER/root/PG_InterOp/module GlimmarkProviderModule" ]
-    register 0 register
-}
-
 @test "each step of unregistering that fails is taken back" {
     register 0 register
     remember_state
@@ -154,11 +184,47 @@ END
     done
 }
 
-@test "a broker that does not answer" {
-    export FAIL="1 cimprovider -l"
+@test "an incomplete registration is told, and can be unregistered" {
+    cp "$BROKER/root/cimv2/class CIM_AlarmDevice" "$BATS_TEST_TMPDIR/"
+    register 0 register
+    module="$BROKER/root/PG_InterOp/module GlimmarkProviderModule"
+    head -n 45 "$module" >"$BATS_TEST_TMPDIR/half"
+    cp "$BATS_TEST_TMPDIR/half" "$module"
+    register 1 status
+    says "otherwise than installed"
     register 3 register
+    says "glimmark-register unregister"
+    register 0 unregister
+    is_as_remembered
+}
+
+@test "a registration without its classes is told" {
+    register 0 register
+    rm "$BROKER/root/cimv2/class TAVRO_Glimmark"
+    register 1 status
+    says "otherwise than installed"
+}
+
+@test "a broker that does not answer" {
+    DOWN=yes register 3 register
     says "does OpenPegasus run?"
     is_as_remembered
+}
+
+@test "a broker that ends in between" {
+    register 0 register
+    : >"$CALLS"
+    FAIL="1 cimcli ei" register 3 status
+    says "does OpenPegasus run?"
+}
+
+@test "a broker that is installed apart" {
+    apart=$BATS_TEST_TMPDIR/apart
+    mkdir -p "$apart/bin"
+    mv "$BROKER/usr/sbin/"cim* "$apart/bin/"
+    register 3 status
+    register 0 --prefix "$apart" register
+    register 0 --prefix "$apart" status
 }
 
 @test "the status tells registered and not registered" {

@@ -1,14 +1,15 @@
 #!/usr/bin/env bats
 # glimmark-register with the small-footprint broker.
+# shellcheck disable=SC2154 # names of the machine
 
 load machine
 
 setup() {
-    make_machine sfcbstage sfcbrepos systemctl
-    stage=$BROKER/var/lib/sfcb/stage
-    mkdir -p "$stage/regs" "$stage/mofs/root/cimv2"
+    make_machine_of_sfcb
     printf '[CIM_Fan]\n   provider: FanProvider\n' >"$stage/regs/fan.reg"
     export UNIT=sblim-sfcb
+    sfcbrepos -f
+    echo "made by a client" >"$registered/repository/root/interop/subscriptions"
     sfcbrepos -f
     systemctl restart sblim-sfcb
     remember_state
@@ -24,7 +25,7 @@ stage_an_older_version() {
 
 @test "registering stages, rebuilds and restarts" {
     register 0 register
-    diff <(calls) - <<'END'
+    diff <(changes) - <<'END'
 systemctl --quiet is-active sblim-sfcb
 sfcbstage -n cimv2 -r glimmark.reg TAVRO_Glimmark.mof
 sfcbrepos -f
@@ -34,6 +35,7 @@ END
     [ "$(grep -c '^\[TAVRO_' "$BROKER/running")" -eq 4 ]
     [ "$(grep -c '^class TAVRO_' "$BROKER/running")" -eq 4 ]
     grep -q CIM_Fan "$BROKER/running"
+    grep -q "made by a client" "$BROKER/running"
 }
 
 @test "it says what it does" {
@@ -42,7 +44,7 @@ END
     says "sfcbstage -n root/cimv2 -r "
     says "rebuilding the repository"
     says "restarting the broker"
-    says "registered with SFCB"
+    says "registered with SFCB in root/cimv2"
 }
 
 @test "registering twice changes nothing" {
@@ -51,7 +53,7 @@ END
     register 0 register
     says "nothing to do"
     is_as_remembered
-    [ "$(calls)" = "systemctl --quiet is-active sblim-sfcb" ]
+    [ "$(changes)" = "systemctl --quiet is-active sblim-sfcb" ]
 }
 
 @test "an older version is replaced" {
@@ -70,8 +72,19 @@ END
     [ "$(grep -c '^class TAVRO_' "$BROKER/running")" -eq 4 ]
 }
 
+@test "another namespace than the one that is served" {
+    register 0 register
+    remember_state
+    register 1 --namespace root/other status
+    says "not registered with SFCB in root/other"
+    says "root/cimv2"
+    register 0 --namespace root/other unregister
+    says "nothing to do"
+    is_as_remembered
+}
+
 @test "each step that fails is taken back" {
-    for FAIL in "1 sfcbstage" "1 sfcbrepos" "1 systemctl restart"; do
+    for FAIL in "1 sfcbstage -n" "1 sfcbrepos -f" "1 systemctl restart"; do
         export FAIL
         : >"$CALLS"
         register 4 register
@@ -82,7 +95,7 @@ END
 
 @test "each step that fails brings the older version back" {
     stage_an_older_version
-    for FAIL in "1 sfcbstage" "1 sfcbrepos" "1 systemctl restart"; do
+    for FAIL in "1 sfcbstage -n" "1 sfcbrepos -f" "1 systemctl restart"; do
         export FAIL
         : >"$CALLS"
         register 4 register
@@ -91,18 +104,31 @@ END
     done
 }
 
+@test "what it takes back does not hang on the broker's tools" {
+    FAIL="1+ sfcbrepos -f" register 4 register
+    is_as_remembered
+    [ "$(calls | grep -c '^sfcbrepos -f')" -eq 1 ]
+}
+
+@test "a repository that was not there is removed again" {
+    rm -r "$registered"
+    remember_state
+    FAIL="1 sfcbrepos -f" register 4 register
+    is_as_remembered
+}
+
 @test "folders that a failed step made are removed" {
-    FAIL="1 sfcbrepos" register 4 --namespace root/other register
+    FAIL="1 sfcbrepos -f" register 4 --namespace root/other register
     is_as_remembered
 }
 
 @test "what cannot be taken back is said" {
-    FAIL="1+ sfcbrepos" register 5 register
+    FAIL="1+ systemctl restart" register 5 register
     says "not all could be taken back"
 }
 
 @test "an interrupted step is taken back" {
-    export INTERRUPT=sfcbstage
+    export INTERRUPT="sfcbrepos -f"
     register 4 register
     says interrupted
     is_as_remembered
@@ -114,19 +140,96 @@ END
     is_as_remembered
 }
 
-@test "a staging directory that is named" {
-    export STAGE=$BATS_TEST_TMPDIR/"another stage"
-    mkdir "$STAGE"
-    register 0 --stage-dir "$STAGE" register
-    [ -e "$STAGE/regs/glimmark.reg" ]
-    register 0 --stage-dir "$STAGE" status
+@test "a staging directory that is named is the one that is built from" {
+    another=$BATS_TEST_TMPDIR/another_stage
+    mkdir -p "$another/regs"
+    cp "$stage/default.reg" "$another/"
+    register 0 --stage-dir "$another" register
+    [ -e "$another/regs/glimmark.reg" ]
+    [ ! -e "$stage/regs/glimmark.reg" ]
+    [ "$(grep -c '^\[TAVRO_' "$BROKER/running")" -eq 4 ]
+    register 0 --stage-dir "$another" status
+    register 0 --stage-dir "$another" unregister
+    [ "$(grep -c '^\[TAVRO_' "$BROKER/running")" -eq 0 ]
+}
+
+@test "directories that are elsewhere behind links" {
+    mv "$stage" "$registered" "$BATS_TEST_TMPDIR/"
+    ln -s "$BATS_TEST_TMPDIR/stage" "$stage"
+    ln -s "$BATS_TEST_TMPDIR/registration" "$registered"
+    cp -r "$BATS_TEST_TMPDIR/stage" "$BATS_TEST_TMPDIR/registration" "$BROKER/"
+    FAIL="1 sfcbrepos -f" register 4 register
+    diff -r "$BROKER/stage" "$BATS_TEST_TMPDIR/stage"
+    diff -r "$BROKER/registration" "$BATS_TEST_TMPDIR/registration"
+    register 0 register
+    register 0 status
+}
+
+@test "staged and not built is not registered" {
+    cp "$SCHEMA/glimmark.reg" "$stage/regs/"
+    sfcbstage -n root/cimv2 "$SCHEMA/TAVRO_Glimmark.mof"
     register 1 status
+    says "otherwise than installed"
+    register 0 register
+    [ "$(grep -c '^\[TAVRO_' "$BROKER/running")" -eq 4 ]
+}
+
+@test "built and no longer staged can be unregistered" {
+    register 0 register
+    rm "$stage/regs/glimmark.reg" "$stage/mofs/root/cimv2/TAVRO_Glimmark.mof"
+    register 1 status
+    register 0 unregister
+    [ "$(grep -c TAVRO "$BROKER/running")" -eq 0 ]
+}
+
+@test "the repository that the broker's configuration names" {
+    another=$BROKER/another_registration
+    echo "registrationDir:  $another" >>"$config"
+    register 0 register
+    [ "$(grep -c '^\[TAVRO_' "$another/providerRegister")" -eq 4 ]
+    register 0 status
+    echo "registrationDir: $registered" >>"$config"
+    register 1 status
+}
+
+@test "a broker that is installed apart" {
+    apart=$BATS_TEST_TMPDIR/apart
+    mkdir -p "$apart/bin" "$apart/var/lib/sfcb" "$apart/etc/sfcb" "$apart/share/sfcb"
+    cp "$BROKER/usr/sbin/"{sfcbstage,sfcbrepos,ldd} "$apart/bin/"
+    cp -r "$stage" "$apart/var/lib/sfcb/"
+    cp -r "$BROKER/usr/share/sfcb/CIM" "$apart/share/sfcb/"
+    echo "providerDirs: $cmpi" >"$apart/etc/sfcb/sfcb.cfg"
+    rm -r "$stage" "$BROKER/usr/share/sfcb" "$config"
+    remember_state
+    register 0 --prefix "$apart" register
+    is_as_remembered
+    [ -e "$apart/var/lib/sfcb/stage/regs/glimmark.reg" ]
+    [ "$(grep -c '^\[TAVRO_' "$apart/var/lib/sfcb/registration/providerRegister")" -eq 4 ]
+    register 0 --prefix "$apart" status
+    says "library: $cmpi/libGlimmarkProvider.so"
+    register 3 --prefix "$BATS_TEST_TMPDIR/none" status
+    says "there is no broker below $BATS_TEST_TMPDIR/none"
 }
 
 @test "without a staging directory nothing starts" {
     register 3 --stage-dir "$BATS_TEST_TMPDIR/none" register
     says "there is no staging directory $BATS_TEST_TMPDIR/none"
+    mkdir "$BATS_TEST_TMPDIR/empty"
+    register 3 --stage-dir "$BATS_TEST_TMPDIR/empty" register
+    says "$BATS_TEST_TMPDIR/empty is no staging directory of SFCB"
+    mkdir "$BATS_TEST_TMPDIR/a blank"
+    register 3 --stage-dir "$BATS_TEST_TMPDIR/a blank" register
+    says "SFCB's tools take no folder with a blank"
     is_as_remembered
+}
+
+@test "without the DMTF schema nothing starts" {
+    rm "$BROKER/usr/share/sfcb/CIM/CIM_Schema.mof"
+    remember_state
+    register 3 register
+    says "the DMTF schema is missing: there is no $BROKER/usr/share/sfcb/CIM/CIM_Schema.mof"
+    is_as_remembered
+    [ "$(changes)" = "systemctl --quiet is-active sblim-sfcb" ]
 }
 
 @test "a class and provider that another file registers are not registered again" {
@@ -146,13 +249,14 @@ END
     register 0 register
     remember_state
     register 0 unregister
-    diff <(calls) - <<'END'
+    diff <(changes) - <<'END'
 systemctl --quiet is-active sblim-sfcb
 sfcbrepos -f
 systemctl restart sblim-sfcb
 END
     [ "$(grep -c TAVRO "$BROKER/running")" -eq 0 ]
     grep -q CIM_Fan "$BROKER/running"
+    grep -q "made by a client" "$BROKER/running"
 }
 
 @test "unregistering twice changes nothing" {
@@ -164,7 +268,7 @@ END
 @test "each step of unregistering that fails is taken back" {
     register 0 register
     remember_state
-    for FAIL in "1 sfcbrepos" "1 systemctl restart"; do
+    for FAIL in "1 sfcbrepos -f" "1 systemctl restart"; do
         export FAIL
         : >"$CALLS"
         register 4 unregister
@@ -191,24 +295,39 @@ END
 
 @test "a broker that does not run as a service is not restarted" {
     UNIT='' register 0 register
-    says "if it runs, restart it"
+    says "SFCB takes this up when it starts"
     [ "$(grep -c 'systemctl restart' "$CALLS")" -eq 0 ]
-    grep -q TAVRO_Glimmark "$BROKER/repository"
+    grep -q TAVRO_Glimmark "$registered/providerRegister"
+}
+
+@test "a machine on which systemd does not run" {
+    NO_SYSTEMD=yes register 0 register
+    says "SFCB takes this up when it starts"
+    says_not "booted with systemd"
+    says_not "Failed to connect"
+}
+
+teardown() { end_broker; }
+
+@test "the process that is to be restarted is named" {
+    run_broker sfcbd /dev/null x
+    UNIT='' register 0 register
+    says "restart SFCB, process $broker_process: it takes this up when it starts"
 }
 
 @test "a machine without systemctl" {
     rm "$BROKER/usr/sbin/systemctl"
     PATH=$(without_systemctl)
     register 0 register
-    says "if it runs, restart it"
+    says "SFCB takes this up when it starts"
 }
 
 # The tools of the path that the program needs, in a folder of their own.
 without_systemctl() {
     local bin=$BATS_TEST_TMPDIR/bin tool
     mkdir "$bin"
-    for tool in bash env cat cp awk find tar sed head tac dirname basename readlink mktemp mkdir rm rmdir xargs cmp \
-        sort grep; do
+    for tool in bash env cat cp mv awk find tar sed head tac tail tr dirname basename readlink mktemp mkdir rm rmdir xargs \
+        cmp diff sort grep getopt; do
         ln -s "$(command -v "$tool")" "$bin/"
     done
     echo "$BROKER/usr/sbin:$bin"
@@ -216,7 +335,7 @@ without_systemctl() {
 
 @test "no restart, when that is asked for" {
     register 0 --no-restart register
-    says "if it runs, restart it"
+    says "restart SFCB, the service sblim-sfcb: it takes this up when it starts"
     [ "$(grep -c 'systemctl restart' "$CALLS")" -eq 0 ]
 }
 
@@ -226,7 +345,7 @@ without_systemctl() {
     says "would run:   sfcbrepos -f"
     says "would run:   systemctl restart sblim-sfcb"
     is_as_remembered
-    [ "$(calls)" = "systemctl --quiet is-active sblim-sfcb" ]
+    [ "$(changes)" = "systemctl --quiet is-active sblim-sfcb" ]
     register 0 register
     remember_state
     USER_ID=1000 register 0 --dry-run unregister
