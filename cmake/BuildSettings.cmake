@@ -93,7 +93,7 @@ endif()
 # Every source tells the fuzzer which of its branches an input took.
 if(GLIMMARK_FUZZ)
     if(NOT CMAKE_CXX_COMPILER_ID STREQUAL "Clang")
-        message(FATAL_ERROR "GLIMMARK_FUZZ needs clang, which brings libFuzzer; the preset fuzz asks for it")
+        message(FATAL_ERROR "GLIMMARK_FUZZ needs clang, which brings libFuzzer; the preset asan asks for it")
     endif()
     add_compile_options(-fsanitize=fuzzer-no-link)
     add_link_options(-fsanitize=fuzzer-no-link)
