@@ -10,8 +10,9 @@ function(glimmark_add_cmpi_headers name directory)
     add_library(glimmark_${name} INTERFACE)
     add_library(glimmark::${name} ALIAS glimmark_${name})
     target_include_directories(glimmark_${name} ${ARGN} INTERFACE ${directory})
-    # The brokers' headers ask for the platform by name.
-    target_compile_definitions(glimmark_${name} INTERFACE CMPI_PLATFORM_LINUX_GENERIC_GNU)
+    # The brokers' headers ask for the platform by name. Some name a calling convention then, which Linux does not
+    # have: there is but one.
+    target_compile_definitions(glimmark_${name} INTERFACE CMPI_PLATFORM_LINUX_GENERIC_GNU __cdecl=)
 endfunction()
 
 glimmark_add_cmpi_headers(cmpi-own ${PROJECT_SOURCE_DIR}/cmpi)

@@ -1,45 +1,55 @@
-# Compiles the provider library's sources against CMPI headers that differ from the project's own as a broker's may:
-# older ones without any `const`, and newer ones with more slots at the end of each table. Run as
-#   cmake -DCOMPILER=... -DSOURCE_DIR=DIR -DWORK_DIR=DIR -DFLAGS="-I...;..." -P THIS
+# Compiles the sources that include CMPI headers against headers that differ from the project's own as a broker's may,
+# each kind in one property: without any `const`, and so with names that are char*; without the type CMPIVersion; with
+# functions of threads that name a calling convention; and with more slots at the end of each table. Run as
+#   cmake -DCOMPILER=... -DSOURCE_DIR=DIR -DWORK_DIR=DIR "-DSOURCES=FILE;..." "-DFLAGS=-I...;..." -P THIS
+# Among the flags are the warnings and the definitions of the build.
 
 cmake_minimum_required(VERSION 3.20)
 
-file(STRINGS ${SOURCE_DIR}/src/CMakeLists.txt lines REGEX "^ +[a-z]+/[A-Za-z]+\\.cpp\\)?$")
-list(TRANSFORM lines REPLACE "[ )]" "")
-list(TRANSFORM lines PREPEND ${SOURCE_DIR}/src/ OUTPUT_VARIABLE sources)
-list(LENGTH sources count)
+list(LENGTH SOURCES count)
 if(count LESS 7)
-    message(FATAL_ERROR "Found only ${count} sources: ${sources}")
+    message(FATAL_ERROR "Got only ${count} sources: ${SOURCES}")
 endif()
 
+# make_headers(KIND HEADER PATTERN REPLACEMENT): HEADER with each match replaced, and the other header as it is.
+function(make_headers kind header pattern replacement)
+    file(COPY ${SOURCE_DIR}/cmpi/cmpidt.h ${SOURCE_DIR}/cmpi/cmpift.h DESTINATION ${WORK_DIR}/${kind})
+    change_header(${kind} ${header} "${pattern}" "${replacement}")
+endfunction()
+
+function(change_header kind header pattern replacement)
+    file(READ ${WORK_DIR}/${kind}/${header} text)
+    string(REGEX REPLACE "${pattern}" "${replacement}" changed "${text}")
+    if(changed STREQUAL text)
+        message(SEND_ERROR "The ${kind} headers are the project's own: no ${pattern} in ${header}")
+    endif()
+    file(WRITE ${WORK_DIR}/${kind}/${header} "${changed}")
+endfunction()
+
 function(compile_with kind)
-    foreach(source IN LISTS sources)
-        execute_process(COMMAND ${COMPILER} -std=c++17 -Wall -Wextra -Werror -Wno-missing-field-initializers -fsyntax-only -I${WORK_DIR}/${kind} ${FLAGS}
-                                ${source} COMMAND_ECHO NONE ERROR_VARIABLE errors RESULT_VARIABLE result)
+    foreach(source IN LISTS SOURCES)
+        execute_process(COMMAND ${COMPILER} -std=c++17 ${FLAGS} -fsyntax-only -isystem ${WORK_DIR}/${kind} ${source}
+                                COMMAND_ECHO NONE ERROR_VARIABLE errors RESULT_VARIABLE result)
         if(NOT result EQUAL 0)
             message(SEND_ERROR "${source} does not compile with ${kind} headers:\n${errors}")
         endif()
     endforeach()
 endfunction()
 
-foreach(header IN ITEMS cmpidt.h cmpift.h)
-    file(READ ${SOURCE_DIR}/cmpi/${header} text)
+file(REMOVE_RECURSE ${WORK_DIR})
 
-    string(REGEX REPLACE "const ([A-Za-z]+)" "\\1" older "${text}")
-    file(WRITE ${WORK_DIR}/older/${header} "${older}")
+make_headers(constless cmpift.h "const ([A-Za-z]+)" "\\1")
+change_header(constless cmpidt.h "const ([A-Za-z]+)" "\\1")
 
-    string(REGEX REPLACE "\n(struct _CMPI[A-Za-z]+FT\n{[^}]*)};" "\n\\1    void* newer;\n};" newer "${text}")
-    file(WRITE ${WORK_DIR}/newer/${header} "${newer}")
+make_headers(versionless cmpidt.h "typedef int CMPIVersion;" "")
+change_header(versionless cmpift.h "CMPIVersion ([a-zA-Z]+)" "int \\1")
+
+make_headers(conventional cmpift.h "CMPIThreadFunc start" "void* (CMPI_THREAD_CDECL* start)(void*)")
+change_header(conventional cmpidt.h "typedef int CMPIVersion;"
+    "\n#ifdef CMPI_PLATFORM_LINUX_GENERIC_GNU\n#define CMPI_THREAD_CDECL __cdecl\n#else\n#define CMPI_THREAD_CDECL\n#endif\n\\0")
+
+make_headers(newer cmpift.h "\n(struct _CMPI[A-Za-z]+FT\n{[^}]*)};" "\n\\1    void* newer;\n};")
+
+foreach(kind IN ITEMS constless versionless conventional newer)
+    compile_with(${kind})
 endforeach()
-
-file(READ ${WORK_DIR}/older/cmpift.h older)
-if(older MATCHES "const ")
-    message(SEND_ERROR "The older headers still have a const")
-endif()
-file(READ ${WORK_DIR}/newer/cmpift.h newer)
-if(NOT newer MATCHES "newer;")
-    message(SEND_ERROR "The newer headers have no more slots")
-endif()
-
-compile_with(older)
-compile_with(newer)

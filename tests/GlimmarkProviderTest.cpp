@@ -319,21 +319,18 @@ TEST_F(GlimmarkProviderTest, GetOnTheSearchWayInAnEmptyInventoryLeavesTheStatusO
     EXPECT_EQ(Logged::flow().back(), "EXITING Glimmark_GetInstance");
 }
 
-TEST_F(GlimmarkProviderTest, GetReadsNoKeyThatSaysItHasNoValue)
+TEST_F(GlimmarkProviderTest, GetTakesAKeyForWhatItsTypeAndItsValueSayWhateverItsState)
 {
-    // Brokers differ in what they leave in the value of such a key: here, a string that must not be taken for
-    // one.
-    for (const int state : {CMPI_nullValue, CMPI_notFound, CMPI_badValue}) {
-        static CMPIData noValue;
-        noValue = CMPIData();
-        noValue.type = CMPI_string;
-        noValue.state = static_cast<CMPIValueState>(state);
-        noValue.value.string = host.cmpiBroker()->eft->newString(host.cmpiBroker(), "b:/2", nullptr);
-        host.tables().objectPath.getKey = [](const CMPIObjectPath*, const char*, CMPIStatus*) {
-            return noValue;
-        };
+    // Brokers differ in the state that a good value has.
+    for (const int state : {CMPI_goodValue, CMPI_keyValue, CMPI_nullValue, CMPI_notFound, CMPI_badValue}) {
+        static CMPIData key;
+        key = CMPIData();
+        key.type = CMPI_string;
+        key.state = static_cast<CMPIValueState>(state);
+        key.value.string = host.cmpiBroker()->eft->newString(host.cmpiBroker(), "b:/2", nullptr);
+        host.tables().objectPath.getKey = [](const CMPIObjectPath*, const char*, CMPIStatus*) { return key; };
         get(ref(glimmark, {{"DeviceID", "b:/2"}}));
-        EXPECT_THAT(Logged::flow(), ::testing::Contains("ENTERING getAllGlimmarkCMPIInstances")) << state;
+        EXPECT_THAT(Logged::flow(), ::testing::Contains("ENTERING getOneGlimmarkCMPIInstance")) << state;
         RecordedLog::clear();
     }
 }

@@ -1,11 +1,14 @@
 #include "broker/Broker.h"
 
 #include "broker/BrokerImplementation.h"
+#include "broker/Habits.h"
 #include "broker/Names.h"
 #include "broker/ProviderCall.h"
 #include "broker/Scope.h"
 
+#include <algorithm>
 #include <iterator>
+#include <tuple>
 #include <utility>
 
 namespace cimhost {
@@ -53,16 +56,35 @@ cim::Answer answer(Core& core, const Body& body)
     }
 }
 
-/// Asks the instance provider of a path's class.
-/// \param operation  called with the management interface, the request and the path
+/// Asks one provider in the way of the broker whose habits this one has.
+/// \param served     the class that the provider is asked as the one of
+/// \param operation  called with the request, the question as that broker would ask it and its path
 template <class Operation>
-cim::Answer askInstanceProvider(Core& core, Router& router, const char* name, const cim::ObjectPath& path,
+cim::Answer askHabitually(Core& core, const char* name, OperationRequest question,
+                          const RegisteredClass& served, const Operation& operation)
+{
+    shape(core.habits, question, served);
+    cim::Answer answer = ask(core, name, [&](Request& request) {
+        return operation(request, std::as_const(question), request.path(question.target));
+    });
+    shape(core.habits, answer, question);
+    return answer;
+}
+
+/// Asks the instance provider of the class in question.
+/// \param operation  called with the management interface, the request, the question and its path
+template <class Operation>
+cim::Answer askInstanceProvider(Core& core, Router& router, const char* name, OperationRequest question,
                                 const Operation& operation)
 {
     return answer(core, [&] {
-        CMPIInstanceMI& mi =
-            router.instanceProvider(path.className, path.nameSpace).instanceMI(path.nameSpace);
-        return ask(core, name, [&](Request& request) { return operation(mi, request, request.path(path)); });
+        const std::string nameSpace = question.target.nameSpace;
+        const RegisteredClass& served = router.instanceClass(question.target.className, nameSpace);
+        CMPIInstanceMI& mi = router.providerOf(served).instanceMI(nameSpace);
+        return askHabitually(core, name, std::move(question), served,
+                             [&](Request& request, const OperationRequest& asked, CMPIObjectPath* path) {
+                                 return operation(mi, request, asked, path);
+                             });
     });
 }
 
@@ -76,26 +98,50 @@ void append(cim::Answer& all, cim::Answer more)
                          std::make_move_iterator(more.instances.end()));
 }
 
-/// Asks the provider of an association class, or all association providers when there is none.
-/// \param operation  called with the management interface, the request and the path
-template <class Operation>
-cim::Answer askAssociationProviders(Core& core, Router& router, const char* name, const cim::ObjectPath& path,
-                                    const std::optional<std::string>& associationClass,
-                                    const Operation& operation)
+/// Which classes to ask the providers of: that one, or each. A provider of several is not asked the same
+/// twice.
+std::vector<const RegisteredClass*> associationsToAsk(const Core& core, Router& router,
+                                                      const OperationRequest& question,
+                                                      const std::optional<std::string>& associationClass)
 {
-    const auto askOne = [&](Provider& provider) {
+    const std::string& nameSpace = question.target.nameSpace;
+    if (associationClass)
+        return {&router.associationClass(*associationClass, nameSpace)};
+    std::vector<const RegisteredClass*> classes;
+    std::vector<std::pair<const Provider*, Traversal>> asked;
+    for (const RegisteredClass* const served : router.associationClasses(nameSpace)) {
+        OperationRequest asOfThisClass = question;
+        shape(core.habits, asOfThisClass, *served);
+        std::pair<const Provider*, Traversal> asking{&router.providerOf(*served), asOfThisClass.traversal};
+        if (std::find(asked.begin(), asked.end(), asking) != asked.end())
+            continue;
+        asked.push_back(std::move(asking));
+        classes.push_back(served);
+    }
+    return classes;
+}
+
+/// Asks the provider of an association class, or all association providers when there is none.
+/// \param operation  called with the management interface, the request, the question and its path
+template <class Operation>
+cim::Answer
+askAssociationProviders(Core& core, Router& router, const char* name, const OperationRequest& question,
+                        const std::optional<std::string>& associationClass, const Operation& operation)
+{
+    const auto askOne = [&](const RegisteredClass& served) {
         return answer(core, [&] {
-            CMPIAssociationMI& mi = provider.associationMI(path.nameSpace);
-            return ask(core, name,
-                       [&](Request& request) { return operation(mi, request, request.path(path)); });
+            CMPIAssociationMI& mi = router.providerOf(served).associationMI(question.target.nameSpace);
+            return askHabitually(core, name, question, served,
+                                 [&](Request& request, const OperationRequest& asked, CMPIObjectPath* path) {
+                                     return operation(mi, request, asked, path);
+                                 });
         });
     };
     return answer(core, [&] {
-        if (associationClass)
-            return askOne(router.associationProvider(*associationClass, path.nameSpace));
         cim::Answer all;
-        for (Provider* const provider : router.associationProviders(path.nameSpace))
-            append(all, askOne(*provider));
+        for (const RegisteredClass* const served :
+             associationsToAsk(core, router, question, associationClass))
+            append(all, askOne(*served));
         return all;
     });
 }
@@ -107,9 +153,16 @@ const char* textOf(const std::optional<std::string>& text)
 
 } // namespace
 
-Broker::Broker(Registration registration, std::vector<std::string> providerDirectories, Listeners listeners)
-    : implementation_(std::make_unique<Implementation>(*this, std::move(registration),
-                                                       std::move(providerDirectories), std::move(listeners)))
+bool operator==(const Traversal& a, const Traversal& b)
+{
+    return std::tie(a.assocClass, a.resultClass, a.role, a.resultRole) ==
+           std::tie(b.assocClass, b.resultClass, b.role, b.resultRole);
+}
+
+Broker::Broker(Registration registration, std::vector<std::string> providerDirectories, Listeners listeners,
+               const Habits* habits)
+    : implementation_(std::make_unique<Implementation>(
+          *this, std::move(registration), std::move(providerDirectories), std::move(listeners), habits))
 {}
 
 Broker::~Broker()
@@ -119,36 +172,43 @@ Broker::~Broker()
 
 cim::Answer Broker::enumerateInstanceNames(const cim::ObjectPath& classPath)
 {
-    return askInstanceProvider(
-        implementation_->core, implementation_->router, "enumerateInstanceNames", classPath,
-        [](CMPIInstanceMI& mi, Request& request, const CMPIObjectPath* path) {
-            return mi.ft->enumerateInstanceNames(&mi, request.context(), request.result(), path);
-        });
+    return askInstanceProvider(implementation_->core, implementation_->router, "enumerateInstanceNames",
+                               {Operation::enumerateInstanceNames, classPath},
+                               [](CMPIInstanceMI& mi, Request& request, const OperationRequest& /*asked*/,
+                                  const CMPIObjectPath* path) {
+                                   return mi.ft->enumerateInstanceNames(&mi, request.context(),
+                                                                        request.result(), path);
+                               });
 }
 
 cim::Answer Broker::enumerateInstances(const cim::ObjectPath& classPath, const cim::PropertyList& properties)
 {
-    return askInstanceProvider(implementation_->core, implementation_->router, "enumerateInstances",
-                               classPath,
-                               [&](CMPIInstanceMI& mi, Request& request, const CMPIObjectPath* path) {
-                                   return mi.ft->enumerateInstances(&mi, request.context(), request.result(),
-                                                                    path, NameArray(properties).get());
-                               });
+    return askInstanceProvider(
+        implementation_->core, implementation_->router, "enumerateInstances",
+        {Operation::enumerateInstances, classPath, {}, properties},
+        [](CMPIInstanceMI& mi, Request& request, const OperationRequest& asked, const CMPIObjectPath* path) {
+            return mi.ft->enumerateInstances(&mi, request.context(), request.result(), path,
+                                             NameArray(asked.properties).get());
+        });
 }
 
 cim::Answer Broker::getInstance(const cim::ObjectPath& path, const cim::PropertyList& properties)
 {
-    return askInstanceProvider(implementation_->core, implementation_->router, "getInstance", path,
-                               [&](CMPIInstanceMI& mi, Request& request, const CMPIObjectPath* instPath) {
+    return askInstanceProvider(implementation_->core, implementation_->router, "getInstance",
+                               {Operation::getInstance, path, {}, properties},
+                               [](CMPIInstanceMI& mi, Request& request, const OperationRequest& asked,
+                                  const CMPIObjectPath* instPath) {
                                    return mi.ft->getInstance(&mi, request.context(), request.result(),
-                                                             instPath, NameArray(properties).get());
+                                                             instPath, NameArray(asked.properties).get());
                                });
 }
 
 cim::Answer Broker::createInstance(const cim::ObjectPath& classPath, const cim::Instance& instance)
 {
-    return askInstanceProvider(implementation_->core, implementation_->router, "createInstance", classPath,
-                               [&](CMPIInstanceMI& mi, Request& request, const CMPIObjectPath* path) {
+    return askInstanceProvider(implementation_->core, implementation_->router, "createInstance",
+                               {Operation::createInstance, classPath},
+                               [&](CMPIInstanceMI& mi, Request& request, const OperationRequest& /*asked*/,
+                                   const CMPIObjectPath* path) {
                                    return mi.ft->createInstance(&mi, request.context(), request.result(),
                                                                 path, request.instance(instance));
                                });
@@ -157,28 +217,33 @@ cim::Answer Broker::createInstance(const cim::ObjectPath& classPath, const cim::
 cim::Answer Broker::modifyInstance(const cim::ObjectPath& path, const cim::Instance& instance,
                                    const cim::PropertyList& properties)
 {
-    return askInstanceProvider(implementation_->core, implementation_->router, "modifyInstance", path,
-                               [&](CMPIInstanceMI& mi, Request& request, const CMPIObjectPath* instPath) {
+    return askInstanceProvider(implementation_->core, implementation_->router, "modifyInstance",
+                               {Operation::modifyInstance, path, {}, properties},
+                               [&](CMPIInstanceMI& mi, Request& request, const OperationRequest& asked,
+                                   const CMPIObjectPath* instPath) {
                                    return mi.ft->modifyInstance(&mi, request.context(), request.result(),
                                                                 instPath, request.instance(instance),
-                                                                NameArray(properties).get());
+                                                                NameArray(asked.properties).get());
                                });
 }
 
 cim::Answer Broker::deleteInstance(const cim::ObjectPath& path)
 {
-    return askInstanceProvider(implementation_->core, implementation_->router, "deleteInstance", path,
-                               [](CMPIInstanceMI& mi, Request& request, const CMPIObjectPath* instPath) {
-                                   return mi.ft->deleteInstance(&mi, request.context(), request.result(),
-                                                                instPath);
-                               });
+    return askInstanceProvider(
+        implementation_->core, implementation_->router, "deleteInstance", {Operation::deleteInstance, path},
+        [](CMPIInstanceMI& mi, Request& request, const OperationRequest& /*asked*/,
+           const CMPIObjectPath* instPath) {
+            return mi.ft->deleteInstance(&mi, request.context(), request.result(), instPath);
+        });
 }
 
 cim::Answer Broker::execQuery(const cim::ObjectPath& classPath, const std::string& query,
                               const std::string& language)
 {
-    return askInstanceProvider(implementation_->core, implementation_->router, "execQuery", classPath,
-                               [&](CMPIInstanceMI& mi, Request& request, const CMPIObjectPath* path) {
+    return askInstanceProvider(implementation_->core, implementation_->router, "execQuery",
+                               {Operation::execQuery, classPath},
+                               [&](CMPIInstanceMI& mi, Request& request, const OperationRequest& /*asked*/,
+                                   const CMPIObjectPath* path) {
                                    return mi.ft->execQuery(&mi, request.context(), request.result(), path,
                                                            query.c_str(), language.c_str());
                                });
@@ -188,46 +253,56 @@ cim::Answer Broker::associators(const cim::ObjectPath& path, const Traversal& tr
                                 const cim::PropertyList& properties)
 {
     return askAssociationProviders(
-        implementation_->core, implementation_->router, "associators", path, traversal.assocClass,
-        [&](CMPIAssociationMI& mi, Request& request, const CMPIObjectPath* from) {
-            return mi.ft->associators(&mi, request.context(), request.result(), from,
-                                      textOf(traversal.assocClass), textOf(traversal.resultClass),
-                                      textOf(traversal.role), textOf(traversal.resultRole),
-                                      NameArray(properties).get());
+        implementation_->core, implementation_->router, "associators",
+        {Operation::associators, path, traversal, properties}, traversal.assocClass,
+        [](CMPIAssociationMI& mi, Request& request, const OperationRequest& asked,
+           const CMPIObjectPath* from) {
+            const Traversal& by = asked.traversal;
+            return mi.ft->associators(&mi, request.context(), request.result(), from, textOf(by.assocClass),
+                                      textOf(by.resultClass), textOf(by.role), textOf(by.resultRole),
+                                      NameArray(asked.properties).get());
         });
 }
 
 cim::Answer Broker::associatorNames(const cim::ObjectPath& path, const Traversal& traversal)
 {
-    return askAssociationProviders(
-        implementation_->core, implementation_->router, "associatorNames", path, traversal.assocClass,
-        [&](CMPIAssociationMI& mi, Request& request, const CMPIObjectPath* from) {
-            return mi.ft->associatorNames(&mi, request.context(), request.result(), from,
-                                          textOf(traversal.assocClass), textOf(traversal.resultClass),
-                                          textOf(traversal.role), textOf(traversal.resultRole));
-        });
+    return askAssociationProviders(implementation_->core, implementation_->router, "associatorNames",
+                                   {Operation::associatorNames, path, traversal}, traversal.assocClass,
+                                   [](CMPIAssociationMI& mi, Request& request, const OperationRequest& asked,
+                                      const CMPIObjectPath* from) {
+                                       const Traversal& by = asked.traversal;
+                                       return mi.ft->associatorNames(&mi, request.context(), request.result(),
+                                                                     from, textOf(by.assocClass),
+                                                                     textOf(by.resultClass), textOf(by.role),
+                                                                     textOf(by.resultRole));
+                                   });
 }
 
 cim::Answer Broker::references(const cim::ObjectPath& path, const Traversal& traversal,
                                const cim::PropertyList& properties)
 {
     return askAssociationProviders(
-        implementation_->core, implementation_->router, "references", path, traversal.resultClass,
-        [&](CMPIAssociationMI& mi, Request& request, const CMPIObjectPath* from) {
-            return mi.ft->references(&mi, request.context(), request.result(), from,
-                                     textOf(traversal.resultClass), textOf(traversal.role),
-                                     NameArray(properties).get());
+        implementation_->core, implementation_->router, "references",
+        {Operation::references, path, traversal, properties}, traversal.resultClass,
+        [](CMPIAssociationMI& mi, Request& request, const OperationRequest& asked,
+           const CMPIObjectPath* from) {
+            const Traversal& by = asked.traversal;
+            return mi.ft->references(&mi, request.context(), request.result(), from, textOf(by.resultClass),
+                                     textOf(by.role), NameArray(asked.properties).get());
         });
 }
 
 cim::Answer Broker::referenceNames(const cim::ObjectPath& path, const Traversal& traversal)
 {
-    return askAssociationProviders(
-        implementation_->core, implementation_->router, "referenceNames", path, traversal.resultClass,
-        [&](CMPIAssociationMI& mi, Request& request, const CMPIObjectPath* from) {
-            return mi.ft->referenceNames(&mi, request.context(), request.result(), from,
-                                         textOf(traversal.resultClass), textOf(traversal.role));
-        });
+    return askAssociationProviders(implementation_->core, implementation_->router, "referenceNames",
+                                   {Operation::referenceNames, path, traversal}, traversal.resultClass,
+                                   [](CMPIAssociationMI& mi, Request& request, const OperationRequest& asked,
+                                      const CMPIObjectPath* from) {
+                                       const Traversal& by = asked.traversal;
+                                       return mi.ft->referenceNames(&mi, request.context(), request.result(),
+                                                                    from, textOf(by.resultClass),
+                                                                    textOf(by.role));
+                                   });
 }
 
 const Registration& Broker::registration() const

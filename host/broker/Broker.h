@@ -55,6 +55,10 @@ struct Traversal
     std::optional<std::string> resultRole;
 };
 
+bool operator==(const Traversal& a, const Traversal& b);
+
+struct Habits;
+
 /// The broker. Requests may come from several threads at once. Each request is answered by the
 /// provider registered for the class (letter case ignored) and namespace of its path; a class that
 /// nobody serves is answered with CMPI_RC_ERR_INVALID_CLASS, a namespace that no registration names
@@ -65,7 +69,9 @@ class Broker
 public:
     /// \param registration  what serves which class
     /// \param providerDirectories  searched in order for libLOCATION.so
-    Broker(Registration registration, std::vector<std::string> providerDirectories, Listeners listeners = {});
+    /// \param habits  of a real broker, which this one takes on (Habits.h); they must outlive it. Null: none
+    Broker(Registration registration, std::vector<std::string> providerDirectories, Listeners listeners = {},
+           const Habits* habits = nullptr);
     ~Broker();
     Broker(const Broker&) = delete;
     Broker& operator=(const Broker&) = delete;

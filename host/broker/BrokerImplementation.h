@@ -17,8 +17,8 @@ class Broker::Implementation
 {
 public:
     Implementation(Broker& broker, Registration registration, std::vector<std::string> directories,
-                   Listeners listeners)
-        : core(broker, std::move(listeners)),
+                   Listeners listeners, const Habits* habits)
+        : core(broker, std::move(listeners), habits),
           router(core, std::move(registration), std::move(directories))
     {}
 

@@ -1,5 +1,6 @@
 #include "broker/Core.h"
 
+#include "broker/Habits.h"
 #include "broker/ObjectStore.h"
 #include "broker/Scope.h"
 #include "broker/Tables.h"
@@ -47,13 +48,15 @@ private:
 
 } // namespace
 
-Core::Core(Broker& owner, Listeners toldListeners)
+Core::Core(Broker& owner, Listeners toldListeners, const Habits* habitsOfThisOne)
     : broker(owner),
       tables(servedTables()),
       cmpi{this, &tables.broker, &tables.enc, &tables.ext, &tables.mem},
+      habits(habitsOfThisOne),
       lasting(std::make_unique<ObjectStore>(*this)),
       listeners_(std::move(toldListeners))
 {
+    takeOn(habits, tables, cmpi);
     LiveCores::instance().add(this);
 }
 

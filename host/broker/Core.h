@@ -16,7 +16,7 @@ class ObjectStore;
 
 struct Core
 {
-    Core(Broker& owner, Listeners toldListeners);
+    Core(Broker& owner, Listeners toldListeners, const Habits* habitsOfThisOne);
     ~Core();
     Core(const Core&) = delete;
     Core& operator=(const Core&) = delete;
@@ -28,7 +28,8 @@ struct Core
 
     Broker& broker; ///< where up-calls go
     FunctionTables tables;
-    CMPIBroker cmpi; ///< its handle is this Core
+    CMPIBroker cmpi;      ///< its handle is this Core
+    const Habits* habits; ///< null: those of this broker alone
     /// Objects made outside of any request, and clones: they live until released or until the broker
     /// goes. Guarded by `lastingMutex`.
     std::unique_ptr<ObjectStore> lasting;

@@ -12,12 +12,6 @@ namespace {
 
 constexpr const char* theInstance = "the instance";
 
-bool contains(const std::vector<std::string>& names, const std::string& name)
-{
-    return std::any_of(names.begin(), names.end(),
-                       [&](const std::string& listed) { return cim::sameName(listed, name); });
-}
-
 bool passesFilter(const InstanceObject& instance, const std::string& name)
 {
     return !instance.wanted || contains(*instance.wanted, name) || contains(instance.keyNames, name);

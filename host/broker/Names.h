@@ -29,6 +29,21 @@ Named* findNamed(std::vector<Named>& list, std::string_view name)
     return found == list.end() ? nullptr : &*found;
 }
 
+inline bool contains(const std::vector<std::string>& names, std::string_view name)
+{
+    return std::any_of(names.begin(), names.end(),
+                       [&](const std::string& listed) { return cim::sameName(listed, name); });
+}
+
+/// Drops the elements that have none of the names.
+template <class Named>
+void keepOnly(std::vector<Named>& list, const std::vector<std::string>& names)
+{
+    list.erase(std::remove_if(list.begin(), list.end(),
+                              [&](const Named& item) { return !contains(names, item.name); }),
+               list.end());
+}
+
 /// Names as CMPI passes them: an array of character pointers that ends with a null pointer; null for
 /// no names at all. The names must outlive it.
 class NameArray

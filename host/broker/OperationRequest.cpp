@@ -27,6 +27,17 @@ bool answersPaths(Operation operation)
     }
 }
 
+bool isReferenceTraversal(Operation operation)
+{
+    return operation == Operation::references || operation == Operation::referenceNames;
+}
+
+bool isTraversal(Operation operation)
+{
+    return operation == Operation::associators || operation == Operation::associatorNames ||
+           isReferenceTraversal(operation);
+}
+
 cim::Answer perform(const OperationRequest& request, Broker& broker)
 {
     switch (request.operation) {

@@ -42,6 +42,10 @@ struct OperationRequest
 /// Whether the answer consists of paths; otherwise it consists of instances, or of nothing at all.
 bool answersPaths(Operation operation);
 
+/// The four traversals, and of them the two that answer associations.
+bool isTraversal(Operation operation);
+bool isReferenceTraversal(Operation operation);
+
 /// Asks the broker. GetInstance that brings no instance without an error is CMPI_RC_ERR_NOT_FOUND, as
 /// real brokers have it.
 cim::Answer perform(const OperationRequest& request, Broker& broker);

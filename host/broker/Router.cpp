@@ -27,27 +27,24 @@ Router::Router(Core& core, Registration registration, std::vector<std::string> d
     }
 }
 
-Provider& Router::instanceProvider(const std::string& className, const std::string& nameSpace)
+const RegisteredClass& Router::instanceClass(const std::string& className, const std::string& nameSpace) const
 {
     return find(className, nameSpace, &RegisteredClass::instance, "instance");
 }
 
-Provider& Router::associationProvider(const std::string& className, const std::string& nameSpace)
+const RegisteredClass& Router::associationClass(const std::string& className,
+                                                const std::string& nameSpace) const
 {
     return find(className, nameSpace, &RegisteredClass::association, "association");
 }
 
-std::vector<Provider*> Router::associationProviders(const std::string& nameSpace)
+std::vector<const RegisteredClass*> Router::associationClasses(const std::string& nameSpace) const
 {
     requireNameSpace(nameSpace);
-    std::vector<Provider*> found;
-    for (const RegisteredClass& entry : registration_.classes) {
-        if (!entry.association || !isIn(entry, nameSpace))
-            continue;
-        Provider* const provider = &providerOf(entry);
-        if (std::find(found.begin(), found.end(), provider) == found.end())
-            found.push_back(provider);
-    }
+    std::vector<const RegisteredClass*> found;
+    for (const RegisteredClass& entry : registration_.classes)
+        if (entry.association && isIn(entry, nameSpace))
+            found.push_back(&entry);
     return found;
 }
 
@@ -57,8 +54,8 @@ void Router::cleanUp()
         provider->cleanUp();
 }
 
-Provider& Router::find(const std::string& className, const std::string& nameSpace,
-                       bool RegisteredClass::*serves, const char* type)
+const RegisteredClass& Router::find(const std::string& className, const std::string& nameSpace,
+                                    bool RegisteredClass::*serves, const char* type) const
 {
     requireNameSpace(nameSpace);
     bool known = false;
@@ -66,7 +63,7 @@ Provider& Router::find(const std::string& className, const std::string& nameSpac
         if (!cim::sameName(entry.className, className) || !isIn(entry, nameSpace))
             continue;
         if (entry.*serves)
-            return providerOf(entry);
+            return entry;
         known = true;
     }
     if (known)

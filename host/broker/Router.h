@@ -36,21 +36,25 @@ public:
 
     [[nodiscard]] const Registration& registration() const { return registration_; }
 
-    /// Who serves the instances of a class in a namespace. \throws RoutingError
-    Provider& instanceProvider(const std::string& className, const std::string& nameSpace);
-    /// Who serves the traversals of an association class in a namespace. \throws RoutingError
-    Provider& associationProvider(const std::string& className, const std::string& nameSpace);
-    /// All who serve traversals in a namespace, each once. \throws RoutingError
-    std::vector<Provider*> associationProviders(const std::string& nameSpace);
+    /// What serves the instances of a class in a namespace. \throws RoutingError
+    [[nodiscard]] const RegisteredClass& instanceClass(const std::string& className,
+                                                       const std::string& nameSpace) const;
+    /// What serves the traversals of an association class in a namespace. \throws RoutingError
+    [[nodiscard]] const RegisteredClass& associationClass(const std::string& className,
+                                                          const std::string& nameSpace) const;
+    /// All that serves traversals in a namespace. \throws RoutingError
+    [[nodiscard]] std::vector<const RegisteredClass*> associationClasses(const std::string& nameSpace) const;
+
+    /// Who serves one of these.
+    Provider& providerOf(const RegisteredClass& entry);
 
     /// Cleans up every provider; no request may come any more.
     void cleanUp();
 
 private:
-    Provider& find(const std::string& className, const std::string& nameSpace, bool RegisteredClass::*serves,
-                   const char* type);
+    const RegisteredClass& find(const std::string& className, const std::string& nameSpace,
+                                bool RegisteredClass::*serves, const char* type) const;
     void requireNameSpace(const std::string& nameSpace) const;
-    Provider& providerOf(const RegisteredClass& entry);
 
     Registration registration_;
     ProviderSurroundings surroundings_;

@@ -1,5 +1,6 @@
 #include "cli/Arguments.h"
 
+#include "broker/Habits.h"
 #include "cim/ObjectPathText.h"
 #include "cim/Utf8.h"
 
@@ -178,6 +179,9 @@ void addCommonOptions(CLI::App& app, Arguments& arguments)
     app.add_option("--inventory", settings.inventory, "Hardware inventory for the providers, TAVRO_INVENTORY")
         ->type_name("FILE")
         ->check(named("file"));
+    app.add_option("--like", settings.like, "Behave as a real broker does to providers and clients")
+        ->type_name("BROKER")
+        ->check(CLI::IsMember(namesOfHabits()));
     app.add_flag("--trace", settings.trace, "Show what providers trace and log, on standard error");
     app.add_option("-f,--format", arguments.format,
                    "How answers are shown; without it as text, and instances on a terminal as a table")

@@ -66,6 +66,7 @@ struct Settings
     std::vector<std::string> registrationFiles;   ///< none: the default ones
     std::optional<std::string> inventory;         ///< file for TAVRO_INVENTORY; nothing: as it is
     bool trace = false;
+    std::optional<std::string> like; ///< the broker whose habits to have; nothing: none
 };
 
 /// The format asked for, or without one: text for paths, ready to be copied into the next command; for

@@ -1,6 +1,7 @@
 #include "cli/Program.h"
 
 #include "broker/Broker.h"
+#include "broker/Habits.h"
 #include "cli/Arguments.h"
 #include "cli/Execute.h"
 #include "cli/Reports.h"
@@ -22,7 +23,7 @@ ExitStatus follow(const Invocation& invocation, const Surroundings& surroundings
     if (settings.inventory)
         useInventory(*settings.inventory);
     Broker broker(std::move(registration), findProviderDirectories(settings, surroundings),
-                  reportTo(err, settings.trace));
+                  reportTo(err, settings.trace), settings.like ? findHabits(*settings.like) : nullptr);
     return execute(invocation.command, broker, isTerminal, out, err);
 }
 

@@ -141,18 +141,14 @@ inline CMPICount keyCountOf(const CMPIObjectPath* path, CMPIStatus* rc)
     return call(path, &CMPIObjectPathFT::getKeyCount, rc);
 }
 
-/// Whether data holds a value of a type. Brokers differ in what they leave in the value of other data.
-inline bool holds(const CMPIData& data, CMPIType type)
-{
-    constexpr unsigned int noValue = CMPI_nullValue | CMPI_notFound | CMPI_badValue;
-    return data.type == type && (data.state & noValue) == 0;
-}
+// Data is what its type and its value say. Its state says nothing reliable: there are brokers whose good
+// items have the state of a null value.
 
-/// The value of a key where it is a string; null where it is missing, null or something else.
+/// The value of a key where it is a string with content; null where it is missing, null or something else.
 inline CMPIString* stringKeyOf(const CMPIObjectPath* path, const char* name, CMPIStatus* rc)
 {
     const CMPIData key = call(path, &CMPIObjectPathFT::getKey, name, rc);
-    return holds(key, CMPI_string) && exists(key.value.string) ? key.value.string : nullptr;
+    return key.type == CMPI_string && exists(key.value.string) ? key.value.string : nullptr;
 }
 
 // Values, each with its CMPI type. A text is passed as the character pointer itself in the place of
@@ -280,18 +276,18 @@ inline bool hasNext(const CMPIEnumeration* enumeration)
     return call(enumeration, &CMPIEnumerationFT::hasNext, static_cast<CMPIStatus*>(nullptr)) != 0;
 }
 
-/// The next item as a path; null where it is none.
+/// The next item as a path; null where it is of another type.
 inline CMPIObjectPath* nextPath(const CMPIEnumeration* enumeration)
 {
     const CMPIData item = call(enumeration, &CMPIEnumerationFT::getNext, static_cast<CMPIStatus*>(nullptr));
-    return holds(item, CMPI_ref) ? item.value.ref : nullptr;
+    return item.type == CMPI_ref ? item.value.ref : nullptr;
 }
 
-/// The next item as an instance; null where it is none.
+/// The next item as an instance; null where it is of another type.
 inline CMPIInstance* nextInstance(const CMPIEnumeration* enumeration)
 {
     const CMPIData item = call(enumeration, &CMPIEnumerationFT::getNext, static_cast<CMPIStatus*>(nullptr));
-    return holds(item, CMPI_instance) ? item.value.inst : nullptr;
+    return item.type == CMPI_instance ? item.value.inst : nullptr;
 }
 
 } // namespace Tavro::GlimmarkProvider::Cmpi

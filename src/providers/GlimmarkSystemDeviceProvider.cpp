@@ -276,8 +276,6 @@ CMPIInstance* newReference(const CMPIObjectPath* path, FarEnd farEnd, const CMPI
                            const CMPIObjectPath* far, CMPIStatus* rc)
 {
     CMPIInstance* const instance = path != nullptr ? Cmpi::newInstance(broker, path, rc) : nullptr;
-    if (!Cmpi::exists(instance))
-        return nullptr;
     const bool farIsDevice = farEnd == FarEnd::glimmarks;
     Cmpi::setProperty(instance, "GroupComponent", farIsDevice ? ref : far);
     Cmpi::setProperty(instance, "PartComponent", farIsDevice ? far : ref);

@@ -32,9 +32,9 @@ inline CMPIStatus notSupportedStatus()
 }
 
 // Function tables. Older CMPI headers leave out a `const` here and there: at the operations' arguments, at
-// the tables and at their names.
+// the tables and at their names; and versions have no type of their own there.
 
-constexpr CMPIVersion interfaceVersion = 200;
+constexpr int interfaceVersion = 200;
 
 /// The function table that an MI record points to.
 template <class MI>

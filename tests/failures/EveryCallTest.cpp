@@ -1,9 +1,11 @@
 // A broker that lets any single call fail, in any way: each operation answers, tells and traces what is
-// described for that failure, does not crash or leak, and the next request is whole.
+// described for that failure, does not crash or leak, and the next request is whole. So do they where the
+// broker has the habits of a real one.
 
 #include "FailureFixture.h"
 #include "described/Providers.h"
 
+#include "broker/Habits.h"
 #include "support/SampleInventories.h"
 
 #include <algorithm>
@@ -27,7 +29,8 @@ struct Inventory
     std::string name;
     std::vector<MadeInventory::Node> nodes;
     std::vector<std::string> computerSystems;
-    std::size_t mostCalls = 0; ///< how many calls of an operation are to fail; 0: all of them
+    std::size_t mostCalls = 0;               ///< how many calls of an operation are to fail; 0: all of them
+    const cimhost::Habits* habits = nullptr; ///< of the broker that serves it
 };
 
 /// A walk repeats itself for each indicator: of the longer ones, calls all over the walk fail, or all of them
@@ -45,8 +48,11 @@ void PrintTo(const Inventory& inventory, std::ostream* stream)
 
 std::vector<Inventory> inventories()
 {
+    const std::vector<MadeInventory::Node> two{{"a", "1", 1, 1}, {"b", "2", 20, 3}};
     return {
-        {"TwoIndicators", {{"a", "1", 1, 1}, {"b", "2", 20, 3}}, {"one", "two"}},
+        {"TwoIndicators", two, {"one", "two"}},
+        {"TwoIndicatorsLikeSfcb", two, {"one", "two"}, mostCallsOfLongWalks(), &cimhost::sfcbHabits()},
+        {"TwoIndicatorsLikePegasus", two, {"one", "two"}, mostCallsOfLongWalks(), &cimhost::pegasusHabits()},
         {"NoIndicators", {{"Fan", "1", 1, 1, 6}}, {"one"}},
         {"SmallServer", sampleInventory("small-server.json"), {"one"}, mostCallsOfLongWalks()},
         {"EdgeCases", sampleInventory("edge-cases.json"), {"one"}},
@@ -81,7 +87,7 @@ class EveryCall : public FailureFixture,
                   public ::testing::WithParamInterface<std::tuple<Inventory, std::size_t>>
 {
 protected:
-    EveryCall()
+    EveryCall() : FailureFixture(std::get<0>(GetParam()).habits)
     {
         const Inventory& inventory = std::get<0>(GetParam());
         MadeInventory::set(inventory.nodes);

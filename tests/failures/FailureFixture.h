@@ -13,6 +13,10 @@
 class FailureFixture : public ProviderFixture
 {
 protected:
+    FailureFixture() = default;
+    /// With the habits of a real broker; null: with none.
+    explicit FailureFixture(const cimhost::Habits* habits) : ProviderFixture(habits) {}
+
     /// Runs an operation in the open request.
     CMPIStatus run(const Operation& operation) { return run(operation, host.cmpiBroker()); }
 

@@ -196,8 +196,12 @@ cimhost::Registration computerSystemRegistration()
 
 ProviderFixture::ProviderFixture() : ProviderFixture(computerSystemOnly()) {}
 
-ProviderFixture::ProviderFixture(cimhost::Registration registration)
-    : host(std::move(registration), {providerDirectory()}),
+ProviderFixture::ProviderFixture(const cimhost::Habits* habits)
+    : ProviderFixture(computerSystemOnly(), habits)
+{}
+
+ProviderFixture::ProviderFixture(cimhost::Registration registration, const cimhost::Habits* habits)
+    : host(std::move(registration), {providerDirectory()}, {}, habits),
       request(std::make_unique<cimhost::Request>(host))
 {
     setComputerSystems({"alpha"});

@@ -77,8 +77,10 @@ class ProviderFixture : public ::testing::Test
 protected:
     /// A broker that serves TAVRO_ComputerSystem in root/cimv2 and root/test from a stand-in.
     ProviderFixture();
+    /// The same with the habits of a real broker; null: with none.
+    explicit ProviderFixture(const cimhost::Habits* habits);
     /// A broker that serves what a registration names.
-    explicit ProviderFixture(cimhost::Registration registration);
+    explicit ProviderFixture(cimhost::Registration registration, const cimhost::Habits* habits = nullptr);
     ~ProviderFixture() override;
 
     /// The computer systems that the broker knows, by their names.

@@ -60,8 +60,9 @@ class BrokerFixture : public testing::Test
 {
 protected:
     explicit BrokerFixture(Registration registration = {},
-                           std::vector<std::string> directories = {SAMPLE_DIRECTORY})
-        : broker_(std::move(registration), std::move(directories), listeners())
+                           std::vector<std::string> directories = {SAMPLE_DIRECTORY},
+                           const Habits* habits = nullptr)
+        : broker_(std::move(registration), std::move(directories), listeners(), habits)
     {}
 
     [[nodiscard]] const CMPIBroker* mb() const { return broker_.cmpiBroker(); }

@@ -267,15 +267,24 @@ TEST(Arguments, setTheBrokerUp)
     EXPECT_TRUE(defaults.registrationFiles.empty());
     EXPECT_EQ(defaults.inventory, std::nullopt);
     EXPECT_FALSE(defaults.trace);
+    EXPECT_EQ(defaults.like, std::nullopt);
 
     const Settings settings =
         parse({"--provider-dir", "/a", "ei", "C", "P", "--provider-dir", "/b", "--registration", "r1",
-               "--registration", "r2", "--inventory", "i.json", "--trace"})
+               "--registration", "r2", "--inventory", "i.json", "--trace", "--like", "sfcb"})
             .settings;
     EXPECT_THAT(settings.providerDirectories, ElementsAre("/a", "/b"));
     EXPECT_THAT(settings.registrationFiles, ElementsAre("r1", "r2"));
     EXPECT_EQ(settings.inventory, "i.json");
     EXPECT_TRUE(settings.trace);
+    EXPECT_EQ(settings.like, "sfcb");
+}
+
+TEST(Arguments, nameABrokerWhoseHabitsAreKnown)
+{
+    EXPECT_EQ(parse({"--like", "pegasus", "serve"}).settings.like, "pegasus");
+    for (const char* name : {"other", "", "SFCB"})
+        EXPECT_THAT(errorOf({"ei", "C", "--like", name}), HasSubstr(" not in {sfcb,pegasus}")) << name;
 }
 
 TEST(Arguments, namesOfFilesAreNotEmpty)

@@ -1,5 +1,6 @@
 #include "Tavro/Instrumentation.h"
 
+#include "ErrorLine.h"
 #include "NodeSource.h"
 
 #include <algorithm>
@@ -19,6 +20,19 @@ struct Instrumentation::Implementation
     {
         while (position < nodes.size() && nodes[position].kind != kind)
             ++position;
+    }
+
+    /// Says which indicator has no description, the first of them. The provider takes none of an inventory
+    /// with such a one, and says nothing.
+    void complainOfNamelessIndicator() const
+    {
+        const auto nameless = std::find_if(nodes.begin(), nodes.end(), [](const Node& node) {
+            return node.kind == NodeLexicon::DiagnosticIndicator && node.description.empty();
+        });
+        if (nameless != nodes.end())
+            logError({static_cast<const char*>(__func__), "Instrumentation.cpp", __LINE__},
+                     "the diagnostic indicator " + nameless->path +
+                         " has no description: the provider answers without indicators");
     }
 
     /// Null while the cursor stands on none.
@@ -44,6 +58,8 @@ void Instrumentation::selectNode(NodeLexicon::NodeType kind)
     implementation_->kind = kind;
     implementation_->position = 0;
     implementation_->findNode();
+    if (kind == NodeLexicon::DiagnosticIndicator)
+        implementation_->complainOfNamelessIndicator();
 }
 
 Instrumentation::operator bool() const

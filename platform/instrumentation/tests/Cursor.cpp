@@ -35,7 +35,7 @@ constexpr const char* threeIndicators = R"({ "nodes": [
     { "kind": 36, "description": "First", "path": "/1", "status": 1, "alarmState": 3 },
     { "kind": "diagnostic indicator", "description": " Second ", "path": " /2 ", "status": 4294967295 },
     { "kind": "fan", "description": "Fan 2", "path": "/fan2", "status": 20, "alarmState": 2 },
-    { "alarmState": 0, "status": 0, "path": "", "description": "", "kind": 36 },
+    { "alarmState": 0, "status": 0, "path": "", "description": ":", "kind": 36 },
     { "kind": 4294967295, "description": "Other", "path": "/other", "status": 2 }
 ] })";
 
@@ -84,7 +84,7 @@ TEST_F(Cursor, standsOnTheFirstNodeOfTheSelectedKind)
 
 TEST_F(Cursor, visitsTheNodesOfItsKindInTheOrderOfTheFile)
 {
-    EXPECT_THAT(descriptionsOf(36), ElementsAre("First", " Second ", ""));
+    EXPECT_THAT(descriptionsOf(36), ElementsAre("First", " Second ", ":"));
     EXPECT_THAT(descriptionsOf(6), ElementsAre("Fan", "Fan 2"));
     EXPECT_THAT(descriptionsOf(4294967295), ElementsAre("Other"));
 }
@@ -105,7 +105,7 @@ TEST_F(Cursor, givesTextsAndNumbersAsTheyStandInTheFile)
     EXPECT_EQ(cursor.getNodeStatus(), 4294967295U);
     ++cursor;
     EXPECT_TRUE(cursor);
-    EXPECT_EQ(cursor.getNodeDescription(), "");
+    EXPECT_EQ(cursor.getNodeDescription(), ":");
     EXPECT_EQ(cursor.getPathToNode(), "");
     EXPECT_EQ(cursor.getNodeStatus(), 0U);
 }
@@ -137,7 +137,7 @@ TEST_F(Cursor, startsAnewWithEachSelection)
     Instrumentation cursor;
     for (int round = 0; round < 2; ++round) {
         cursor.selectNode(NodeLexicon::DiagnosticIndicator);
-        EXPECT_THAT(descriptions(cursor), ElementsAre("First", " Second ", ""));
+        EXPECT_THAT(descriptions(cursor), ElementsAre("First", " Second ", ":"));
     }
     cursor.selectNode(NodeLexicon::Fan);
     EXPECT_EQ(cursor.getNodeDescription(), "Fan");
@@ -196,9 +196,27 @@ TEST_F(Cursor, seesTheFileAsItWasWhenTheCursorWasMade)
     use(R"({"nodes":[{"kind":36,"description":"New","path":"/new","status":1}]})");
     Instrumentation after;
     before.selectNode(NodeLexicon::DiagnosticIndicator);
-    EXPECT_THAT(descriptions(before), ElementsAre("First", " Second ", ""));
+    EXPECT_THAT(descriptions(before), ElementsAre("First", " Second ", ":"));
     after.selectNode(NodeLexicon::DiagnosticIndicator);
     EXPECT_THAT(descriptions(after), ElementsAre("New"));
+}
+
+TEST_F(Cursor, saysOnceThatIndicatorsWithoutADescriptionCostAllOthers)
+{
+    use(R"({"nodes":[{"kind":36,"description":"D","path":"/1","status":1},
+                     {"kind":6,"description":"","path":"/fan","status":1},
+                     {"kind":36,"description":"","path":"/2","status":1},
+                     {"kind":36,"description":"","path":"/3","status":1}]})");
+    EXPECT_THAT(descriptionsOf(6), ElementsAre(""));
+    EXPECT_THAT(RecordingLog::take(), IsEmpty()) << "nobody has asked for the indicators";
+    EXPECT_THAT(descriptionsOf(36), ElementsAre("D", "", "")) << "they are there all the same";
+    const std::vector<RecordingLog::Line> lines = RecordingLog::take();
+    ASSERT_EQ(lines.size(), 1U);
+    EXPECT_EQ(lines[0].channel, "log");
+    EXPECT_EQ(lines[0].level, 6000);
+    EXPECT_EQ(lines[0].category, "Mavrel.Instrumentation");
+    EXPECT_EQ(lines[0].text,
+              "the diagnostic indicator /2 has no description: the provider answers without indicators");
 }
 
 TEST_F(Cursor, takesAnInventoryWithoutNodes)
@@ -256,7 +274,7 @@ TEST_F(Cursor, cursorsOfSeveralThreadsDoNotMeet)
     for (int number = 0; number < threadCount; ++number)
         threads.emplace_back([] {
             for (int round = 0; round < 20; ++round)
-                EXPECT_THAT(descriptionsOf(36), ElementsAre("First", " Second ", ""));
+                EXPECT_THAT(descriptionsOf(36), ElementsAre("First", " Second ", ":"));
         });
     for (std::thread& thread : threads)
         thread.join();

@@ -17,7 +17,6 @@ namespace {
 
 using Tavro::Instrumentation;
 using testing::Contains;
-using testing::IsEmpty;
 namespace NodeLexicon = Tavro::NodeLexicon;
 
 struct SampleIndicator
@@ -40,7 +39,9 @@ std::vector<SampleIndicator> indicatorsOf(const std::string& sample)
             indicator.alarmState = value;
         indicators.push_back(indicator);
     }
-    EXPECT_THAT(RecordingLog::take(), IsEmpty());
+    const bool allAreDescribed = std::none_of(indicators.begin(), indicators.end(),
+                                              [](const Indicator& each) { return each.description.empty(); });
+    EXPECT_EQ(RecordingLog::take().size(), allAreDescribed ? 0U : 1U);
     return indicators;
 }
 

@@ -24,13 +24,13 @@ bool hasNext(const CMPIEnumeration* items)
 Path* nextPath(const CMPIEnumeration* items)
 {
     const CMPIData item = items->ft->getNext(items, nullptr);
-    return isGood(item, CMPI_ref) ? item.value.ref : nullptr;
+    return item.type == CMPI_ref ? item.value.ref : nullptr;
 }
 
 Instance* nextInstance(const CMPIEnumeration* items)
 {
     const CMPIData item = items->ft->getNext(items, nullptr);
-    return isGood(item, CMPI_instance) ? item.value.inst : nullptr;
+    return item.type == CMPI_instance ? item.value.inst : nullptr;
 }
 
 } // namespace described

@@ -13,7 +13,7 @@ bool hasKeys(const char* provider, const Path* cop, Status& status)
 CMPIString* textKey(const Path* cop, const char* name, Status& status)
 {
     const CMPIData key = cop->ft->getKey(cop, name, &status);
-    return isGood(key, CMPI_string) && !missing(key.value.string) ? key.value.string : nullptr;
+    return key.type == CMPI_string && !missing(key.value.string) ? key.value.string : nullptr;
 }
 
 } // namespace described

@@ -37,11 +37,6 @@ const CMPIBroker* broker()
     return servingBroker;
 }
 
-bool isGood(const CMPIData& data, CMPIType type)
-{
-    return data.type == type && (data.state & (CMPI_nullValue | CMPI_notFound | CMPI_badValue)) == 0;
-}
-
 void tell(CMPILevel level, const char* provider, const std::string& text)
 {
     broker()->eft->trace(broker(), level, provider, text.c_str(), nullptr);

@@ -34,9 +34,6 @@ bool missing(const Object* object)
     return object == nullptr || object->hdl == nullptr;
 }
 
-/// Whether it is a value of the type.
-bool isGood(const CMPIData& data, CMPIType type);
-
 // Reports.
 
 /// A line of the broker's trace.

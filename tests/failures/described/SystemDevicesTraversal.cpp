@@ -31,7 +31,7 @@ bool walkReferences(const Flow& flow, const CMPIContext* ctx, const Path* ref, c
     placeOnHost(path, ref, status);
     const auto refer = [&](const Path* group, const Path* part) {
         Instance* const instance = newInstance(path, &status);
-        if (missing(instance))
+        if (instance == nullptr)
             return;
         setReference(instance, "GroupComponent", group);
         setReference(instance, "PartComponent", part);

@@ -33,6 +33,9 @@ public:
     Instrumentation& operator=(const Instrumentation&) = delete;
 
     /// Stands on the first node of that kind, or on none if there is none. May be called again.
+    ///
+    /// A diagnostic indicator without a description is told in one error line in the log whenever the
+    /// indicators are selected, since it costs the provider all of them.
     void selectNode(NodeLexicon::NodeType kind);
 
     /// True while the cursor stands on a node.
