@@ -40,7 +40,7 @@ std::vector<SampleIndicator> indicatorsOf(const std::string& sample)
         indicators.push_back(indicator);
     }
     const bool allAreDescribed = std::none_of(indicators.begin(), indicators.end(),
-                                              [](const Indicator& each) { return each.description.empty(); });
+                                              [](const SampleIndicator& each) { return each.description.empty(); });
     EXPECT_EQ(RecordingLog::take().size(), allAreDescribed ? 0U : 1U);
     return indicators;
 }
