@@ -7,7 +7,8 @@
 
 namespace cimhost {
 
-namespace {
+// The habits of each broker have names in common.
+namespace pegasus {
 
 constexpr const char* pegasus2144 = "OpenPegasus 2.14.4";
 
@@ -142,10 +143,11 @@ void takeAnEmptyRoleForNone(OperationRequest& question, const RegisteredClass& /
             role->reset();
 }
 
-} // namespace
+} // namespace pegasus
 
 const Habits& pegasusHabits()
 {
+    using namespace pegasus;
     static const Habits habits{
         "pegasus",
         {

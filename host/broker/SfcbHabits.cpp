@@ -9,7 +9,8 @@
 
 namespace cimhost {
 
-namespace {
+// The habits of each broker have names in common.
+namespace sfcb {
 
 constexpr const char* sfcb1311 = "SFCB 1.3.11";
 
@@ -244,10 +245,11 @@ void referWithoutHosts(cim::Answer& answer, const OperationRequest& /*question*/
     }
 }
 
-} // namespace
+} // namespace sfcb
 
 const Habits& sfcbHabits()
 {
+    using namespace sfcb;
     static const Habits habits{
         "sfcb",
         {
