@@ -1,0 +1,50 @@
+"""What the tests do with a broker, whichever it is: start it, ask it, register the providers with it."""
+
+import subprocess
+
+from cimxml import Client
+
+TOOL = 300  # seconds at the most for a program
+
+
+class Broker:
+    """A broker of this run. Its kinds say how it is started, takes a registration up, and unloads the providers.
+
+    name, version: as told to people
+    like: as cimhost and glimmark-register call it
+    environment: of the broker and its tools
+    server: that runs; None until start()
+    """
+
+    def __init__(self, installation):
+        self.installation = installation
+        self.server = None
+
+    def ask(self, question):
+        """The answer, over a connection of its own; in the place of one, a text of what came instead."""
+        try:
+            with Client(self.server.port) as client:
+                return client.ask(question)
+        except (OSError, RuntimeError) as error:
+            return f"{type(error).__name__}: {error}"
+
+    def register(self, *arguments):
+        """Runs glimmark-register; its exit status and all that it said."""
+        command = [self.installation.registering, "--broker", self.like, *self.registering_options, *arguments]
+        done = subprocess.run(command, env=self.environment, capture_output=True, text=True, timeout=TOOL)
+        return done.returncode, done.stdout + done.stderr
+
+    def holders(self):
+        """The processes that have the provider library loaded."""
+        return self.server.holders("libGlimmarkProvider.so")
+
+    def stop(self):
+        if self.server:
+            self.server.stop()
+            self.server = None
+
+
+def version_of(command, environment):
+    """What a program says of its version."""
+    done = subprocess.run(command, env=environment, capture_output=True, text=True, timeout=TOOL)
+    return (done.stdout + done.stderr).split()[-1]

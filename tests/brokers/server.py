@@ -1,0 +1,101 @@
+"""A server's process with all that it starts: begun on a free port of the loopback interface, measured, ended."""
+
+import os
+import pathlib
+import re
+import signal
+import socket
+import subprocess
+import time
+
+STARTING = 60  # seconds at the most
+ENDING = 20
+
+
+def free_port():
+    with socket.socket() as listener:
+        listener.bind(("127.0.0.1", 0))
+        return listener.getsockname()[1]
+
+
+def answers(port):
+    with socket.socket() as client:
+        client.settimeout(1)
+        return client.connect_ex(("127.0.0.1", port)) == 0
+
+
+class Server:
+    """A command that listens on a port; its output goes into a file."""
+
+    def __init__(self, command, port, log, environment):
+        self.port = port
+        self.log = log
+        with open(log, "ab") as output:
+            self.process = subprocess.Popen(
+                command, stdin=subprocess.DEVNULL, stdout=output, stderr=output, env=environment, start_new_session=True
+            )
+        try:
+            self.wait_until_it_listens()
+        except BaseException:
+            self.stop()
+            raise
+
+    def wait_until_it_listens(self):
+        end = time.monotonic() + STARTING
+        while not answers(self.port):
+            if self.process.poll() is not None or time.monotonic() > end:
+                raise RuntimeError(f"{self.process.args[0]} does not start:\n{self.log.read_text()}")
+            time.sleep(0.05)
+
+    def processes(self):
+        """The numbers of all processes of the server that run."""
+        parents = {}
+        for folder in pathlib.Path("/proc").glob("[0-9]*"):
+            try:
+                stat = (folder / "stat").read_text()
+            except OSError:  # ended meanwhile
+                continue
+            state, parent = stat.rpartition(")")[2].split()[:2]
+            if state != "Z":
+                parents[int(folder.name)] = int(parent)
+        found = {self.process.pid}
+        while more := {pid for pid, parent in parents.items() if parent in found and pid not in found}:
+            found |= more
+        return found & parents.keys()
+
+    def resident(self):
+        """KiB of memory that is resident and no file's, of each process."""
+        return {pid: resident_memory(pid) for pid in self.processes()}
+
+    def holders(self, library):
+        """The processes that have a library loaded, by the library's file name."""
+        return {pid for pid in self.processes() if library in read_of(pid, "maps")}
+
+    def stop(self):
+        """Asks it to end, and ends whatever has not done so."""
+        started = self.processes() | {self.process.pid}
+        self.process.send_signal(signal.SIGTERM)
+        end = time.monotonic() + ENDING
+        while (self.process.poll() is None or any(map(runs, started))) and time.monotonic() < end:
+            time.sleep(0.05)
+        for pid in filter(runs, started):
+            os.kill(pid, signal.SIGKILL)
+        self.process.wait()
+
+
+def read_of(pid, name):
+    """A file about a process; nothing when the process has ended."""
+    try:
+        return pathlib.Path(f"/proc/{pid}/{name}").read_text()
+    except OSError:
+        return ""
+
+
+def runs(pid):
+    state = re.search(r"^State:\s*(\w)", read_of(pid, "status"), re.MULTILINE)
+    return state is not None and state[1] != "Z"
+
+
+def resident_memory(pid):
+    found = re.search(r"^RssAnon:\s*(\d+)", read_of(pid, "status"), re.MULTILINE)
+    return int(found[1]) if found else 0
