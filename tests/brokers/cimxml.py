@@ -195,8 +195,8 @@ def read_key(element):
 
 
 def read_instance(element, path):
-    return Instance(element.get("CLASSNAME"), path, {each.get("NAME"): read_property(each)
-                                                     for each in element if each.tag.startswith("PROPERTY")})
+    properties = {each.get("NAME"): read_property(each) for each in element if each.tag.startswith("PROPERTY")}
+    return Instance(element.get("CLASSNAME") or element.get("NAME"), path, properties)
 
 
 def read_property(element):
@@ -207,19 +207,20 @@ def read_property(element):
             value = None if found is None else read_path(found[0])
         case "PROPERTY.ARRAY":
             found = element.find("VALUE.ARRAY")
-            value = None if found is None else [read_value(type_name, each.text) for each in found]
+            value = None if found is None else [read_value(type_name, each) for each in found]
             type_name += "[]"
         case _:
             found = element.find("VALUE")
-            value = None if found is None else read_value(type_name, found.text)
+            value = None if found is None else read_value(type_name, found)
     return Property(type_name, value)
 
 
-def read_value(type_name, text):
-    match type_name:
-        case "boolean":
-            return text.upper() == "TRUE"
-        case "string" | "datetime" | "char16":
-            return text or ""
-        case _:
-            return float(text) if type_name.startswith("real") else int(text)
+def read_value(type_name, element):
+    text = element.text or ""
+    if element.tag == "VALUE.NULL":
+        return None
+    if type_name == "boolean":
+        return text.upper() == "TRUE"
+    if type_name in ("string", "datetime", "char16"):
+        return text
+    return float(text) if type_name.startswith("real") else int(text)

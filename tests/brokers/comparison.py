@@ -1,6 +1,7 @@
 """Compares what a broker answers with what is expected of it: what is described, as the differences that are known change
 it. Each known difference has to be needed for at least one question."""
 
+import dataclasses
 import difflib
 
 from cim import Answer
@@ -37,18 +38,25 @@ class Comparison:
         count, faults = 0, []
         for question in questions:
             count += 1
-            found = self.broker(question)
-            expected = self.expected(question)
+            found = sorted_by_class(self.broker(question))
+            expected = sorted_by_class(self.expected(question))
             if found != expected:
                 faults.append(f"{question}\n{shown(expected, found)}")
-            for difference in list(self.without):
-                if self.without[difference](question) != found:
-                    del self.without[difference]
+                continue
+            for difference in [each for each, ask in self.without.items() if sorted_by_class(ask(question)) != found]:
+                del self.without[difference]
         return count, faults
 
     def not_seen(self):
         """The differences that are known and that no answer showed."""
         return [difference.reason for difference in self.without]
+
+
+def sorted_by_class(answer):
+    """An answer whose items of each class stand together, in their order: of several providers any may answer first."""
+    if not isinstance(answer, Answer):
+        return answer
+    return dataclasses.replace(answer, items=tuple(sorted(answer.items, key=lambda item: item.class_name)))
 
 
 def shown(expected, found):
@@ -66,4 +74,5 @@ def outline(answer):
     """A status, or how many items; whatever else was found as it is."""
     if not isinstance(answer, Answer):
         return str(answer)
-    return str(answer) if answer.code or not answer.items else f"{len(answer.items)} items, the first {answer.items[0]}"
+    first = f", the first {str(answer.items[0]).splitlines()[0]}" if answer.items else ""
+    return str(answer) if answer.code else f"{len(answer.items)} items{first}"

@@ -5,10 +5,13 @@ a function that gets a question, what answers it without this entry, and the bro
 """
 
 import dataclasses
+import platform
 import typing
 
-from cim import Answer, Instance, Path, Property
+from cim import COMPUTER_SYSTEM, ELEMENT_CAPABILITIES, GLIMMARK, Answer, Instance, Path, Property, Question
+from questions import ENDS, NO_CLASS
 
+# In the order in which the entries change an answer. What changes a question comes last, so that all others see it changed.
 TABLE = []
 
 
@@ -55,7 +58,7 @@ def with_paths(answer, change):
         match value:
             case Path():
                 return change(dataclasses.replace(value, keys={name: inside(key) for name, key in value.keys.items()}))
-            case Property():
+            case Property(value=Path()):
                 return Property(value.type, inside(value.value))
             case Instance():
                 properties = {name: inside(each) for name, each in value.properties.items()}
@@ -66,16 +69,121 @@ def with_paths(answer, change):
     return dataclasses.replace(answer, items=tuple(map(inside, answer.items)))
 
 
-@differs("sfcb", "pegasus", reason="Properties that the provider does not set come as null, or with the default of the class.")
+def with_texts(path, change):
+    """A path whose texts are changed, also those of paths within."""
+    def inside(value):
+        return with_texts(value, change) if isinstance(value, Path) else change(value) if isinstance(value, str) else value
+
+    return dataclasses.replace(path, keys={name: inside(value) for name, value in path.keys.items()})
+
+
+TRAVERSALS = {"ain": "AssociatorNames", "ai": "Associators", "rin": "ReferenceNames", "ri": "References"}
+
+
+def names_of(question):
+    """The names of the property list in small letters, as names do not differ by case; None where there is no list."""
+    names = question.options.get("PropertyList")
+    return None if names is None else [name.lower() for name in names]
+
+
+# --- What is answered ---
+
+
+@differs("sfcb", reason="A property list is taken literally: keys that it does not name are missing.")
+def literal_lists(question, ask, schema):
+    names = names_of(question)
+
+    def reduce(instance):
+        kept = {name: each for name, each in instance.properties.items() if name.lower() in names}
+        return dataclasses.replace(instance, properties=kept)
+
+    return with_instances(ask(question), reduce) if names is not None else ask(question)
+
+
+@differs("sfcb", "pegasus",
+         reason="Properties that the provider does not set come as null, or with the default of the class.")
 def unset_properties(question, ask, schema):
-    wanted = question.options.get("PropertyList")
+    names = names_of(question)
 
     def complete(instance):
-        declared = schema.properties(instance.class_name)
-        names = [name for name in declared if wanted is None or name in wanted]
-        return dataclasses.replace(instance, properties={**{name: declared[name] for name in names}, **instance.properties})
+        declared = schema.properties(instance.class_name).items()
+        added = {name: each for name, each in declared if names is None or name.lower() in names}
+        return dataclasses.replace(instance, properties={**added, **instance.properties})
 
     return with_instances(ask(question), complete)
+
+
+@differs("sfcb", reason="References come without the host.")
+def references_without_host(question, ask, schema):
+    answer = ask(question)
+    bare = with_paths(answer, lambda path: dataclasses.replace(path, host=None))
+    return dataclasses.replace(answer, items=tuple(map(with_host_of, bare.items, answer.items)))
+
+
+def with_host_of(item, other):
+    """An item with the host that another item's own path has."""
+    if isinstance(item, Path):
+        return dataclasses.replace(item, host=other.host)
+    return dataclasses.replace(item, path=item.path and dataclasses.replace(item.path, host=other.path.host))
+
+
+def associations_option(question):
+    """The parameter of a traversal that names the class of the association."""
+    return "AssocClass" if question.operation in ("ain", "ai") else "ResultClass"
+
+
+def references_of(path):
+    return [key for key in path.keys.values() if isinstance(key, Path)]
+
+
+def without_list(question):
+    options = {name: value for name, value in question.options.items() if name != "PropertyList"}
+    return dataclasses.replace(question, options=options)
+
+
+@differs("pegasus", reason="Every reference and every path within has the host.")
+def hosts_everywhere(question, ask, schema):
+    answer = ask(question)
+    full = with_paths(answer, lambda path: dataclasses.replace(path, host=path.host or platform.node()))
+    return dataclasses.replace(answer, items=tuple(map(with_host_of, full.items, answer.items)))
+
+
+KEYS = {
+    COMPUTER_SYSTEM: ["CreationClassName", "Name"],
+    GLIMMARK: ["CreationClassName", "DeviceID", "SystemCreationClassName", "SystemName"],
+}
+
+
+@differs("pegasus", reason="Keys that a path in an answer lacks are filled with empty text.")
+def filled_keys(question, ask, schema):
+    def fill(path):
+        return dataclasses.replace(path, keys={**dict.fromkeys(KEYS.get(path.class_name, []), ""), **path.keys})
+
+    return with_paths(ask(question), fill)
+
+
+@differs("pegasus", reason="Keys that a property list does not name are left out of instances.")
+def keys_left_out(question, ask, schema):
+    return literal_lists(question, ask, schema)
+
+
+@differs("sfcb", reason="A path is made of its instance: of an association it lacks the keys that a property list does not name, "
+                        "and GetInstance does not find it.")
+def paths_of_lists(question, ask, schema):
+    names = names_of(question)
+    answer = ask(question)
+    if names is None or answer.code:
+        return answer
+
+    def reduce(instance):
+        if instance.class_name != ELEMENT_CAPABILITIES or instance.path is None:
+            return instance
+        kept = {name: key for name, key in instance.path.keys.items() if name.lower() in names}
+        return dataclasses.replace(instance, path=dataclasses.replace(instance.path, keys=kept))
+
+    if question.operation == "gi" and question.target.class_name == ELEMENT_CAPABILITIES:
+        return answer if {name.lower() for name in ENDS[ELEMENT_CAPABILITIES]} <= set(names) else Answer(6)
+    return with_instances(answer, reduce)
 
 
 SFCB_TEXTS = {
@@ -89,22 +197,135 @@ SFCB_TEXTS = {
 @differs("sfcb", reason="The broker has texts of its own for errors that it finds itself, and for those without a text.")
 def texts_of_sfcb(question, ask, schema):
     answer = ask(question)
+    if answer.message and answer.code not in (3, 5):
+        return answer
     return dataclasses.replace(answer, message=SFCB_TEXTS.get(answer.code, answer.message))
 
 
-@differs("sfcb", reason="References come without the host.")
-def references_without_host(question, ask, schema):
-    def without(path):
-        return dataclasses.replace(path, host=None)
+# --- What is asked of the providers ---
 
-    def at_top(before, after):
-        """Paths that are items themselves keep theirs."""
-        if isinstance(after, Path):
-            return dataclasses.replace(after, host=before.host)
-        if after.path is None:
-            return after
-        return dataclasses.replace(after, path=dataclasses.replace(after.path, host=before.path.host))
+@differs("sfcb", reason="An empty property list is none: all properties come.")
+def empty_lists(question, ask, schema):
+    return ask(without_list(question) if question.options.get("PropertyList") == [] else question)
 
+
+@differs("sfcb", reason="References come with all properties, whatever the property list.")
+def lists_of_references(question, ask, schema):
+    return ask(without_list(question) if question.operation == "ri" else question)
+
+
+@differs("sfcb", reason="A query is answered by the broker, which enumerates the class.")
+def queries(question, ask, schema):
+    if question.operation != "query":
+        return ask(question)
+    answer = ask(Question("ei", question.target.split()[-1], namespace=question.namespace))
+    place = {"host": platform.node(), "namespace": question.namespace}
+    return with_instances(
+        answer, lambda instance: dataclasses.replace(instance, path=dataclasses.replace(instance.path, **place)))
+
+
+@differs("sfcb", reason="A traversal from a path without keys is one of classes, which the broker does not answer.")
+def starts_without_keys(question, ask, schema):
+    if question.operation in TRAVERSALS and not question.target.keys:
+        operation = TRAVERSALS[question.operation].replace("Associators", "Associator")
+        return Answer(7, f"{operation} operation for classes not supported")
+    return ask(question)
+
+
+@differs("sfcb", reason="A traversal by an association that nobody serves is answered with 6.")
+def unknown_associations(question, ask, schema):
     answer = ask(question)
-    changed = with_paths(answer, without)
-    return dataclasses.replace(changed, items=tuple(map(at_top, answer.items, changed.items)))
+    if question.operation in TRAVERSALS and answer.code == 5:
+        return Answer(6, "Provider not found or not loadable")
+    return answer
+
+
+@differs("sfcb", reason="Characters beyond ASCII, and blanks, are cut off the ends of a key that a client sends.")
+def ends_of_keys(question, ask, schema):
+    if not isinstance(question.target, Path):
+        return ask(question)
+    return ask(dataclasses.replace(question, target=with_texts(question.target, cut)))
+
+
+def cut(text):
+    return text.strip(" \t\r\n" + "".join(each for each in text if ord(each) > 0x7F))
+
+
+@differs("pegasus", reason="A traversal is asked of those associations of which the object can be an end, each with its class.")
+def fitting_associations(question, ask, schema):
+    if question.operation not in TRAVERSALS:
+        return ask(question)
+    option = associations_option(question)
+    wanted = question.options.get(option)
+    fitting = [association for association, ends in ENDS.items()
+               if wanted in (None, association) and question.target.class_name in ends.values()]
+    answers = [ask(dataclasses.replace(question, options={**question.options, option: each})) for each in fitting]
+    errors = [answer for answer in answers if answer.code]
+    return errors[0] if errors else Answer(0, "", tuple(item for answer in answers for item in answer.items))
+
+
+@differs("pegasus", reason="A traversal from a path without keys is one of classes too: the far class comes first.")
+def classes_too(question, ask, schema):
+    answer = ask(question)
+    if question.operation not in TRAVERSALS or question.target.keys or answer.code:
+        return answer
+    association = question.options[associations_option(question)]
+    far = [each for each in ENDS[association].values() if each != question.target.class_name][0]
+    found = association if question.operation in ("rin", "ri") else DECLARED.get(far, far)
+    item = Path(found, {}, question.namespace, platform.node())
+    if question.operation in ("ai", "ri"):
+        item = Instance(found, item, schema.properties(found))
+    return dataclasses.replace(answer, items=(item, *answer.items))
+
+
+# What the association's class says of an end where it says less than what is served.
+DECLARED = {COMPUTER_SYSTEM: "CIM_ComputerSystem"}
+
+
+@differs("pegasus", reason="A class that is not in the namespace is an error, wherever it is named.")
+def unknown_classes(question, ask, schema):
+    if question.operation in TRAVERSALS:
+        association, far = associations_option(question), "ResultClass"
+        if NO_CLASS in (question.target.class_name, question.options.get(association)):
+            return Answer(4, NO_CLASS)
+        if question.options.get(far) == NO_CLASS:
+            return Answer(5, NO_CLASS)
+    elif question.operation == "gi" and NO_CLASS in [key.class_name for key in references_of(question.target)]:
+        return Answer(5, NO_CLASS)
+    return ask(question)
+
+
+@differs("pegasus", reason="Keys that are missing are filled with empty text: nothing is found.")
+def missing_keys(question, ask, schema):
+    if question.operation == "gi" and not question.target.keys:
+        return Answer(6)
+    return ask(question)
+
+
+@differs("pegasus", reason="A reference that is no path is an error of its own.")
+def malformed_references(question, ask, schema):
+    if question.operation == "gi" and question.target.class_name in ENDS:
+        for name, key in question.target.keys.items():
+            if name in ENDS[question.target.class_name] and not isinstance(key, Path):
+                return Answer(1, f'malformed object name: {key}, reason:"class name {key} not a legal CIM name"')
+    return ask(question)
+
+
+@differs("pegasus", reason="The texts of errors begin with the name of the code; those of the broker's own name what is wrong.")
+def texts_of_pegasus(question, ask, schema):
+    answer = ask(question)
+    if not answer.code:
+        return answer
+    texts = {3: question.namespace, 5: NO_CLASS}
+    text = texts.get(answer.code, answer.message)
+    return dataclasses.replace(answer, message=PEGASUS_NAMES[answer.code] + (f": {text}" if text else ""))
+
+
+PEGASUS_NAMES = {
+    1: "CIM_ERR_FAILED",
+    3: "CIM_ERR_INVALID_NAMESPACE",
+    4: "CIM_ERR_INVALID_PARAMETER",
+    5: "CIM_ERR_INVALID_CLASS",
+    6: "CIM_ERR_NOT_FOUND",
+    7: "CIM_ERR_NOT_SUPPORTED",
+}

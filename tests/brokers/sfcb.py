@@ -1,7 +1,8 @@
 """SFCB, where it is installed, with its state in a folder of this run.
 
-The installation's folder for state is covered by that folder in this run's own mount namespace, so that the broker's
-tools need no option to find it; System V semaphores are this run's by its own IPC namespace.
+The installation's folder for state and its configuration are covered by files of this run in its own mount namespace, so
+that the broker's tools and glimmark-register need no option to find them; System V semaphores are this run's by its own
+IPC namespace.
 """
 
 import os
@@ -43,6 +44,11 @@ def find():
     return pathlib.Path(daemon).resolve().parents[1] if daemon else None
 
 
+def cover(place, covering):
+    """Puts another file or folder in the place of one, for this run."""
+    subprocess.run(["mount", "--bind", covering, place], check=True)
+
+
 class Sfcb(Broker):
     name = "SFCB"
     like = "sfcb"
@@ -58,6 +64,16 @@ class Sfcb(Broker):
         self.daemon = prefix / "sbin/sfcbd"
         self.version = version_of([self.daemon, "-v"], self.environment)
         self.cover_state()
+        self.cover_configuration()
+        subprocess.run(["sfcbrepos", "-f", "-i"], check=True, capture_output=True, env=self.environment)
+
+    def cover_configuration(self):
+        places = [self.prefix / "etc/sfcb/sfcb.cfg", pathlib.Path("/etc/sfcb/sfcb.cfg")]
+        self.configuration = next(place for place in places if place.exists())
+        covering = self.folder / "sfcb.cfg"
+        covering.touch()
+        cover(self.configuration, covering)
+        self.configure(free_port())
 
     def cover_state(self):
         places = [self.prefix / "var/lib/sfcb", pathlib.Path("/var/lib/sfcb")]
@@ -65,17 +81,19 @@ class Sfcb(Broker):
         covering = self.folder / "state"
         shutil.copytree(self.state / "stage", covering / "stage")
         (covering / "registration").mkdir()
-        subprocess.run(["mount", "--bind", covering, self.state], check=True)
-        subprocess.run(["sfcbrepos", "-f", "-i"], check=True, capture_output=True, env=self.environment)
+        cover(self.state, covering)
 
     def start(self, idle=NEVER):
         """Starts it; a provider that is not asked for `idle` seconds is unloaded."""
         port = free_port()
-        configuration = self.folder / "sfcb.cfg"
+        self.configure(port, idle)
+        command = [self.daemon, "-c", self.configuration]
+        self.server = Server(command, port, self.folder / "sfcbd.log", self.environment)
+
+    def configure(self, port, idle=NEVER):
         values = {"port": port, "state": self.state, "provider_dir": self.installation.provider_dir,
                   "prefix": self.prefix, "folder": self.folder, "idle": idle, "sampling": max(1, idle // 2)}
-        configuration.write_text(CONFIGURATION.format(**values))
-        self.server = Server([self.daemon, "-c", configuration], port, self.folder / "sfcbd.log", self.environment)
+        self.configuration.write_text(CONFIGURATION.format(**values))
 
     def take_up(self):
         """Has it serve what is registered now: it looks when it starts."""
