@@ -38,6 +38,10 @@ class Broker:
         """The processes that have the provider library loaded."""
         return self.server.holders("libGlimmarkProvider.so")
 
+    def restart(self):
+        self.stop()
+        self.start()
+
     def stop(self):
         if self.server:
             self.server.stop()

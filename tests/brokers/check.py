@@ -148,6 +148,7 @@ class Trial:
 
     def endurance(self):
         self.take(inventories.many(1))
+        self.broker.restart()  # memory that was taken and given back would hide what adds up
         question = Question("ei", GLIMMARK)
         self.compare([question], "one indicator")
         memory = ask_often(self.broker.server, question, self.broker.ask(question), self.options.enumerations)

@@ -9,7 +9,7 @@ import platform
 import typing
 
 from cim import COMPUTER_SYSTEM, ELEMENT_CAPABILITIES, GLIMMARK, Answer, Instance, Path, Property, Question
-from questions import ENDS, NO_CLASS
+from questions import ENDS, NO_CLASS, SUPERCLASSES
 
 # In the order in which the entries change an answer. What changes a question comes last, so that all others see it changed.
 TABLE = []
@@ -203,6 +203,13 @@ def texts_of_sfcb(question, ask, schema):
 
 
 # --- What is asked of the providers ---
+
+@differs("sfcb", "pegasus", reason="A superclass of the schema is enumerated, which cimhost does not know.")
+def superclasses(question, ask, schema):
+    if question.operation not in ("ein", "ei"):
+        return ask(question)
+    return ask(dataclasses.replace(question, target=SUPERCLASSES.get(question.target, question.target)))
+
 
 @differs("sfcb", reason="An empty property list is none: all properties come.")
 def empty_lists(question, ask, schema):

@@ -10,6 +10,7 @@ import time
 
 STARTING = 60  # seconds at the most
 ENDING = 20
+MARK = "SERVER_OF_CHECK_BROKERS"
 
 
 def free_port():
@@ -30,6 +31,9 @@ class Server:
     def __init__(self, command, port, log, environment):
         self.port = port
         self.log = log
+        # What it starts inherits this.
+        self.mark = f"{MARK}={port}"
+        environment = {**environment, MARK: str(port)}
         with open(log, "ab") as output:
             self.process = subprocess.Popen(
                 command, stdin=subprocess.DEVNULL, stdout=output, stderr=output, env=environment, start_new_session=True
@@ -48,20 +52,9 @@ class Server:
             time.sleep(0.05)
 
     def processes(self):
-        """The numbers of all processes of the server that run."""
-        parents = {}
-        for folder in pathlib.Path("/proc").glob("[0-9]*"):
-            try:
-                stat = (folder / "stat").read_text()
-            except OSError:  # ended meanwhile
-                continue
-            state, parent = stat.rpartition(")")[2].split()[:2]
-            if state != "Z":
-                parents[int(folder.name)] = int(parent)
-        found = {self.process.pid}
-        while more := {pid for pid, parent in parents.items() if parent in found and pid not in found}:
-            found |= more
-        return found & parents.keys()
+        """The numbers of all its processes, also of those that it has let go."""
+        numbers = (int(folder.name) for folder in pathlib.Path("/proc").glob("[0-9]*"))
+        return {pid for pid in numbers if self.mark in read_of(pid, "environ")}
 
     def resident(self):
         """KiB of memory that is resident and no file's, of each process."""

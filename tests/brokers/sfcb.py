@@ -97,8 +97,7 @@ class Sfcb(Broker):
 
     def take_up(self):
         """Has it serve what is registered now: it looks when it starts."""
-        self.stop()
-        self.start()
+        self.restart()
 
     def unload(self):
         """Has it unload the providers, which it does with those that nobody asks."""
