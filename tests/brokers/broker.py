@@ -1,5 +1,6 @@
 """What the tests do with a broker, whichever it is: start it, ask it, register the providers with it."""
 
+import os
 import subprocess
 
 from cimxml import Client
@@ -12,6 +13,7 @@ class Broker:
 
     name, version: as told to people
     like: as cimhost and glimmark-register call it
+    home: the folder that glimmark-register is told of
     environment: of the broker and its tools
     server: that runs; None until start()
     """
@@ -29,9 +31,12 @@ class Broker:
             return f"{type(error).__name__}: {error}"
 
     def register(self, *arguments):
-        """Runs glimmark-register; its exit status and all that it said."""
-        command = [self.installation.registering, "--broker", self.like, *self.registering_options, *arguments]
-        done = subprocess.run(command, env=self.environment, capture_output=True, text=True, timeout=TOOL)
+        """Runs glimmark-register as on a machine where the broker is installed apart; its exit status and all that it
+        said."""
+        options = ["--broker", self.like, "--prefix", self.home, *self.registering_options]
+        command = [self.installation.registering, *options, *arguments]
+        environment = {**self.environment, "PATH": os.environ["PATH"]}
+        done = subprocess.run(command, env=environment, capture_output=True, text=True, timeout=TOOL)
         return done.returncode, done.stdout + done.stderr
 
     def holders(self):

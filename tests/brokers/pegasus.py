@@ -33,19 +33,19 @@ class Pegasus(Broker):
         self.name = "OpenPegasus, providers in an agent" if agents else "OpenPegasus, providers in its own process"
         self.agents = agents
         self.log = folder / "cimserver.log"
-        home = folder / "home"
+        self.home = folder / "home"
         for name in ["logs", "trace", "cache"]:
-            (home / name).mkdir(parents=True)
+            (self.home / name).mkdir(parents=True)
         for name in ["bin", "lib"]:
-            (home / name).symlink_to(prefix / name)
-        shutil.copytree(prefix / "repository", home / "repository")
+            (self.home / name).symlink_to(prefix / name)
+        shutil.copytree(prefix / "repository", self.home / "repository")
         self.environment = {
             **environment,
             "PATH": f"{prefix}/bin:{environment['PATH']}",
-            "PEGASUS_HOME": str(home),
+            "PEGASUS_HOME": str(self.home),
             "LD_LIBRARY_PATH": str(prefix / "lib"),
         }
-        self.daemon = home / "bin/cimserver"
+        self.daemon = self.home / "bin/cimserver"
         self.version = version_of([self.daemon, "--version"], self.environment)
         sockets = folder / "sockets"
         sockets.mkdir()

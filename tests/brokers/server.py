@@ -10,6 +10,7 @@ import time
 
 STARTING = 60  # seconds at the most
 ENDING = 20
+LINGERING = 2  # what a server has started, once it has ended
 MARK = "SERVER_OF_CHECK_BROKERS"
 
 
@@ -65,15 +66,22 @@ class Server:
         return {pid for pid in self.processes() if library in read_of(pid, "maps")}
 
     def stop(self):
-        """Asks it to end, and ends whatever has not done so."""
+        """Asks it to end, which ends what it has started; ends whatever is left."""
         started = self.processes() | {self.process.pid}
         self.process.send_signal(signal.SIGTERM)
-        end = time.monotonic() + ENDING
-        while (self.process.poll() is None or any(map(runs, started))) and time.monotonic() < end:
-            time.sleep(0.05)
+        wait_until(lambda: self.process.poll() is not None, ENDING)
+        wait_until(lambda: not any(map(runs, started)), LINGERING)
         for pid in filter(runs, started):
             os.kill(pid, signal.SIGKILL)
         self.process.wait()
+        wait_until(lambda: not any(map(runs, started)), ENDING)
+
+
+def wait_until(condition, seconds):
+    """Waits for a condition, at the most so long."""
+    end = time.monotonic() + seconds
+    while not condition() and time.monotonic() < end:
+        time.sleep(0.05)
 
 
 def read_of(pid, name):

@@ -9,10 +9,9 @@ import os
 import pathlib
 import shutil
 import subprocess
-import time
 
 from broker import Broker, version_of
-from server import Server, free_port
+from server import Server, free_port, wait_until
 
 NEVER = 3600  # seconds, longer than a run
 
@@ -58,7 +57,7 @@ class Sfcb(Broker):
 
     def __init__(self, prefix, installation, folder, environment):
         super().__init__(installation)
-        self.prefix = prefix
+        self.home = prefix
         self.folder = folder
         self.environment = {**environment, "PATH": f"{prefix}/sbin:{prefix}/bin:{environment['PATH']}"}
         self.daemon = prefix / "sbin/sfcbd"
@@ -68,7 +67,7 @@ class Sfcb(Broker):
         subprocess.run(["sfcbrepos", "-f", "-i"], check=True, capture_output=True, env=self.environment)
 
     def cover_configuration(self):
-        places = [self.prefix / "etc/sfcb/sfcb.cfg", pathlib.Path("/etc/sfcb/sfcb.cfg")]
+        places = [self.home / "etc/sfcb/sfcb.cfg", pathlib.Path("/etc/sfcb/sfcb.cfg")]
         self.configuration = next(place for place in places if place.exists())
         covering = self.folder / "sfcb.cfg"
         covering.touch()
@@ -76,7 +75,7 @@ class Sfcb(Broker):
         self.configure(free_port())
 
     def cover_state(self):
-        places = [self.prefix / "var/lib/sfcb", pathlib.Path("/var/lib/sfcb")]
+        places = [self.home / "var/lib/sfcb", pathlib.Path("/var/lib/sfcb")]
         self.state = next(place for place in places if (place / "stage/default.reg").exists())
         covering = self.folder / "state"
         shutil.copytree(self.state / "stage", covering / "stage")
@@ -92,7 +91,7 @@ class Sfcb(Broker):
 
     def configure(self, port, idle=NEVER):
         values = {"port": port, "state": self.state, "provider_dir": self.installation.provider_dir,
-                  "prefix": self.prefix, "folder": self.folder, "idle": idle, "sampling": max(1, idle // 2)}
+                  "prefix": self.home, "folder": self.folder, "idle": idle, "sampling": max(1, idle // 2)}
         self.configuration.write_text(CONFIGURATION.format(**values))
 
     def take_up(self):
@@ -101,9 +100,7 @@ class Sfcb(Broker):
 
     def unload(self):
         """Has it unload the providers, which it does with those that nobody asks."""
-        end = time.monotonic() + 10 * self.idle
-        while self.holders() and time.monotonic() < end:
-            time.sleep(0.2)
+        wait_until(lambda: not self.holders(), 10 * self.idle)
 
     def reload(self):
         """Has it be ready to load them: it always is."""
