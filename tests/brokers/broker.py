@@ -21,6 +21,18 @@ class Broker:
     def __init__(self, installation):
         self.installation = installation
         self.server = None
+        self.covered = []
+
+    def cover(self, place, covering):
+        """Puts another file or folder in the place of one of the machine's, for this run's own mount namespace."""
+        subprocess.run(["mount", "--bind", covering, place], check=True)
+        self.covered.append(place)
+
+    def close(self):
+        """Ends it, and uncovers what was covered."""
+        self.stop()
+        while self.covered:
+            subprocess.run(["umount", self.covered.pop()], check=True)
 
     def ask(self, question):
         """The answer, over a connection of its own; in the place of one, a text of what came instead."""

@@ -208,7 +208,7 @@ def run(broker, inventory, folder, environment, options):
         broker.start()
         return try_out(Trial(broker, described, inventory, options))
     finally:
-        broker.stop()
+        broker.close()
         described.stop()
 
 
@@ -240,7 +240,7 @@ def main():
         passed = [run(broker, inventory, folder, environment, options)
                   for broker in brokers(options, installation, folder, environment)]
     finally:
-        shutil.rmtree(folder, ignore_errors=True)
+        shutil.rmtree(folder)
     return 0 if all(passed) else 1
 
 

@@ -43,11 +43,6 @@ def find():
     return pathlib.Path(daemon).resolve().parents[1] if daemon else None
 
 
-def cover(place, covering):
-    """Puts another file or folder in the place of one, for this run."""
-    subprocess.run(["mount", "--bind", covering, place], check=True)
-
-
 class Sfcb(Broker):
     name = "SFCB"
     like = "sfcb"
@@ -71,7 +66,7 @@ class Sfcb(Broker):
         self.configuration = next(place for place in places if place.exists())
         covering = self.folder / "sfcb.cfg"
         covering.touch()
-        cover(self.configuration, covering)
+        self.cover(self.configuration, covering)
         self.configure(free_port())
 
     def cover_state(self):
@@ -80,7 +75,7 @@ class Sfcb(Broker):
         covering = self.folder / "state"
         shutil.copytree(self.state / "stage", covering / "stage")
         (covering / "registration").mkdir()
-        cover(self.state, covering)
+        self.cover(self.state, covering)
 
     def start(self, idle=NEVER):
         """Starts it; a provider that is not asked for `idle` seconds is unloaded."""
