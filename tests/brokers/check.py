@@ -131,7 +131,8 @@ class Trial:
     def compare(self, asked, title):
         count, faults = self.comparison.compare(asked)
         more = [f"... {len(faults) - FAULTS_SHOWN} more"] if len(faults) > FAULTS_SHOWN else []
-        hold(not faults, f"{title}: {len(faults)} of {count} answers differ\n" + "\n".join(faults[:FAULTS_SHOWN] + more))
+        shown = "\n".join(faults[:FAULTS_SHOWN] + more)
+        hold(not faults, f"{title}: {len(faults)} of {count} answers differ\n{shown}")
         return f"{title}: {count:,} answers as described"
 
     # --- Many requests ---
@@ -187,7 +188,15 @@ def try_out(trial):
     return passed
 
 
-def brokers(options, installation, folder, environment):
+def say_what_is_found():
+    """Whether any broker is here."""
+    found = [("SFCB", sfcb.find(), "SFCB_PREFIX"), ("OpenPegasus", pegasus.find(), "PEGASUS_HOME")]
+    for name, prefix, variable in found:
+        print(f"{name}: {prefix or f'skipped, as it is neither on PATH nor named by {variable}'}")
+    return any(prefix for _, prefix, _ in found)
+
+
+def brokers(installation, folder, environment):
     """Each broker that is here, made when its turn has come."""
     prefix = sfcb.find()
     if prefix:
@@ -225,11 +234,8 @@ def main():
     if options.differences:
         print(differences.table())
         return 0
-    for name, found, variable in [("SFCB", sfcb.find(), "SFCB_PREFIX"), ("OpenPegasus", pegasus.find(), "PEGASUS_HOME")]:
-        if options.found:
-            print(f"{name}: {found or f'skipped, it is neither on PATH nor named by {variable}'}")
     if options.found:
-        return 0 if sfcb.find() or pegasus.find() else 1
+        return 0 if say_what_is_found() else 1
 
     folder = pathlib.Path(tempfile.mkdtemp(prefix="check-brokers."))
     try:
@@ -238,7 +244,7 @@ def main():
         inventory.replace(inventories.small_server(installation))
         environment = inventory.environment()
         passed = [run(broker, inventory, folder, environment, options)
-                  for broker in brokers(options, installation, folder, environment)]
+                  for broker in brokers(installation, folder, environment)]
     finally:
         shutil.rmtree(folder)
     return 0 if all(passed) else 1

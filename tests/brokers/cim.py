@@ -30,7 +30,8 @@ class Path:
     def __str__(self):
         place = f"//{self.host}/" if self.host else ""
         place += f"{self.namespace}:" if self.namespace else ""
-        return place + self.class_name + "." + ",".join(f"{name}={literal(value)}" for name, value in sorted(self.keys.items()))
+        keys = ",".join(f"{name}={literal(value)}" for name, value in sorted(self.keys.items()))
+        return f"{place}{self.class_name}.{keys}"
 
 
 @dataclasses.dataclass(frozen=True)

@@ -1,5 +1,5 @@
-"""Compares what a broker answers with what is expected of it: what is described, as the differences that are known change
-it. Each known difference has to be needed for at least one question."""
+"""Compares what a broker answers with what is expected of it: what is described, as the known differences change it.
+Each known difference has to be needed for at least one question."""
 
 import dataclasses
 import difflib

@@ -8,11 +8,16 @@ import dataclasses
 import platform
 import typing
 
-from cim import COMPUTER_SYSTEM, ELEMENT_CAPABILITIES, GLIMMARK, Answer, Instance, Path, Property, Question
+from changes import names_of, with_host_of, with_instances, with_paths, with_properties, with_texts, without_list
+from cim import COMPUTER_SYSTEM, ELEMENT_CAPABILITIES, GLIMMARK, Answer, Instance, Path, Question
 from questions import ENDS, NO_CLASS, SUPERCLASSES
 
-# In the order in which the entries change an answer. What changes a question comes last, so that all others see it changed.
+# In the order in which the entries change an answer. Of each broker, those that change what is asked come last, so that
+# all others see the question changed.
 TABLE = []
+
+BROKERS = {"sfcb": "SFCB", "pegasus": "OpenPegasus"}
+TRAVERSALS = {"ain": "AssociatorNames", "ai": "Associators", "rin": "ReferenceNames", "ri": "References"}
 
 
 @dataclasses.dataclass(frozen=True, eq=False)
@@ -41,63 +46,17 @@ def known(broker):
 
 
 def table():
-    """The whole table, a line each, for people."""
-    return "\n".join(f"{', '.join(each.brokers)}: {each.reason}" for each in TABLE)
+    """The whole table, for people: in Markdown."""
+    rows = [f"| {' and '.join(BROKERS[each] for each in row.brokers)} | {row.reason} |" for row in TABLE]
+    return "\n".join(["| Broker | What differs |", "|---|---|", *rows])
 
 
-def with_instances(answer, change):
-    """An answer whose instances are changed; paths stay."""
-    items = (change(item) if isinstance(item, Instance) else item for item in answer.items)
-    return dataclasses.replace(answer, items=tuple(items))
+def associations_option(question):
+    """The parameter of a traversal that names the class of the association."""
+    return "AssocClass" if question.operation in ("ain", "ai") else "ResultClass"
 
 
-def with_paths(answer, change):
-    """An answer whose paths are changed, also those within."""
-
-    def inside(value):
-        match value:
-            case Path():
-                return change(dataclasses.replace(value, keys={name: inside(key) for name, key in value.keys.items()}))
-            case Property(value=Path()):
-                return Property(value.type, inside(value.value))
-            case Instance():
-                properties = {name: inside(each) for name, each in value.properties.items()}
-                return Instance(value.class_name, inside(value.path), properties)
-            case _:
-                return value
-
-    return dataclasses.replace(answer, items=tuple(map(inside, answer.items)))
-
-
-def with_texts(path, change):
-    """A path whose texts are changed, also those of paths within."""
-    def inside(value):
-        return with_texts(value, change) if isinstance(value, Path) else change(value) if isinstance(value, str) else value
-
-    return dataclasses.replace(path, keys={name: inside(value) for name, value in path.keys.items()})
-
-
-TRAVERSALS = {"ain": "AssociatorNames", "ai": "Associators", "rin": "ReferenceNames", "ri": "References"}
-
-
-def names_of(question):
-    """The names of the property list in small letters, as names do not differ by case; None where there is no list."""
-    names = question.options.get("PropertyList")
-    return None if names is None else [name.lower() for name in names]
-
-
-# --- What is answered ---
-
-
-@differs("sfcb", reason="A property list is taken literally: keys that it does not name are missing.")
-def literal_lists(question, ask, schema):
-    names = names_of(question)
-
-    def reduce(instance):
-        kept = {name: each for name, each in instance.properties.items() if name.lower() in names}
-        return dataclasses.replace(instance, properties=kept)
-
-    return with_instances(ask(question), reduce) if names is not None else ask(question)
+# --- Both ---
 
 
 @differs("sfcb", "pegasus",
@@ -113,6 +72,21 @@ def unset_properties(question, ask, schema):
     return with_instances(ask(question), complete)
 
 
+@differs("sfcb", "pegasus", reason="A superclass of the schema is enumerated, which cimhost does not know.")
+def superclasses(question, ask, schema):
+    if question.operation not in ("ein", "ei"):
+        return ask(question)
+    return ask(dataclasses.replace(question, target=SUPERCLASSES.get(question.target, question.target)))
+
+
+# --- SFCB ---
+
+
+@differs("sfcb", reason="A property list is taken literally: keys that it does not name are missing.")
+def literal_lists(question, ask, schema):
+    return with_properties(ask(question), names_of(question))
+
+
 @differs("sfcb", reason="References come without the host.")
 def references_without_host(question, ask, schema):
     answer = ask(question)
@@ -120,55 +94,7 @@ def references_without_host(question, ask, schema):
     return dataclasses.replace(answer, items=tuple(map(with_host_of, bare.items, answer.items)))
 
 
-def with_host_of(item, other):
-    """An item with the host that another item's own path has."""
-    if isinstance(item, Path):
-        return dataclasses.replace(item, host=other.host)
-    return dataclasses.replace(item, path=item.path and dataclasses.replace(item.path, host=other.path.host))
-
-
-def associations_option(question):
-    """The parameter of a traversal that names the class of the association."""
-    return "AssocClass" if question.operation in ("ain", "ai") else "ResultClass"
-
-
-def references_of(path):
-    return [key for key in path.keys.values() if isinstance(key, Path)]
-
-
-def without_list(question):
-    options = {name: value for name, value in question.options.items() if name != "PropertyList"}
-    return dataclasses.replace(question, options=options)
-
-
-@differs("pegasus", reason="Every reference and every path within has the host.")
-def hosts_everywhere(question, ask, schema):
-    answer = ask(question)
-    full = with_paths(answer, lambda path: dataclasses.replace(path, host=path.host or platform.node()))
-    return dataclasses.replace(answer, items=tuple(map(with_host_of, full.items, answer.items)))
-
-
-KEYS = {
-    COMPUTER_SYSTEM: ["CreationClassName", "Name"],
-    GLIMMARK: ["CreationClassName", "DeviceID", "SystemCreationClassName", "SystemName"],
-}
-
-
-@differs("pegasus", reason="Keys that a path in an answer lacks are filled with empty text.")
-def filled_keys(question, ask, schema):
-    def fill(path):
-        return dataclasses.replace(path, keys={**dict.fromkeys(KEYS.get(path.class_name, []), ""), **path.keys})
-
-    return with_paths(ask(question), fill)
-
-
-@differs("pegasus", reason="Keys that a property list does not name are left out of instances.")
-def keys_left_out(question, ask, schema):
-    return literal_lists(question, ask, schema)
-
-
-@differs("sfcb", reason="A path is made of its instance: of an association it lacks the keys that a property list does not name, "
-                        "and GetInstance does not find it.")
+@differs("sfcb", reason="Element capabilities lose keys that a property list does not name; GetInstance finds none.")
 def paths_of_lists(question, ask, schema):
     names = names_of(question)
     answer = ask(question)
@@ -194,21 +120,12 @@ SFCB_TEXTS = {
 }
 
 
-@differs("sfcb", reason="The broker has texts of its own for errors that it finds itself, and for those without a text.")
+@differs("sfcb", reason="Errors that the broker finds itself, and those without a text, have texts of its own.")
 def texts_of_sfcb(question, ask, schema):
     answer = ask(question)
     if answer.message and answer.code not in (3, 5):
         return answer
     return dataclasses.replace(answer, message=SFCB_TEXTS.get(answer.code, answer.message))
-
-
-# --- What is asked of the providers ---
-
-@differs("sfcb", "pegasus", reason="A superclass of the schema is enumerated, which cimhost does not know.")
-def superclasses(question, ask, schema):
-    if question.operation not in ("ein", "ei"):
-        return ask(question)
-    return ask(dataclasses.replace(question, target=SUPERCLASSES.get(question.target, question.target)))
 
 
 @differs("sfcb", reason="An empty property list is none: all properties come.")
@@ -258,7 +175,36 @@ def cut(text):
     return text.strip(" \t\r\n" + "".join(each for each in text if ord(each) > 0x7F))
 
 
-@differs("pegasus", reason="A traversal is asked of those associations of which the object can be an end, each with its class.")
+# --- OpenPegasus ---
+
+
+@differs("pegasus", reason="Every reference and every path within has the host.")
+def hosts_everywhere(question, ask, schema):
+    answer = ask(question)
+    full = with_paths(answer, lambda path: dataclasses.replace(path, host=path.host or platform.node()))
+    return dataclasses.replace(answer, items=tuple(map(with_host_of, full.items, answer.items)))
+
+
+KEYS = {
+    COMPUTER_SYSTEM: ["CreationClassName", "Name"],
+    GLIMMARK: ["CreationClassName", "DeviceID", "SystemCreationClassName", "SystemName"],
+}
+
+
+@differs("pegasus", reason="Keys that a path in an answer lacks are filled with empty text.")
+def filled_keys(question, ask, schema):
+    def fill(path):
+        return dataclasses.replace(path, keys={**dict.fromkeys(KEYS.get(path.class_name, []), ""), **path.keys})
+
+    return with_paths(ask(question), fill)
+
+
+@differs("pegasus", reason="Keys that a property list does not name are left out of instances.")
+def keys_left_out(question, ask, schema):
+    return with_properties(ask(question), names_of(question))
+
+
+@differs("pegasus", reason="A traversal asks the associations of which the object can be an end, each with its class.")
 def fitting_associations(question, ask, schema):
     if question.operation not in TRAVERSALS:
         return ask(question)
@@ -269,6 +215,10 @@ def fitting_associations(question, ask, schema):
     answers = [ask(dataclasses.replace(question, options={**question.options, option: each})) for each in fitting]
     errors = [answer for answer in answers if answer.code]
     return errors[0] if errors else Answer(0, "", tuple(item for answer in answers for item in answer.items))
+
+
+# What the association's class says of an end where it says less than what is served.
+DECLARED = {COMPUTER_SYSTEM: "CIM_ComputerSystem"}
 
 
 @differs("pegasus", reason="A traversal from a path without keys is one of classes too: the far class comes first.")
@@ -285,10 +235,6 @@ def classes_too(question, ask, schema):
     return dataclasses.replace(answer, items=(item, *answer.items))
 
 
-# What the association's class says of an end where it says less than what is served.
-DECLARED = {COMPUTER_SYSTEM: "CIM_ComputerSystem"}
-
-
 @differs("pegasus", reason="A class that is not in the namespace is an error, wherever it is named.")
 def unknown_classes(question, ask, schema):
     if question.operation in TRAVERSALS:
@@ -300,6 +246,10 @@ def unknown_classes(question, ask, schema):
     elif question.operation == "gi" and NO_CLASS in [key.class_name for key in references_of(question.target)]:
         return Answer(5, NO_CLASS)
     return ask(question)
+
+
+def references_of(path):
+    return [key for key in path.keys.values() if isinstance(key, Path)]
 
 
 @differs("pegasus", reason="Keys that are missing are filled with empty text: nothing is found.")
@@ -318,16 +268,6 @@ def malformed_references(question, ask, schema):
     return ask(question)
 
 
-@differs("pegasus", reason="The texts of errors begin with the name of the code; those of the broker's own name what is wrong.")
-def texts_of_pegasus(question, ask, schema):
-    answer = ask(question)
-    if not answer.code:
-        return answer
-    texts = {3: question.namespace, 5: NO_CLASS}
-    text = texts.get(answer.code, answer.message)
-    return dataclasses.replace(answer, message=PEGASUS_NAMES[answer.code] + (f": {text}" if text else ""))
-
-
 PEGASUS_NAMES = {
     1: "CIM_ERR_FAILED",
     3: "CIM_ERR_INVALID_NAMESPACE",
@@ -336,3 +276,13 @@ PEGASUS_NAMES = {
     6: "CIM_ERR_NOT_FOUND",
     7: "CIM_ERR_NOT_SUPPORTED",
 }
+
+
+@differs("pegasus", reason="Texts of errors begin with the name of the code; the broker's own name what is wrong.")
+def texts_of_pegasus(question, ask, schema):
+    answer = ask(question)
+    if not answer.code:
+        return answer
+    texts = {3: question.namespace, 5: NO_CLASS}
+    text = texts.get(answer.code, answer.message)
+    return dataclasses.replace(answer, message=PEGASUS_NAMES[answer.code] + (f": {text}" if text else ""))

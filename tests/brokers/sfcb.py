@@ -1,8 +1,8 @@
 """SFCB, where it is installed, with its state in a folder of this run.
 
-The installation's folder for state and its configuration are covered by files of this run in its own mount namespace, so
-that the broker's tools and glimmark-register need no option to find them; System V semaphores are this run's by its own
-IPC namespace.
+The installation's configuration and its folder for state are covered by files of this run in its own mount namespace,
+so that the broker's tools and glimmark-register need no option to find them; System V semaphores are this run's by its
+own IPC namespace.
 """
 
 import os
