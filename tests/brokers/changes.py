@@ -40,30 +40,7 @@ def with_texts(path, change):
     return dataclasses.replace(path, keys={name: inside(value) for name, value in path.keys.items()})
 
 
-def with_host_of(item, other):
-    """An item with the host that another item's own path has."""
-    if isinstance(item, Path):
-        return dataclasses.replace(item, host=other.host)
-    return dataclasses.replace(item, path=item.path and dataclasses.replace(item.path, host=other.path.host))
-
-
 def names_of(question):
     """The names of the property list in small letters, as case does not tell names apart; None if there is no list."""
     names = question.options.get("PropertyList")
     return None if names is None else [name.lower() for name in names]
-
-
-def with_properties(answer, names):
-    """An answer whose instances have only properties of these names, in small letters; None for all."""
-
-    def reduce(instance):
-        kept = {name: each for name, each in instance.properties.items() if name.lower() in names}
-        return dataclasses.replace(instance, properties=kept)
-
-    return answer if names is None else with_instances(answer, reduce)
-
-
-def without_list(question):
-    """A question without its property list."""
-    options = {name: value for name, value in question.options.items() if name != "PropertyList"}
-    return dataclasses.replace(question, options=options)

@@ -105,8 +105,9 @@ class KnownDifferences(unittest.TestCase):
     def test_unset_properties_come_as_the_class_has_them(self):
         declared = {"Name": Property("string", None), "EnabledState": Property("uint16", 5)}
         schema = Schema(lambda _: answer(Instance(GLIMMARK, None, declared)))
-        found = differences.unset_properties(QUESTION, lambda _: answer(LED), schema).items[0].properties
-        self.assertEqual(found, {**LED.properties, "EnabledState": Property("uint16", 5)})
+        completed = differences.with_unset_properties(answer(LED), None, schema)
+        self.assertEqual(completed.items[0].properties, {**LED.properties, "EnabledState": Property("uint16", 5)})
+        self.assertEqual(differences.with_unset_properties(answer(LED), ["caption"], schema), answer(LED))
 
 
 class Messages(unittest.TestCase):

@@ -8,8 +8,8 @@ import dataclasses
 import platform
 import typing
 
-from changes import names_of, with_host_of, with_instances, with_paths, with_properties, with_texts, without_list
-from cim import COMPUTER_SYSTEM, ELEMENT_CAPABILITIES, GLIMMARK, Answer, Instance, Path, Question
+from changes import names_of, with_instances, with_paths, with_texts
+from cim import COMPUTER_SYSTEM, GLIMMARK, Answer, Instance, Path, Question
 from questions import ENDS, NO_CLASS, SUPERCLASSES
 
 # In the order in which the entries change an answer. Of each broker, those that change what is asked come last, so that
@@ -56,20 +56,18 @@ def associations_option(question):
     return "AssocClass" if question.operation in ("ain", "ai") else "ResultClass"
 
 
-# --- Both ---
-
-
-@differs("sfcb", "pegasus",
-         reason="Properties that the provider does not set come as null, or with the default of the class.")
-def unset_properties(question, ask, schema):
-    names = names_of(question)
+def with_unset_properties(answer, names, schema):
+    """An answer with the other properties of the classes, of these names in small letters; None for all."""
 
     def complete(instance):
         declared = schema.properties(instance.class_name).items()
         added = {name: each for name, each in declared if names is None or name.lower() in names}
         return dataclasses.replace(instance, properties={**added, **instance.properties})
 
-    return with_instances(ask(question), complete)
+    return with_instances(answer, complete)
+
+
+# --- Both ---
 
 
 @differs("sfcb", "pegasus", reason="A superclass of the schema is enumerated, which cimhost does not know.")
@@ -82,34 +80,11 @@ def superclasses(question, ask, schema):
 # --- SFCB ---
 
 
-@differs("sfcb", reason="A property list is taken literally: keys that it does not name are missing.")
-def literal_lists(question, ask, schema):
-    return with_properties(ask(question), names_of(question))
-
-
-@differs("sfcb", reason="References come without the host.")
-def references_without_host(question, ask, schema):
-    answer = ask(question)
-    bare = with_paths(answer, lambda path: dataclasses.replace(path, host=None))
-    return dataclasses.replace(answer, items=tuple(map(with_host_of, bare.items, answer.items)))
-
-
-@differs("sfcb", reason="Element capabilities lose keys that a property list does not name; GetInstance finds none.")
-def paths_of_lists(question, ask, schema):
-    names = names_of(question)
-    answer = ask(question)
-    if names is None or answer.code:
-        return answer
-
-    def reduce(instance):
-        if instance.class_name != ELEMENT_CAPABILITIES or instance.path is None:
-            return instance
-        kept = {name: key for name, key in instance.path.keys.items() if name.lower() in names}
-        return dataclasses.replace(instance, path=dataclasses.replace(instance.path, keys=kept))
-
-    if question.operation == "gi" and question.target.class_name == ELEMENT_CAPABILITIES:
-        return answer if {name.lower() for name in ENDS[ELEMENT_CAPABILITIES]} <= set(names) else Answer(6)
-    return with_instances(answer, reduce)
+@differs("sfcb", reason="Properties that the provider does not set come as null, or with the default of the class.")
+def unset_properties_of_sfcb(question, ask, schema):
+    # No list is applied to references, and an empty one is none.
+    names = None if question.operation == "ri" else names_of(question) or None
+    return with_unset_properties(ask(question), names, schema)
 
 
 SFCB_TEXTS = {
@@ -126,16 +101,6 @@ def texts_of_sfcb(question, ask, schema):
     if answer.message and answer.code not in (3, 5):
         return answer
     return dataclasses.replace(answer, message=SFCB_TEXTS.get(answer.code, answer.message))
-
-
-@differs("sfcb", reason="An empty property list is none: all properties come.")
-def empty_lists(question, ask, schema):
-    return ask(without_list(question) if question.options.get("PropertyList") == [] else question)
-
-
-@differs("sfcb", reason="References come with all properties, whatever the property list.")
-def lists_of_references(question, ask, schema):
-    return ask(without_list(question) if question.operation == "ri" else question)
 
 
 @differs("sfcb", reason="A query is answered by the broker, which enumerates the class.")
@@ -178,11 +143,9 @@ def cut(text):
 # --- OpenPegasus ---
 
 
-@differs("pegasus", reason="Every reference and every path within has the host.")
-def hosts_everywhere(question, ask, schema):
-    answer = ask(question)
-    full = with_paths(answer, lambda path: dataclasses.replace(path, host=path.host or platform.node()))
-    return dataclasses.replace(answer, items=tuple(map(with_host_of, full.items, answer.items)))
+@differs("pegasus", reason="Properties that the provider does not set come as null, or with the default of the class.")
+def unset_properties_of_pegasus(question, ask, schema):
+    return with_unset_properties(ask(question), names_of(question), schema)
 
 
 KEYS = {
@@ -197,11 +160,6 @@ def filled_keys(question, ask, schema):
         return dataclasses.replace(path, keys={**dict.fromkeys(KEYS.get(path.class_name, []), ""), **path.keys})
 
     return with_paths(ask(question), fill)
-
-
-@differs("pegasus", reason="Keys that a property list does not name are left out of instances.")
-def keys_left_out(question, ask, schema):
-    return with_properties(ask(question), names_of(question))
 
 
 @differs("pegasus", reason="A traversal asks the associations of which the object can be an end, each with its class.")
