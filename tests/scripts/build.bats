@@ -90,6 +90,13 @@ END
     [ "${lines[-1]}" = "3 passed, 0 failed" ]
 }
 
+@test "the name of a program chooses all of it" {
+    echo '[ -z "${GTEST_FILTER-}" ] || exit 1; echo "[  PASSED  ] 3 tests."' >"$project/program"
+    "$project/scripts/build" release
+    run -0 "$project/scripts/run-tests" release some-
+    [ "${lines[-1]}" = "6 passed, 0 failed" ]
+}
+
 @test "a name that no test has fails" {
     echo 'echo "[  PASSED  ] 0 tests."' >"$project/program"
     "$project/scripts/build" release
