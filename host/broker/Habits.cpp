@@ -58,10 +58,15 @@ void shape(const Habits* habits, cim::Answer& answer, const OperationRequest& qu
     forEachOfKind<HabitInAnswer>(habits, answer, question);
 }
 
-const FunctionTables& servedByThisBroker()
+const FunctionTables& plainServices()
 {
     static const FunctionTables tables = servedTables();
     return tables;
+}
+
+void haveNoMemoryServices(FunctionTables& /*tables*/, CMPIBroker& broker)
+{
+    broker.mft = nullptr;
 }
 
 CMPIData withState(CMPIData data, unsigned int state)

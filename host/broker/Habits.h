@@ -1,6 +1,6 @@
 /// \file
-/// What real brokers do otherwise than this one, as far as a provider or its clients can tell: for each of them a
-/// table of observed facts. A new one is a row of its broker's table, and at most one function.
+/// What real brokers do otherwise than this one, as far as a provider or its clients can tell: for each of
+/// them a table of observed facts. A new one is a row of its broker's table, and at most one function.
 #ifndef CIMHOST_BROKER_HABITS_H
 #define CIMHOST_BROKER_HABITS_H
 
@@ -19,7 +19,8 @@ namespace cimhost {
 /// Changes the tables that a provider calls through.
 using HabitInTables = void (*)(FunctionTables& tables, CMPIBroker& broker);
 
-/// Changes a question before a provider is asked. \param served  the class that the provider is asked as the one of
+/// Changes a question before a provider is asked.
+/// \param served  the class that the provider is asked for
 /// \throws RoutingError  the provider is not asked
 using HabitInQuestion = void (*)(OperationRequest& question, const RegisteredClass& served);
 
@@ -58,7 +59,10 @@ void shape(const Habits* habits, cim::Answer& answer, const OperationRequest& qu
 // What the tables' functions share.
 
 /// The services as this broker serves them, for a function in the place of one.
-const FunctionTables& servedByThisBroker();
+const FunctionTables& plainServices();
+
+/// A row's function.
+void haveNoMemoryServices(FunctionTables& tables, CMPIBroker& broker);
 
 /// Data with another state.
 CMPIData withState(CMPIData data, unsigned int state);

@@ -12,18 +12,8 @@ namespace pegasus {
 
 constexpr const char* pegasus2144 = "OpenPegasus 2.14.4";
 
-const FunctionTables& served()
-{
-    return servedByThisBroker();
-}
-
 /// Of data that is not there.
 constexpr unsigned int nullAndNotFound = CMPI_nullValue | CMPI_notFound;
-
-void haveNoMemoryServices(FunctionTables& /*tables*/, CMPIBroker& broker)
-{
-    broker.mft = nullptr;
-}
 
 void leaveSlotsEmpty(FunctionTables& tables, CMPIBroker& /*broker*/)
 {
@@ -40,10 +30,10 @@ CMPIData getNextAsNull(const CMPIEnumeration* enumeration, CMPIStatus* rc)
 {
     constexpr auto noMoreElements = static_cast<CMPIrc>(18); // of CMPI 2.1
     CMPIStatus status{CMPI_RC_OK, nullptr};
-    CMPIData item = served().enumeration.getNext(enumeration, &status);
+    CMPIData item = plainServices().enumeration.getNext(enumeration, &status);
     if (status.rc == CMPI_RC_ERR_NOT_FOUND) {
-        const CMPIArray* const items = served().enumeration.toArray(enumeration, nullptr);
-        item.type = served().array.getSimpleType(items, nullptr);
+        const CMPIArray* const items = plainServices().enumeration.toArray(enumeration, nullptr);
+        item.type = plainServices().array.getSimpleType(items, nullptr);
         status.rc = noMoreElements;
     }
     writeCode(rc, status.rc);
@@ -63,33 +53,33 @@ CMPIData toldAsNull(const CMPIData& data)
 
 CMPIData getKey(const CMPIObjectPath* path, const char* name, CMPIStatus* rc)
 {
-    return toldAsNull(served().objectPath.getKey(path, name, rc));
+    return toldAsNull(plainServices().objectPath.getKey(path, name, rc));
 }
 
 CMPIData getKeyAt(const CMPIObjectPath* path, CMPICount index, CMPIString** name, CMPIStatus* rc)
 {
     CMPIStatus status{CMPI_RC_OK, nullptr};
-    const CMPIData key = served().objectPath.getKeyAt(path, index, name, &status);
+    const CMPIData key = plainServices().objectPath.getKeyAt(path, index, name, &status);
     writeCode(rc, status.rc == CMPI_RC_ERR_NOT_FOUND ? CMPI_RC_ERR_NO_SUCH_PROPERTY : status.rc);
     return toldAsNull(key);
 }
 
 CMPIData getProperty(const CMPIInstance* instance, const char* name, CMPIStatus* rc)
 {
-    return toldAsNull(served().instance.getProperty(instance, name, rc));
+    return toldAsNull(plainServices().instance.getProperty(instance, name, rc));
 }
 
 CMPIData getEntry(const CMPIContext* context, const char* name, CMPIStatus* rc)
 {
     CMPIStatus status{CMPI_RC_OK, nullptr};
-    const CMPIData entry = served().context.getEntry(context, name, &status);
+    const CMPIData entry = plainServices().context.getEntry(context, name, &status);
     writeCode(rc, status.rc == CMPI_RC_ERR_NOT_FOUND ? CMPI_RC_ERR_NO_SUCH_PROPERTY : status.rc);
     return toldAsNull(entry);
 }
 
 CMPIData getElementAt(const CMPIArray* array, CMPICount index, CMPIStatus* rc)
 {
-    const CMPIData element = served().array.getElementAt(array, index, rc);
+    const CMPIData element = plainServices().array.getElementAt(array, index, rc);
     return (element.state & CMPI_notFound) != 0 ? withState(element, CMPI_nullValue) : element;
 }
 
@@ -104,7 +94,7 @@ void tellWhatIsNotThereAsNull(FunctionTables& tables, CMPIBroker& /*broker*/)
 
 CMPIStatus setKeyListAlone(const CMPIInstance* instance, const char** /*properties*/, const char** keys)
 {
-    return served().instance.setPropertyFilter(instance, nullptr, keys);
+    return plainServices().instance.setPropertyFilter(instance, nullptr, keys);
 }
 
 void filterAnswersAlone(FunctionTables& tables, CMPIBroker& /*broker*/)

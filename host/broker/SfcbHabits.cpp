@@ -14,11 +14,6 @@ namespace sfcb {
 
 constexpr const char* sfcb1311 = "SFCB 1.3.11";
 
-const FunctionTables& served()
-{
-    return servedByThisBroker();
-}
-
 void tellOldVersions(FunctionTables& tables, CMPIBroker& /*broker*/)
 {
     tables.broker.brokerVersion = 0;
@@ -28,11 +23,6 @@ void tellOldVersions(FunctionTables& tables, CMPIBroker& /*broker*/)
           &tables.instance.ftVersion, &tables.objectPath.ftVersion, &tables.args.ftVersion,
           &tables.dateTime.ftVersion})
         *version = 1;
-}
-
-void haveNoMemoryServices(FunctionTables& /*tables*/, CMPIBroker& broker)
-{
-    broker.mft = nullptr;
 }
 
 void leaveSlotsEmpty(FunctionTables& tables, CMPIBroker& /*broker*/)
@@ -81,10 +71,10 @@ CMPIData badValue(CMPIType type, CMPIStatus* rc)
 CMPIData getNextEvenBeyond(const CMPIEnumeration* enumeration, CMPIStatus* rc)
 {
     CMPIStatus status{CMPI_RC_OK, nullptr};
-    const CMPIData item = served().enumeration.getNext(enumeration, &status);
+    const CMPIData item = plainServices().enumeration.getNext(enumeration, &status);
     if (status.rc == CMPI_RC_ERR_NOT_FOUND) {
-        const CMPIArray* const items = served().enumeration.toArray(enumeration, nullptr);
-        return badValue(served().array.getSimpleType(items, nullptr), rc);
+        const CMPIArray* const items = plainServices().enumeration.toArray(enumeration, nullptr);
+        return badValue(plainServices().array.getSimpleType(items, nullptr), rc);
     }
     writeCode(rc, status.rc);
     return item;
@@ -93,9 +83,9 @@ CMPIData getNextEvenBeyond(const CMPIEnumeration* enumeration, CMPIStatus* rc)
 CMPIData getElementEvenBeyond(const CMPIArray* array, CMPICount index, CMPIStatus* rc)
 {
     CMPIStatus status{CMPI_RC_OK, nullptr};
-    const CMPIData element = served().array.getElementAt(array, index, &status);
+    const CMPIData element = plainServices().array.getElementAt(array, index, &status);
     if (status.rc == CMPI_RC_ERR_NO_SUCH_PROPERTY)
-        return badValue(served().array.getSimpleType(array, nullptr), rc);
+        return badValue(plainServices().array.getSimpleType(array, nullptr), rc);
     writeCode(rc, status.rc);
     return element;
 }
@@ -108,13 +98,13 @@ void goBeyondTheEnd(FunctionTables& tables, CMPIBroker& /*broker*/)
 
 CMPIData getKeyAsValue(const CMPIObjectPath* path, const char* name, CMPIStatus* rc)
 {
-    const CMPIData key = served().objectPath.getKey(path, name, rc);
+    const CMPIData key = plainServices().objectPath.getKey(path, name, rc);
     return withState(key, key.state & ~static_cast<unsigned int>(CMPI_keyValue));
 }
 
 CMPIData getKeyAtAsValue(const CMPIObjectPath* path, CMPICount index, CMPIString** name, CMPIStatus* rc)
 {
-    const CMPIData key = served().objectPath.getKeyAt(path, index, name, rc);
+    const CMPIData key = plainServices().objectPath.getKeyAt(path, index, name, rc);
     return withState(key, key.state & ~static_cast<unsigned int>(CMPI_keyValue));
 }
 
@@ -127,7 +117,7 @@ void tellKeysAsValues(FunctionTables& tables, CMPIBroker& /*broker*/)
 CMPIData getPropertyOrNotFound(const CMPIInstance* instance, const char* name, CMPIStatus* rc)
 {
     CMPIStatus status{CMPI_RC_OK, nullptr};
-    const CMPIData property = served().instance.getProperty(instance, name, &status);
+    const CMPIData property = plainServices().instance.getProperty(instance, name, &status);
     writeCode(rc, status.rc == CMPI_RC_ERR_NO_SUCH_PROPERTY ? CMPI_RC_ERR_NOT_FOUND : status.rc);
     return property;
 }
@@ -140,7 +130,7 @@ void missPropertiesAsKeys(FunctionTables& tables, CMPIBroker& /*broker*/)
 CMPIData getEntryOrNull(const CMPIContext* context, const char* name, CMPIStatus* rc)
 {
     CMPIStatus status{CMPI_RC_OK, nullptr};
-    const CMPIData entry = served().context.getEntry(context, name, &status);
+    const CMPIData entry = plainServices().context.getEntry(context, name, &status);
     if (status.rc != CMPI_RC_ERR_NOT_FOUND) {
         writeCode(rc, status.rc);
         return entry;
@@ -167,18 +157,18 @@ CMPIStatus forgetHidden(const CMPIInstance* instance, const CMPIStatus& status)
 CMPIStatus setPropertyThatPasses(const CMPIInstance* instance, const char* name, const CMPIValue* value,
                                  CMPIType type)
 {
-    return forgetHidden(instance, served().instance.setProperty(instance, name, value, type));
+    return forgetHidden(instance, plainServices().instance.setProperty(instance, name, value, type));
 }
 
 CMPIStatus setFilterLiterally(const CMPIInstance* instance, const char** properties, const char** keys)
 {
-    return forgetHidden(instance, served().instance.setPropertyFilter(instance, properties, keys));
+    return forgetHidden(instance, plainServices().instance.setPropertyFilter(instance, properties, keys));
 }
 
 /// Leaves out the properties that the provider's filter does not ask for, keys too: they are in the path.
 CMPIStatus returnWhatTheFilterAsksFor(const CMPIResult* result, const CMPIInstance* instance)
 {
-    const CMPIStatus status = served().result.returnInstance(result, instance);
+    const CMPIStatus status = plainServices().result.returnInstance(result, instance);
     if (status.rc != CMPI_RC_OK)
         return status;
     return perform("CMPIResultFT.returnInstance", [&](Call& call) {

@@ -22,11 +22,13 @@ protected:
         request.reset(); // each question is a request of its own
     }
 
-    cimhost::Broker withHabits{computerSystemRegistration(), {providerDirectory()}, {}, std::get<0>(GetParam())};
+    cimhost::Broker withHabits{
+        computerSystemRegistration(), {providerDirectory()}, {}, std::get<0>(GetParam())};
 };
 
 INSTANTIATE_TEST_SUITE_P(All, Habits,
-                         ::testing::Combine(::testing::Values(&cimhost::sfcbHabits(), &cimhost::pegasusHabits()),
+                         ::testing::Combine(::testing::Values(&cimhost::sfcbHabits(),
+                                                              &cimhost::pegasusHabits()),
                                             ::testing::ValuesIn(allOperations())),
                          [](const auto& suite) {
                              return std::string(std::get<0>(suite.param)->name) + "_" +

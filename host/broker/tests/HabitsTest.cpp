@@ -13,7 +13,6 @@ namespace cimhost {
 namespace {
 
 using testing::Contains;
-using testing::Each;
 using testing::ElementsAre;
 using testing::EndsWith;
 using testing::IsEmpty;
@@ -47,8 +46,7 @@ protected:
 
     CMPIInstance* newThing(const char** properties, const char** keys)
     {
-        CMPIInstance* const instance =
-            mb()->eft->newInstance(mb(), newPath("TEST_Association"), nullptr);
+        CMPIInstance* const instance = mb()->eft->newInstance(mb(), newPath("TEST_Association"), nullptr);
         EXPECT_EQ(instance->ft->setPropertyFilter(instance, properties, keys), CMPI_RC_OK);
         return instance;
     }
@@ -72,6 +70,7 @@ protected:
     static std::vector<std::string> namesOf(const std::vector<Named>& list)
     {
         std::vector<std::string> names;
+        names.reserve(list.size());
         for (const Named& named : list)
             names.push_back(named.name);
         return names;
@@ -335,7 +334,8 @@ TEST_F(Pegasus, FiltersAnswersAlone)
 TEST_F(Pegasus, AnswersWhatWasAskedForAlone)
 {
     const auto propertiesOf = [&](const cim::PropertyList& wanted) {
-        return namesOf(broker_.enumerateInstances(classPath("TEST_Thing"), wanted).instances.at(0).properties);
+        return namesOf(
+            broker_.enumerateInstances(classPath("TEST_Thing"), wanted).instances.at(0).properties);
     };
     EXPECT_THAT(propertiesOf({}), ElementsAre("Name", "Size"));
     EXPECT_THAT(propertiesOf({{"size"}}), ElementsAre("Size"));
@@ -373,7 +373,8 @@ TEST(PegasusRequestTest, AsksAProviderForEachOfItsAssociations)
     Registration registration = traversableThings();
     registration.classes.push_back(registration.classes[0]);
     registration.classes[1].className = "TEST_Other";
-    EXPECT_THAT(Broker(registration, {SAMPLE_DIRECTORY}).associatorNames(thingPath("one"), {}).paths, SizeIs(1));
+    EXPECT_THAT(Broker(registration, {SAMPLE_DIRECTORY}).associatorNames(thingPath("one"), {}).paths,
+                SizeIs(1));
     EXPECT_THAT(Broker(registration, {SAMPLE_DIRECTORY}, {}, &pegasusHabits())
                     .associatorNames(thingPath("one"), {})
                     .paths,

@@ -39,8 +39,9 @@ std::vector<SampleIndicator> indicatorsOf(const std::string& sample)
             indicator.alarmState = value;
         indicators.push_back(indicator);
     }
-    const bool allAreDescribed = std::none_of(indicators.begin(), indicators.end(),
-                                              [](const SampleIndicator& each) { return each.description.empty(); });
+    const bool allAreDescribed =
+        std::none_of(indicators.begin(), indicators.end(),
+                     [](const SampleIndicator& each) { return each.description.empty(); });
     EXPECT_EQ(RecordingLog::take().size(), allAreDescribed ? 0U : 1U);
     return indicators;
 }
