@@ -8,9 +8,11 @@ import sys
 import tempfile
 import threading
 import unittest
+import unittest.mock
 
 import differences
 import endurance
+import pegasus
 from changes import with_instances
 from cim import COMPUTER_SYSTEM, GLIMMARK, Answer, Instance, Path, Property, Question
 from cimxml import message, read_answer
@@ -46,6 +48,21 @@ def ask_without_names(question, ask, _):
 
 
 NAMELESS = Difference(("sfcb",), "no names", ask_without_names)
+
+
+class Finding(unittest.TestCase):
+    def test_a_server_on_path_that_is_laid_out_otherwise_is_not_tried(self):
+        with tempfile.TemporaryDirectory() as folder:
+            home = pathlib.Path(folder).resolve() / "pegasus"
+            (home / "bin").mkdir(parents=True)
+            daemon = home / "bin/cimserver"
+            daemon.touch(mode=0o755)
+            with unittest.mock.patch.dict(os.environ, {"PATH": str(daemon.parent)}):
+                os.environ.pop("PEGASUS_HOME", None)
+                self.assertIsNone(pegasus.find())
+                for name in ["lib", "repository"]:
+                    (home / name).mkdir()
+                self.assertEqual(pegasus.find(), home)
 
 
 class Comparing(unittest.TestCase):

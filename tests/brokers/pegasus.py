@@ -16,11 +16,12 @@ MODULE = "GlimmarkProviderModule"
 
 
 def find():
-    """The folder with bin, lib and repository of OpenPegasus, or None."""
+    """The folder with bin, lib and repository of OpenPegasus, or None. One on PATH that is laid out otherwise is none."""
     if "PEGASUS_HOME" in os.environ:
         return pathlib.Path(os.environ["PEGASUS_HOME"])
     daemon = shutil.which("cimserver")
-    return pathlib.Path(daemon).resolve().parents[1] if daemon else None
+    home = pathlib.Path(daemon).resolve().parents[1] if daemon else None
+    return home if home and all((home / name).is_dir() for name in ["bin", "lib", "repository"]) else None
 
 
 class Pegasus(Broker):
