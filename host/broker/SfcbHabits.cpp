@@ -2,6 +2,7 @@
 #include "broker/Habits.h"
 #include "broker/Names.h"
 #include "broker/Router.h"
+#include "broker/Values.h"
 
 #include <algorithm>
 #include <memory>
@@ -65,7 +66,7 @@ void writeNoTrace(FunctionTables& tables, CMPIBroker& /*broker*/)
 CMPIData badValue(CMPIType type, CMPIStatus* rc)
 {
     writeCode(rc, CMPI_RC_OK);
-    return {type, CMPI_badValue, {}};
+    return emptyData(type, CMPI_badValue);
 }
 
 CMPIData getNextEvenBeyond(const CMPIEnumeration* enumeration, CMPIStatus* rc)

@@ -182,7 +182,7 @@ cim::Value takeValue(Call& call, const CMPIValue* value, CMPIType type, const ch
 
 CMPIData giveScalar(Core& core, const Scalar& scalar, CMPIType type)
 {
-    CMPIData data{type, CMPI_goodValue, {}};
+    CMPIData data = emptyData(type, CMPI_goodValue);
     if (std::holds_alternative<std::monostate>(scalar)) {
         data.state = CMPI_nullValue;
         return data;
@@ -245,7 +245,7 @@ CMPIData giveScalar(Core& core, const Scalar& scalar, CMPIType type)
 
 CMPIData giveValue(Core& core, const cim::Value& value, CMPIValueState state)
 {
-    CMPIData data{value.type, CMPI_nullValue, {}};
+    CMPIData data = emptyData(value.type, CMPI_nullValue);
     if (!value.isNull && (value.type & CMPI_ARRAY) != 0) {
         data.state = CMPI_goodValue;
         data.value.array =

@@ -7,6 +7,7 @@
 #include "broker/Core.h"
 #include "cim/Model.h"
 
+#include <cstring>
 #include <string>
 
 namespace cimhost {
@@ -34,10 +35,21 @@ CMPIData giveValue(Core& core, const cim::Value& value, CMPIValueState state = C
 /// The same for one element.
 CMPIData giveScalar(Core& core, const cim::Value::Scalar& scalar, CMPIType type);
 
+/// Data of a type without a value: no bit of it is set. Braces would set the union's first member alone, and
+/// leave a pointer of the other bits to whoever takes data for what its type says.
+inline CMPIData emptyData(CMPIType type, CMPIValueState state)
+{
+    CMPIData data;
+    std::memset(&data, 0, sizeof data);
+    data.type = type;
+    data.state = state;
+    return data;
+}
+
 /// The data of something that is not there.
 inline CMPIData noData(CMPIValueState state = CMPI_notFound)
 {
-    return {CMPI_null, state, {}};
+    return emptyData(CMPI_null, state);
 }
 
 } // namespace cimhost

@@ -602,7 +602,7 @@ TEST(UnreadableObjectPaths, pathsWithUnreadableValuesEqualNothing)
     for (const int type : {CMPI_string, CMPI_chars, CMPI_dateTime})
         EXPECT_FALSE(equalsItselfWith([type](Path& path) {
             path.keys.back().data.type = static_cast<CMPIType>(type);
-            path.keys.back().data.value = {};
+            path.keys.back().data.value.string = nullptr;
         })) << type;
 }
 
