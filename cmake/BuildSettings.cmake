@@ -29,6 +29,11 @@ target_compile_options(
               -Wlogical-op
               -Wuseless-cast>)
 
+# Sources that are compiled together look like headers to this check, which is about headers.
+if(CMAKE_UNITY_BUILD)
+    target_compile_options(glimmark_settings INTERFACE $<$<CXX_COMPILER_ID:GNU>:-Wno-subobject-linkage>)
+endif()
+
 # The compiler clears its memory up less often: a twentieth of its time for some hundred megabytes.
 target_compile_options(glimmark_settings INTERFACE $<$<CXX_COMPILER_ID:GNU>:--param=ggc-min-heapsize=1000000>)
 

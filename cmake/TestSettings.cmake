@@ -20,7 +20,7 @@ endif()
 # Where the files of a program are compiled together, they see each other's names. The preset asan compiles each on its
 # own, and holds what is not held here.
 if(CMAKE_UNITY_BUILD)
-    target_compile_options(glimmark_compiled_together INTERFACE -Wno-shadow -Wno-subobject-linkage)
+    target_compile_options(glimmark_compiled_together INTERFACE -Wno-shadow)
 endif()
 
 # The test framework's headers, compiled once for all programs of tests. All of these are compiled as libraries are
