@@ -7,9 +7,11 @@ import pathlib
 import sys
 import tempfile
 import threading
+import time
 import unittest
 import unittest.mock
 
+import cimxml
 import differences
 import endurance
 import pegasus
@@ -199,6 +201,19 @@ class Pressure(unittest.TestCase):
             expected = [(QUESTION, Answer(7))]
             self.assertEqual(len(ask_at_once(server.server_port, expected, 40, 4)), 1)
             self.assertEqual(ask_at_once(server.server_port, expected, 40, 4), [])
+            server.shutdown()
+
+    def test_a_connection_that_was_idle_is_opened_again(self):
+        class Closing(OneWrongAnswer):
+            timeout = 0.2
+
+        with http.server.ThreadingHTTPServer(("127.0.0.1", 0), Closing) as server:
+            threading.Thread(target=server.serve_forever, daemon=True).start()
+            with cimxml.Client(server.server_port) as client:
+                client.ask(QUESTION)
+                time.sleep(0.5)
+                client.used -= 2 * cimxml.IDLE
+                client.ask(QUESTION)
             server.shutdown()
 
     def test_a_server_that_is_not_there_is_found(self):

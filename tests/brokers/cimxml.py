@@ -1,6 +1,7 @@
 """A CIM client: questions to a server as CIM-XML over HTTP (DMTF DSP0200 and DSP0201), and its answers."""
 
 import http.client
+import time
 import xml.etree.ElementTree as ET
 
 from cim import Answer, Instance, Path, Property, Question
@@ -34,11 +35,17 @@ ALWAYS = {
 CLASS_NAMES = {"ClassName", "AssocClass", "ResultClass"}
 
 
+# Servers close connections that are idle for longer than this.
+IDLE = 5
+
+
 class Client:
-    """A kept connection to a server, opened again where the server says that it closed it; for one thread."""
+    """A kept connection to a server, opened again where the server says that it closed it, and where it may have closed it
+    because nothing was asked for long; for one thread."""
 
     def __init__(self, port, timeout=120):
         self.connection = http.client.HTTPConnection("127.0.0.1", port, timeout=timeout)
+        self.used = time.monotonic()
 
     def __enter__(self):
         return self
@@ -59,9 +66,12 @@ class Client:
             "CIMMethod": method,
             "CIMObject": question.namespace,
         }
+        if time.monotonic() - self.used > IDLE:
+            self.connection.close()
         self.connection.request("POST", "/cimom", message(question), headers)
         response = self.connection.getresponse()
         body = response.read()
+        self.used = time.monotonic()
         if response.status != 200:
             raise RuntimeError(f"{question}: HTTP status {response.status} {response.reason}")
         return body
