@@ -7,7 +7,7 @@
 #include "Indicators.h"
 
 #include "broker/Broker.h"
-#include "support/Operations.h"
+#include "testing/Operations.h"
 
 #include <cstddef>
 #include <string>
@@ -23,7 +23,7 @@ struct Task
     cimhost::cim::ObjectPath path;
 };
 
-/// Every operation of tests/support/Operations.h that has a floor.
+/// Every operation of testing/Operations.h that has a floor.
 std::vector<Task> allTasks();
 
 enum class Side

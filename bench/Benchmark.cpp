@@ -12,7 +12,7 @@
 #include "Pairs.h"
 #include "Trace.h"
 
-#include "support/Allocations.h"
+#include "testing/Allocations.h"
 
 #include <algorithm>
 #include <cstdio>

@@ -1,6 +1,6 @@
 // MadeInventory's nodes for the stand-in of the instrumentation library: as the file that it reads.
 
-#include "MadeInventory.h"
+#include "testing/MadeInventory.h"
 
 #include <cstdlib>
 #include <fstream>

@@ -27,7 +27,7 @@ struct FloorRequest
 
 using FloorOperation = void (*)(const FloorRequest& request);
 
-/// \param name  that of an operation of tests/support/Operations.h
+/// \param name  that of an operation of testing/Operations.h
 /// \return null for one without a floor: those that are asked for nothing there is have none
 FloorOperation floorOf(const std::string& name);
 

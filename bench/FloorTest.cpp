@@ -4,8 +4,8 @@
 #include "Bed.h"
 #include "RecordedCalls.h"
 
-#include "support/Allocations.h"
-#include "support/RecordingBroker.h"
+#include "testing/Allocations.h"
+#include "testing/RecordingBroker.h"
 
 #include <cstddef>
 #include <string>

@@ -3,7 +3,7 @@
 #ifndef BENCH_INDICATORS_H
 #define BENCH_INDICATORS_H
 
-#include "MadeInventory.h"
+#include "testing/MadeInventory.h"
 
 #include <cstddef>
 #include <cstdint>
@@ -12,7 +12,7 @@
 
 namespace bench {
 
-/// Nodes of the inventory: one that tests/support/Operations.h calls "b:/2", the others with the texts of a
+/// Nodes of the inventory: one that testing/Operations.h calls "b:/2", the others with the texts of a
 /// large server, in an order that is not that of their identifiers, of every kind of status.
 std::vector<MadeInventory::Node> makeNodes(std::size_t count);
 

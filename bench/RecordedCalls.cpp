@@ -1,7 +1,7 @@
 #include "RecordedCalls.h"
 
-#include "MadeInventory.h"
-#include "support/Allocations.h"
+#include "testing/Allocations.h"
+#include "testing/MadeInventory.h"
 
 #include <MVLog/MVLogger.h>
 #include <MVLog/MVMessageBuffer.h>

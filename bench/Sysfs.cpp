@@ -34,7 +34,7 @@ constexpr int indicatorCount = 2400; ///< of 2000 LEDs and of 200 slots with two
 /// A tree like sysfs, for as long as the process runs.
 const std::string& largeServer()
 {
-    static const PlatformTesting::TemporaryDirectory directory;
+    static const Testing::TemporaryDirectory directory;
     static const std::string tree = [] {
         std::string made = directory.path("sys");
         const std::string command = MAKE_TREE " large " + made + " 2000 200 >/dev/null";
@@ -90,8 +90,8 @@ void readFiles(const std::vector<std::string>& files)
 
 void walkBesideReading(benchmark::State& state)
 {
-    const PlatformTesting::Environment inventory("TAVRO_INVENTORY", "sysfs");
-    const PlatformTesting::Environment root("TAVRO_SYSFS_ROOT", largeServer());
+    const Testing::Environment inventory("TAVRO_INVENTORY", "sysfs");
+    const Testing::Environment root("TAVRO_SYSFS_ROOT", largeServer());
     const std::vector<std::string> files = attributesOf(largeServer());
     bench::comparePairs(
         state, [] { return bench::secondsOf(walk); },

@@ -6,6 +6,8 @@ find_package(GTest 1.12 REQUIRED)
 add_library(glimmark_test_settings INTERFACE)
 add_library(glimmark::test-settings ALIAS glimmark_test_settings)
 add_library(glimmark_compiled_together INTERFACE)
+cmake_path(GET CMAKE_CURRENT_LIST_DIR PARENT_PATH checkout)
+target_include_directories(glimmark_test_settings INTERFACE ${checkout})
 target_link_libraries(glimmark_test_settings INTERFACE glimmark::settings glimmark_compiled_together GTest::gmock)
 
 # Optimising a test takes three times as long as compiling it and shows nothing: what it tests stays as shipped. Debug

@@ -27,10 +27,10 @@
 #include "Script.h"
 
 #include "EntryPoints.h"
-#include "MadeInventory.h"
-#include "RecordedLog.h"
-#include "support/Allocations.h"
-#include "support/RecordingBroker.h"
+#include "testing/Allocations.h"
+#include "testing/MadeInventory.h"
+#include "testing/RecordedLog.h"
+#include "testing/RecordingBroker.h"
 
 #include "broker/Broker.h"
 #include "cim/ObjectPathText.h"

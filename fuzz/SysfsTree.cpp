@@ -5,8 +5,8 @@
 // a pipe.
 
 #include "FuzzTarget.h"
-
 #include "SysfsNodeSource.h"
+#include "testing/TemporaryDirectory.h"
 
 #include <filesystem>
 #include <fstream>
@@ -25,18 +25,7 @@ constexpr int mostEntries = 40;
 class Tree
 {
 public:
-    Tree() : root_((fs::temp_directory_path() / "fuzz-sysfs-XXXXXX").string())
-    {
-        Fuzz::require(mkdtemp(root_.data()) != nullptr, "there is room for a temporary directory");
-        setenv("TAVRO_SYSFS_ROOT", root_.c_str(), 1);
-    }
-    ~Tree()
-    {
-        std::error_code error;
-        fs::remove_all(root_, error);
-    }
-    Tree(const Tree&) = delete;
-    Tree& operator=(const Tree&) = delete;
+    Tree() { setenv("TAVRO_SYSFS_ROOT", root_.path().c_str(), 1); }
 
     /// Does nothing where that cannot be made, as below a file.
     void make(char what, std::string_view name, std::string_view with) const
@@ -62,7 +51,7 @@ private:
     /// Nothing: the path would leave the tree, by itself or through a link.
     [[nodiscard]] std::optional<fs::path> within(std::string_view name) const
     {
-        fs::path path = root_;
+        fs::path path = root_.path();
         std::error_code error;
         for (const fs::path& part : fs::path(name)) {
             if (part.empty() || part == "." || part == ".." || part == "/" ||
@@ -70,12 +59,12 @@ private:
                 return std::nullopt;
             path /= part;
         }
-        if (path == root_)
+        if (path == root_.path())
             return std::nullopt;
         return path;
     }
 
-    std::string root_;
+    Testing::TemporaryDirectory root_;
 };
 
 std::string_view takeText(std::string_view& input)

@@ -1,8 +1,8 @@
 // Result lists and the list of records are counted with 16 bits. What each operation makes of inventories
 // around and beyond that limit: how many paths or instances, which status, and whether it calls returnDone.
 
-#include "support/Operations.h"
-#include "support/ProviderFixture.h"
+#include "testing/Operations.h"
+#include "testing/ProviderFixture.h"
 
 #include <algorithm>
 #include <cstddef>

@@ -1,9 +1,9 @@
 // Brokers call the providers from several threads, and make a provider again while another thread is in one
 // of its operations, and the inventory changes at any time: every answer is right and no trace line is torn.
 
-#include "support/Operations.h"
-#include "support/ProviderFixture.h"
-#include "support/SampleInventories.h"
+#include "testing/Operations.h"
+#include "testing/ProviderFixture.h"
+#include "testing/SampleInventories.h"
 
 #include <algorithm>
 #include <atomic>

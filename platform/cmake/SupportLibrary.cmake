@@ -41,7 +41,6 @@ endfunction()
 function(add_support_library_tests name)
     add_executable(${name}-tests ${ARGN})
     target_link_libraries(${name}-tests PRIVATE ${name} glimmark::test-settings GTest::gtest_main)
-    target_include_directories(${name}-tests PRIVATE ${PROJECT_SOURCE_DIR}/platform)
     glimmark_add_tests_of(${name}-tests THREADS)
 
     add_test(

@@ -20,9 +20,9 @@ namespace {
 using cimhost::cim::Answer;
 using cimhost::cim::Instance;
 using cimhost::cim::ObjectPath;
-using PlatformTesting::Environment;
 using schema::Class;
 using schema::Classes;
+using Testing::Environment;
 using testing::IsEmpty;
 using testing::Not;
 using testing::UnorderedElementsAre;

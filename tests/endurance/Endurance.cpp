@@ -1,7 +1,7 @@
 // Asks the provider library, with the support libraries that it is built with, over and over, and holds that
 // nothing adds up: memory, open descriptors, other answers. Usage: endurance REQUESTS
 
-#include "support/Operations.h"
+#include "testing/Operations.h"
 
 #include <dirent.h>
 #include <malloc.h>

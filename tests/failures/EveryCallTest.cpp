@@ -6,7 +6,7 @@
 #include "described/Providers.h"
 
 #include "broker/Habits.h"
-#include "support/SampleInventories.h"
+#include "testing/SampleInventories.h"
 
 #include <algorithm>
 #include <cstddef>

@@ -3,9 +3,9 @@
 #ifndef TESTS_FAILURES_FAILUREFIXTURE_H
 #define TESTS_FAILURES_FAILUREFIXTURE_H
 
-#include "support/Allocations.h"
-#include "support/Operations.h"
-#include "support/ProviderFixture.h"
+#include "testing/Allocations.h"
+#include "testing/Operations.h"
+#include "testing/ProviderFixture.h"
 
 #include <string>
 #include <vector>

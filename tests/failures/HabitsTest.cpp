@@ -1,8 +1,8 @@
 // Brokers differ in what the interface leaves open, and some break it: no operation answers less for that.
 
 #include "broker/Habits.h"
-#include "support/Operations.h"
-#include "support/ProviderFixture.h"
+#include "testing/Operations.h"
+#include "testing/ProviderFixture.h"
 
 #include <string>
 #include <tuple>

@@ -3,7 +3,7 @@
 #ifndef TESTS_PROPERTIES_GENERATORS_H
 #define TESTS_PROPERTIES_GENERATORS_H
 
-#include "MadeInventory.h"
+#include "testing/MadeInventory.h"
 
 #include <optional>
 #include <string>

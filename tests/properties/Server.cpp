@@ -1,6 +1,6 @@
 #include "Server.h"
 
-#include "RecordedLog.h"
+#include "testing/RecordedLog.h"
 
 #include "cim/Json.h"
 #include "cim/ObjectPathText.h"

@@ -3,7 +3,7 @@
 #ifndef TESTS_PROPERTIES_SERVER_H
 #define TESTS_PROPERTIES_SERVER_H
 
-#include "MadeInventory.h"
+#include "testing/MadeInventory.h"
 
 #include "broker/Broker.h"
 

@@ -33,7 +33,7 @@ protected:
         return path;
     }
 
-    PlatformTesting::Environment systems{"TAVRO_COMPUTER_SYSTEMS", "alpha"};
+    Testing::Environment systems{"TAVRO_COMPUTER_SYSTEMS", "alpha"};
     std::vector<std::string> misuses;
     cimhost::Broker broker;
 

@@ -47,7 +47,7 @@ protected:
     /// settings once in a process, so every test that logs does so in a child.
     static std::vector<std::string> standardErrorOf(const std::function<void()>& work)
     {
-        const PlatformTesting::TemporaryDirectory directory;
+        const Testing::TemporaryDirectory directory;
         const std::string file = directory.path("stderr");
         std::fflush(nullptr);
         const pid_t child = fork();
@@ -59,23 +59,22 @@ protected:
         }
         int status = -1;
         EXPECT_EQ(waitpid(child, &status, 0), child);
-        EXPECT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0)
-            << status << PlatformTesting::contentOf(file);
-        return linesOf(PlatformTesting::contentOf(file));
+        EXPECT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0) << status << Testing::contentOf(file);
+        return linesOf(Testing::contentOf(file));
     }
 
     [[nodiscard]] std::vector<std::string> linesIn(const std::string& name) const
     {
-        return linesOf(PlatformTesting::contentOf(directory.path(name)));
+        return linesOf(Testing::contentOf(directory.path(name)));
     }
 
-    PlatformTesting::TemporaryDirectory directory;
-    PlatformTesting::Environment level{"MVLOG_LEVEL", std::nullopt};
-    PlatformTesting::Environment output{"MVLOG_OUTPUT", std::nullopt};
-    PlatformTesting::Environment file{"MVLOG_FILE", std::nullopt};
-    PlatformTesting::Environment traceLevel{"MVLOG_TRACE_LEVEL", std::nullopt};
-    PlatformTesting::Environment traceOutput{"MVLOG_TRACE_OUTPUT", std::nullopt};
-    PlatformTesting::Environment categories{"MVLOG_CATEGORIES", std::nullopt};
+    Testing::TemporaryDirectory directory;
+    Testing::Environment level{"MVLOG_LEVEL", std::nullopt};
+    Testing::Environment output{"MVLOG_OUTPUT", std::nullopt};
+    Testing::Environment file{"MVLOG_FILE", std::nullopt};
+    Testing::Environment traceLevel{"MVLOG_TRACE_LEVEL", std::nullopt};
+    Testing::Environment traceOutput{"MVLOG_TRACE_OUTPUT", std::nullopt};
+    Testing::Environment categories{"MVLOG_CATEGORIES", std::nullopt};
 };
 
 #endif

@@ -9,7 +9,7 @@
 #ifndef TESTS_FAILURES_DESCRIBED_PROVIDERS_H
 #define TESTS_FAILURES_DESCRIBED_PROVIDERS_H
 
-#include "support/Operations.h"
+#include "testing/Operations.h"
 
 namespace described {
 

@@ -1,0 +1,213 @@
+#include "cli/Installation.h"
+
+#include "cli/Arguments.h"
+#include "testing/TemporaryDirectory.h"
+
+#include <cstdlib>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+#include <sys/stat.h>
+
+using namespace cimhost;
+using namespace cimhost::cli;
+using testing::ElementsAre;
+using testing::HasSubstr;
+using testing::IsEmpty;
+using Testing::TemporaryDirectory;
+
+namespace {
+
+std::string normal(const std::string& file)
+{
+    return std::filesystem::path(file).lexically_normal().string();
+}
+
+/// A tree with a program in its folder bin.
+class Installation : public testing::Test
+{
+protected:
+    [[nodiscard]] Surroundings surroundings() const
+    {
+        return {tree.folder("bin"), std::nullopt, std::nullopt};
+    }
+
+    TemporaryDirectory tree;
+    Settings settings;
+};
+
+TEST_F(Installation, theCommandLinesDirectoriesComeFirst)
+{
+    settings.providerDirectories = {"/a", "/b"};
+    Surroundings around = surroundings();
+    around.providerDirs = "/c";
+    EXPECT_THAT(findProviderDirectories(settings, around), ElementsAre("/a", "/b"));
+}
+
+TEST_F(Installation, theEnvironmentListsDirectories)
+{
+    Surroundings around = surroundings();
+    around.providerDirs = "/c::/d:";
+    EXPECT_THAT(findProviderDirectories(settings, around), ElementsAre("/c", "/d"));
+}
+
+TEST_F(Installation, providersAreInTheInstalledTree)
+{
+    const std::string directory = tree.folder("x/" CIMHOST_PROVIDERDIR_FROM_BIN);
+    const std::string built = tree.folder("x/../lib");
+    Surroundings around = surroundings();
+    around.programDirectory = tree.folder("x");
+    EXPECT_THAT(findProviderDirectories(settings, around), ElementsAre(normal(directory)));
+}
+
+TEST_F(Installation, providersAreInTheBuildTree)
+{
+    const std::string directory = tree.folder("lib");
+    EXPECT_THAT(findProviderDirectories(settings, surroundings()), ElementsAre(directory));
+}
+
+TEST_F(Installation, thereMayBeNoProviderDirectory)
+{
+    EXPECT_THAT(findProviderDirectories(settings, surroundings()), IsEmpty());
+}
+
+TEST_F(Installation, theCommandLinesRegistrationsComeFirst)
+{
+    settings.registrationFiles = {"a.reg"};
+    Surroundings around = surroundings();
+    around.registrationFiles = "b.reg";
+    EXPECT_THAT(findRegistrationFiles(settings, around), ElementsAre("a.reg"));
+}
+
+TEST_F(Installation, theEnvironmentListsRegistrations)
+{
+    Surroundings around = surroundings();
+    around.registrationFiles = "b.reg:c.reg";
+    EXPECT_THAT(findRegistrationFiles(settings, around), ElementsAre("b.reg", "c.reg"));
+}
+
+TEST_F(Installation, registrationsAreInTheInstalledTree)
+{
+    const Surroundings around = surroundings();
+    const std::string second = tree.file("bin/" CIMHOST_SCHEMADIR_FROM_BIN "/b.reg", "");
+    const std::string first = tree.file("bin/" CIMHOST_SCHEMADIR_FROM_BIN "/a.reg", "");
+    const std::string other = tree.file("bin/" CIMHOST_SCHEMADIR_FROM_BIN "/a.mof", "");
+    const std::string built = tree.file("schema/c.reg", "");
+    EXPECT_THAT(findRegistrationFiles(settings, around), ElementsAre(normal(first), normal(second)));
+}
+
+TEST_F(Installation, registrationsAreInTheBuildTree)
+{
+    const std::string file = tree.file("schema/c.reg", "");
+    EXPECT_THAT(findRegistrationFiles(settings, surroundings()), ElementsAre(normal(file)));
+}
+
+TEST_F(Installation, withoutRegistrationsNothingCanBeDone)
+{
+    EXPECT_THROW(findRegistrationFiles(settings, surroundings()), UsageError);
+    const std::string empty = tree.folder("schema");
+    try {
+        findRegistrationFiles(settings, surroundings());
+        FAIL() << empty;
+    } catch (const UsageError& error) {
+        EXPECT_THAT(error.what(), HasSubstr("--registration or CIMHOST_REGISTRATION"));
+    }
+}
+
+std::string section(const std::string& className, const std::string& provider)
+{
+    return "[" + className + "]\n provider: " + provider +
+           "\n location: L\n type: instance\n namespace: root/cimv2\n#\n";
+}
+
+std::string errorOfRegistrations(const std::vector<std::string>& files)
+{
+    try {
+        readRegistrations(files);
+        return "no error";
+    } catch (const RegistrationError& error) {
+        return error.what();
+    }
+}
+
+TEST_F(Installation, registrationsOfSeveralFilesAddUp)
+{
+    const Registration all =
+        readRegistrations({tree.file("a.reg", section("CIM_A", "P")),
+                           tree.file("b.reg", section("CIM_B", "P") + section("CIM_A", "Q"))});
+    ASSERT_EQ(all.classes.size(), 3U);
+    EXPECT_EQ(all.classes[0].className, "CIM_A");
+    EXPECT_EQ(all.classes[1].className, "CIM_B");
+    EXPECT_EQ(all.classes[2].provider, "Q");
+}
+
+TEST_F(Installation, aClassAndProviderMayNotBeInTwoFiles)
+{
+    const std::string first = tree.file("a.reg", section("CIM_A", "P"));
+    const std::string second = tree.file("b.reg", section("cim_a", "P"));
+    EXPECT_EQ(errorOfRegistrations({first, second}),
+              second + ": [cim_a] is registered with the provider P in another file already");
+}
+
+TEST_F(Installation, aRegistrationHasAClass)
+{
+    const std::string full = tree.file("a.reg", section("CIM_A", "P"));
+    const std::string empty = tree.file("b\x1b.reg", "# nothing\n");
+    EXPECT_EQ(errorOfRegistrations({full, empty}),
+              "no class is registered in " + tree.path().string() + "/b\\x001B.reg");
+}
+
+TEST_F(Installation, anInventoryIsHandedOnInTheEnvironment)
+{
+    const std::string file = tree.file("inventory.json", "{}");
+    useInventory(file);
+    EXPECT_EQ(std::getenv("TAVRO_INVENTORY"), file);
+    useInventory(tree.file("empty.json", "")); // whose content is the providers' concern
+    unsetenv("TAVRO_INVENTORY");
+}
+
+TEST_F(Installation, anInventoryMustBeReadable)
+{
+    for (const std::string& file : {tree.path().string() + "/missing.json", tree.folder("directory")}) {
+        try {
+            useInventory(file);
+            FAIL() << file;
+        } catch (const UsageError& error) {
+            EXPECT_THAT(error.what(), HasSubstr("cannot read the inventory " + file + ": ")) << file;
+        }
+        EXPECT_EQ(std::getenv("TAVRO_INVENTORY"), nullptr);
+    }
+}
+
+std::string errorOfInventory(const std::string& file)
+{
+    try {
+        useInventory(file);
+        unsetenv("TAVRO_INVENTORY");
+        return "no error";
+    } catch (const UsageError& error) {
+        return error.what();
+    }
+}
+
+TEST_F(Installation, anInventoryIsARegularFile)
+{
+    const std::string pipe = tree.path() / "pipe";
+    ASSERT_EQ(mkfifo(pipe.c_str(), 0600), 0);
+    EXPECT_EQ(errorOfInventory(pipe),
+              "cannot read the inventory " + pipe + ": expected a regular file, found a pipe");
+    for (const std::string device : {"/dev/null", "/dev/zero"})
+        EXPECT_EQ(errorOfInventory(device),
+                  "cannot read the inventory " + device + ": expected a regular file, found a device");
+}
+
+TEST_F(Installation, namesOfFilesAreShownPrintably)
+{
+    EXPECT_THAT(errorOfInventory("/nowhere/\x1b[2J"),
+                HasSubstr("the inventory /nowhere/\\x001B[2J: No such file"));
+    const std::string first = tree.file("a.reg", section("CIM_A", "P"));
+    const std::string second = tree.file("\x1b.reg", section("CIM_A", "P"));
+    EXPECT_THAT(errorOfRegistrations({first, second}), HasSubstr("/\\x001B.reg: [CIM_A]"));
+}
+
+} // namespace
