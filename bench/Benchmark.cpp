@@ -102,12 +102,13 @@ double timeOfTracePoints(Bed& /*bed*/)
 {
     static const std::string category("Mavrel.GlimmarkProvider");
     static const Tavro::TraceModule module{"GlimmarkProvider.cpp", category};
-    const Tavro::FunctionTrace flow(module, "Glimmark_EnumInstanceNames");
     const int object = 0;
     return secondsOf([&] {
         for (int i = 0; i < tracePoints; ++i)
-            flow.entering(Tavro::parameterList(" mi=", &object, " ctx=", &object, " result=", &object,
-                                               " ref=", &object));
+            Tavro::FunctionTrace(module, "Glimmark_EnumInstanceNames", [&] {
+                return Tavro::parameterList(" mi=", &object, " ctx=", &object, " result=", &object,
+                                            " ref=", &object);
+            });
     });
 }
 

@@ -5,6 +5,14 @@
 /// No null pointer is followed: a call on a null object, or of a service that its table lacks, does
 /// nothing and returns a null pointer, a zero or { CMPI_RC_OK, null }. A status pointer may be null.
 /// Null arguments other than the object itself are handed on; what they mean is the broker's matter.
+///
+/// Each function names the macro of cmpimacs.h that C programmers know. Such a macro is the call alone:
+///
+///     CMNewObjectPath(broker, nameSpace, className, rc)
+///         -> broker->eft->newObjectPath(broker, nameSpace, className, rc)
+///
+/// where newObjectPath(broker, nameSpace, className, rc) here makes the same call, and first looks whether
+/// `broker`, its `eft` and that table's `newObjectPath` are there.
 #ifndef TAVRO_GLIMMARK_CMPI_H
 #define TAVRO_GLIMMARK_CMPI_H
 
@@ -66,22 +74,26 @@ bool exists(const Object* object)
 
 // Making objects. They belong to the broker and end with the request.
 
+/// CMNewObjectPath.
 inline CMPIObjectPath* newObjectPath(const CMPIBroker* broker, const char* nameSpace, const char* className,
                                      CMPIStatus* rc)
 {
     return callEncapsulated(broker, &CMPIBrokerEncFT::newObjectPath, nameSpace, className, rc);
 }
 
+/// CMNewInstance.
 inline CMPIInstance* newInstance(const CMPIBroker* broker, const CMPIObjectPath* path, CMPIStatus* rc)
 {
     return callEncapsulated(broker, &CMPIBrokerEncFT::newInstance, path, rc);
 }
 
+/// CMNewString.
 inline CMPIString* newString(const CMPIBroker* broker, const char* text)
 {
     return callEncapsulated(broker, &CMPIBrokerEncFT::newString, text, static_cast<CMPIStatus*>(nullptr));
 }
 
+/// CMNewArray.
 inline CMPIArray* newArray(const CMPIBroker* broker, CMPICount size, CMPIType type, CMPIStatus* rc)
 {
     return callEncapsulated(broker, &CMPIBrokerEncFT::newArray, size, type, rc);
@@ -89,6 +101,7 @@ inline CMPIArray* newArray(const CMPIBroker* broker, CMPICount size, CMPIType ty
 
 // Telling the broker.
 
+/// CMTraceMessage, with the text as characters.
 inline void trace(const CMPIBroker* broker, CMPILevel level, const char* component, const char* text)
 {
     callEncapsulated(broker, &CMPIBrokerEncFT::trace, level, component, text,
@@ -110,32 +123,37 @@ inline void reportFailure(const CMPIBroker* broker, const char* component, CMPIS
 
 // Object paths.
 
-/// The characters belong to the string; null for a null string.
+/// CMGetCharsPtr: the characters belong to the string; null for a null string.
 inline const char* characters(const CMPIString* string, CMPIStatus* rc)
 {
     return call(string, &CMPIStringFT::getCharPtr, rc);
 }
 
+/// CMGetNameSpace.
 inline const char* nameSpaceOf(const CMPIObjectPath* path, CMPIStatus* rc)
 {
     return characters(call(path, &CMPIObjectPathFT::getNameSpace, rc), rc);
 }
 
+/// CMGetClassName.
 inline const char* classNameOf(const CMPIObjectPath* path, CMPIStatus* rc)
 {
     return characters(call(path, &CMPIObjectPathFT::getClassName, rc), rc);
 }
 
+/// CMSetNameSpace.
 inline void setNameSpace(const CMPIObjectPath* path, const char* nameSpace)
 {
     call(path, &CMPIObjectPathFT::setNameSpace, nameSpace);
 }
 
+/// CMSetHostname.
 inline void setHostname(const CMPIObjectPath* path, const std::string& host)
 {
     call(path, &CMPIObjectPathFT::setHostname, host.c_str());
 }
 
+/// CMGetKeyCount.
 inline CMPICount keyCountOf(const CMPIObjectPath* path, CMPIStatus* rc)
 {
     return call(path, &CMPIObjectPathFT::getKeyCount, rc);
@@ -144,7 +162,8 @@ inline CMPICount keyCountOf(const CMPIObjectPath* path, CMPIStatus* rc)
 // Data is what its type and its value say. Its state says nothing reliable: there are brokers whose good
 // items have the state of a null value.
 
-/// The value of a key where it is a string with content; null where it is missing, null or something else.
+/// CMGetKey: the value of a key where it is a string with content; null where it is missing, null or
+/// something else.
 inline CMPIString* stringKeyOf(const CMPIObjectPath* path, const char* name, CMPIStatus* rc)
 {
     const CMPIData key = call(path, &CMPIObjectPathFT::getKey, name, rc);
@@ -205,6 +224,11 @@ inline TypedValue typed(const CMPIObjectPath* path)
     return result;
 }
 
+/// Any other pointer would do as a flag, which is then TRUE.
+template <class Type>
+TypedValue typed(const Type* pointer) = delete;
+
+/// CMAddKey, with the CMPI type of the value.
 template <class Value>
 void addKey(const CMPIObjectPath* path, const char* name, const Value& value)
 {
@@ -212,6 +236,7 @@ void addKey(const CMPIObjectPath* path, const char* name, const Value& value)
     call(path, &CMPIObjectPathFT::addKey, name, key.pointer(), key.type);
 }
 
+/// CMSetProperty, with the CMPI type of the value.
 template <class Value>
 void setProperty(const CMPIInstance* instance, const char* name, const Value& value)
 {
@@ -219,6 +244,7 @@ void setProperty(const CMPIInstance* instance, const char* name, const Value& va
     call(instance, &CMPIInstanceFT::setProperty, name, property.pointer(), property.type);
 }
 
+/// CMSetArrayElementAt.
 inline void setElementAt(const CMPIArray* array, CMPICount index, CMPIUint16 number)
 {
     const TypedValue element = typed(number);
@@ -227,12 +253,13 @@ inline void setElementAt(const CMPIArray* array, CMPICount index, CMPIUint16 num
 
 // Instances.
 
-/// \param properties  null-terminated, or null for all  \param keys  null-terminated
+/// CMSetPropertyFilter. \param properties  null-terminated, or null for all  \param keys  null-terminated
 inline void setPropertyFilter(const CMPIInstance* instance, const char** properties, const char** keys)
 {
     call(instance, &CMPIInstanceFT::setPropertyFilter, properties, keys);
 }
 
+/// CMGetObjectPath.
 inline CMPIObjectPath* objectPathOf(const CMPIInstance* instance, CMPIStatus* rc)
 {
     return call(instance, &CMPIInstanceFT::getObjectPath, rc);
@@ -240,16 +267,19 @@ inline CMPIObjectPath* objectPathOf(const CMPIInstance* instance, CMPIStatus* rc
 
 // Results.
 
+/// CMReturnInstance.
 inline void returnInstance(const CMPIResult* result, const CMPIInstance* instance)
 {
     call(result, &CMPIResultFT::returnInstance, instance);
 }
 
+/// CMReturnObjectPath.
 inline void returnObjectPath(const CMPIResult* result, const CMPIObjectPath* path)
 {
     call(result, &CMPIResultFT::returnObjectPath, path);
 }
 
+/// CMReturnDone.
 inline void returnDone(const CMPIResult* result)
 {
     call(result, &CMPIResultFT::returnDone);
@@ -257,12 +287,14 @@ inline void returnDone(const CMPIResult* result)
 
 // Up-calls and what they bring.
 
+/// CBEnumInstanceNames.
 inline CMPIEnumeration* enumerateInstanceNames(const CMPIBroker* broker, const CMPIContext* context,
                                                const CMPIObjectPath* classPath, CMPIStatus* rc)
 {
     return callBroker(broker, &CMPIBrokerFT::enumerateInstanceNames, context, classPath, rc);
 }
 
+/// CBEnumInstances.
 inline CMPIEnumeration* enumerateInstances(const CMPIBroker* broker, const CMPIContext* context,
                                            const CMPIObjectPath* classPath, const char** properties,
                                            CMPIStatus* rc)
@@ -270,20 +302,20 @@ inline CMPIEnumeration* enumerateInstances(const CMPIBroker* broker, const CMPIC
     return callBroker(broker, &CMPIBrokerFT::enumerateInstances, context, classPath, properties, rc);
 }
 
-/// False for a null enumeration: it counts as empty.
+/// CMHasNext. False for a null enumeration: it counts as empty.
 inline bool hasNext(const CMPIEnumeration* enumeration)
 {
     return call(enumeration, &CMPIEnumerationFT::hasNext, static_cast<CMPIStatus*>(nullptr)) != 0;
 }
 
-/// The next item as a path; null where it is of another type.
+/// CMGetNext: the next item as a path; null where it is of another type.
 inline CMPIObjectPath* nextPath(const CMPIEnumeration* enumeration)
 {
     const CMPIData item = call(enumeration, &CMPIEnumerationFT::getNext, static_cast<CMPIStatus*>(nullptr));
     return item.type == CMPI_ref ? item.value.ref : nullptr;
 }
 
-/// The next item as an instance; null where it is of another type.
+/// CMGetNext: the next item as an instance; null where it is of another type.
 inline CMPIInstance* nextInstance(const CMPIEnumeration* enumeration)
 {
     const CMPIData item = call(enumeration, &CMPIEnumerationFT::getNext, static_cast<CMPIStatus*>(nullptr));

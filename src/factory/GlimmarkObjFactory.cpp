@@ -1,6 +1,7 @@
 // The factory: records to CMPI instances and object paths, and the far end of an association.
 
 #include "Cmpi.h"
+#include "Counted.h"
 #include "GlimmarkFactory.h"
 #include "InventoryCollection.h"
 #include "Names.h"
@@ -27,14 +28,6 @@ const TraceModule traceModule{"GlimmarkObjFactory.cpp", loggerGlimmarkObjFactory
 constexpr int success = 0;
 constexpr int nothingFound = 1;
 constexpr int notMade = 2;
-
-// A list of records is walked only up to its length modulo 65,536: clients rely on a list never being
-// longer than what 16 bits count.
-template <class Record>
-std::uint16_t countOf(const std::vector<Record>& records)
-{
-    return static_cast<std::uint16_t>(records.size());
-}
 
 /// \return null when the array could not be made
 CMPIArray* newArrayOf(const CMPIBroker* broker, const std::vector<std::uint16_t>& values, CMPIStatus* rc)
@@ -99,8 +92,8 @@ bool setGlimmarkProperties(const CMPIBroker* broker, const CMPIInstance* instanc
     if (requested.include("OperationalStatus")) {
         CMPIArray* const statuses = newArrayOf(broker, glimmark.getOperationalStatus(), rc);
         if (statuses == nullptr) {
-            // The runs of blanks, here and in the texts below, are part of the texts: clients and
-            // administrators' log filters match them as they are.
+            // Deliberate: the runs of blanks, here and in the texts below; log filters match them.
+            // Test: GlimmarkFactoryTest.WithoutTheArrayTheInstanceIsHandedBackHalfFilledAndTheFailureReported.
             Cmpi::reportFailure(
                 broker, GlimmarkProfileProvider, rc,
                 "Create Array for Property                         OperationalStatus failed.",
@@ -124,7 +117,8 @@ void setCapabilitiesProperties(const CMPIBroker* broker, const CMPIInstance* ins
         return;
     CMPIArray* const states = newArrayOf(broker, glimmarkCap.getAlarmStatesSupported(), rc);
     if (states == nullptr) {
-        // "array" in the status, "Array" in the trace: both are meant.
+        // Deliberate: "array" in the status, "Array" in the trace; log filters match them.
+        // Test: CapabilitiesObjectsTest.WithoutTheArrayTheInstanceCarriesItsKeyAndTheFailureIsReported.
         Cmpi::reportFailure(
             broker, GlimmarkCapabilitiesProvider, rc,
             "Creating array for Property                         RequestedAlarmStatesSupported failed.",
@@ -163,9 +157,7 @@ int GlimmarkFactory::getNumberOfInstances() const
 
 void GlimmarkFactory::_createGlimmarkMap()
 {
-    const std::uint16_t count = countOf(glimmarks);
-    for (std::uint16_t i = 0; i < count; ++i) {
-        Glimmark& glimmark = glimmarks[i];
+    for (Glimmark& glimmark : Counted(glimmarks)) {
         // The last one of an identifier wins. Nobody reads the list any more: its records are moved.
         glimmarkMap[glimmark.getDeviceID()] = std::move(glimmark);
     }
@@ -173,9 +165,7 @@ void GlimmarkFactory::_createGlimmarkMap()
 
 void GlimmarkFactory::_createCapabilitiesMap()
 {
-    const std::uint16_t count = countOf(capabilities);
-    for (std::uint16_t i = 0; i < count; ++i) {
-        GlimmarkCapabilities record = capabilities[i];
+    for (GlimmarkCapabilities& record : Counted(capabilities)) {
         const std::string key = record.getInstanceID(); // stored in the record too, before it is copied
         capabilitiesMap[key] = record;
     }
@@ -185,12 +175,10 @@ CMPIInstance* GlimmarkFactory::makeGlimmarkInstance(const CMPIBroker* broker, co
                                                     Glimmark glimmark, const char** properties,
                                                     bool isObjPath, CMPIStatus* rc) const
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "makeGlimmarkInstance", [&] {
         return parameterList(" broker=", broker, " ref=", ref, " glimmark=", &glimmark,
                              " properties=", properties, " isObjPath=", isObjPath, " rc=", rc);
-    };
-    const FunctionTrace flow(traceModule, "makeGlimmarkInstance");
-    flow.entering(parameters());
+    });
 
     CMPIInstance* const instance = newInstanceOf(broker, ref, GlimmarkClass, rc);
     if (Cmpi::exists(instance)) {
@@ -200,10 +188,13 @@ CMPIInstance* GlimmarkFactory::makeGlimmarkInstance(const CMPIBroker* broker, co
         forEachGlimmarkKey(
             glimmark, [&](const char* name, const auto& value) { Cmpi::setProperty(instance, name, value); });
         const RequestedProperties requested(properties, isObjPath);
+        // Deliberate: no EXITING line, and the half-filled instance is handed on; clients get what could be
+        // made.
+        // Test: GlimmarkFactoryTest.WithoutTheArrayTheInstanceIsHandedBackHalfFilledAndTheFailureReported.
         if (!setGlimmarkProperties(broker, instance, glimmark, requested, rc))
-            return instance; // meant: no EXITING line, and the half-filled instance is handed on
+            return instance;
     }
-    flow.exiting(parameters());
+    flow.exiting();
     return instance;
 }
 
@@ -211,15 +202,13 @@ int GlimmarkFactory::getAllGlimmarkCMPIInstances(const CMPIBroker* broker, const
                                                  const char** properties, bool isObjPath,
                                                  std::vector<CMPIInstance*>& instances, CMPIStatus* rc) const
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "getAllGlimmarkCMPIInstances", [&] {
         return parameterList(" broker=", broker, " ref=", ref, " properties=", properties,
                              " isObjPath=", isObjPath, " instances=", &instances, " rc=", rc);
-    };
-    const FunctionTrace flow(traceModule, "getAllGlimmarkCMPIInstances");
-    flow.entering(parameters());
+    });
     for (const auto& [deviceID, glimmark] : glimmarkMap)
         instances.push_back(makeGlimmarkInstance(broker, ref, glimmark, properties, isObjPath, rc));
-    flow.exiting(parameters());
+    flow.exiting();
     return success;
 }
 
@@ -227,17 +216,17 @@ int GlimmarkFactory::getOneGlimmarkCMPIInstance(const CMPIBroker* broker, const 
                                                 CMPIString* key, const char** properties,
                                                 std::vector<CMPIInstance*>& instances, CMPIStatus* rc) const
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "getOneGlimmarkCMPIInstance", [&] {
         return parameterList(" broker=", broker, " ref=", ref, " key=", key, " properties=", properties,
                              " instances=", &instances, " rc=", rc);
-    };
-    const FunctionTrace flow(traceModule, "getOneGlimmarkCMPIInstance");
-    flow.entering(parameters());
+    });
     const auto found = findKey(glimmarkMap, key, rc);
+    // Deliberate: no EXITING line, no status; the operation's caller, a broker, says "not found".
+    // Test: GlimmarkFactoryTest.OneInstanceIsNotFoundByAnythingElse.
     if (found == glimmarkMap.end())
-        return nothingFound; // meant: no EXITING line, no status
+        return nothingFound;
     instances.push_back(makeGlimmarkInstance(broker, ref, found->second, properties, false, rc));
-    flow.exiting(parameters());
+    flow.exiting();
     return success;
 }
 
@@ -245,12 +234,10 @@ int GlimmarkFactory::getAllGlimmarkCMPIObjPaths(const CMPIBroker* broker, const 
                                                 std::vector<CMPIObjectPath*>& objectPaths,
                                                 CMPIStatus* status) const
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "getAllGlimmarkCMPIObjPaths", [&] {
         return parameterList(" broker=", broker, " ref=", ref, " objectPaths=", &objectPaths,
                              " status=", status);
-    };
-    const FunctionTrace flow(traceModule, "getAllGlimmarkCMPIObjPaths");
-    flow.entering(parameters());
+    });
     if (glimmarkMap.empty()) {
         // For information only: a server without indicators is no fault.
         Cmpi::trace(broker, CMPI_LEV_INFO, GlimmarkProfileProvider, "***No instance found***");
@@ -270,7 +257,7 @@ int GlimmarkFactory::getAllGlimmarkCMPIObjPaths(const CMPIBroker* broker, const 
                            [&](const char* name, const auto& value) { Cmpi::addKey(path, name, value); });
         objectPaths.push_back(path);
     }
-    flow.exiting(parameters());
+    flow.exiting();
     return success;
 }
 
@@ -280,13 +267,12 @@ CMPIInstance* GlimmarkFactory::makeGlimmarkCapabilitiesInstance(const CMPIBroker
                                                                 const char** properties, bool isObjPath,
                                                                 CMPIStatus* rc) const
 {
-    const auto parameters = [&] {
-        // " IsObjPath=" with a capital I, unlike the other builders: meant, log filters know it so.
+    const FunctionTrace flow(traceModule, "makeGlimmarkCapabilitiesInstance", [&] {
+        // Deliberate: " IsObjPath=" with a capital I, unlike the other builders; log filters know it so.
+        // Test: CapabilitiesObjectsTest.InstanceIsTraced.
         return parameterList(" broker=", broker, " ref=", ref, " glimmarkCap=", &glimmarkCap,
                              " properties=", properties, " IsObjPath=", isObjPath, " rc=", rc);
-    };
-    const FunctionTrace flow(traceModule, "makeGlimmarkCapabilitiesInstance");
-    flow.entering(parameters());
+    });
 
     CMPIInstance* const instance = newInstanceOf(broker, ref, GlimmarkCapabilitiesClass, rc);
     if (Cmpi::exists(instance)) {
@@ -296,8 +282,10 @@ CMPIInstance* GlimmarkFactory::makeGlimmarkCapabilitiesInstance(const CMPIBroker
         const RequestedProperties requested(properties, isObjPath);
         setCapabilitiesProperties(broker, instance, glimmarkCap, requested, rc);
     }
-    // Unlike the alarm device builder, a failed array does not cost the EXITING line.
-    flow.exiting(parameters());
+    // Deliberate: unlike the alarm device builder, a failed array does not cost the EXITING line; log filters
+    // count on it.
+    // Test: CapabilitiesObjectsTest.WithoutTheArrayTheInstanceCarriesItsKeyAndTheFailureIsReported.
+    flow.exiting();
     return instance;
 }
 
@@ -307,15 +295,13 @@ int GlimmarkFactory::getAllGlimmarkCapabilitiesCMPIInstances(const CMPIBroker* b
                                                              std::vector<CMPIInstance*>& instances,
                                                              CMPIStatus* rc) const
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "getAllGlimmarkCapabilitiesCMPIInstances", [&] {
         return parameterList(" broker=", broker, " ref=", ref, " properties=", properties,
                              " isObjPath=", isObjPath, " instances=", &instances, " rc=", rc);
-    };
-    const FunctionTrace flow(traceModule, "getAllGlimmarkCapabilitiesCMPIInstances");
-    flow.entering(parameters());
+    });
     for (const auto& [instanceID, record] : capabilitiesMap)
         instances.push_back(makeGlimmarkCapabilitiesInstance(broker, ref, record, properties, isObjPath, rc));
-    flow.exiting(parameters());
+    flow.exiting();
     return success;
 }
 
@@ -325,17 +311,17 @@ int GlimmarkFactory::getOneGlimmarkCapabilitiesCMPIInstance(const CMPIBroker* br
                                                             std::vector<CMPIInstance*>& instances,
                                                             CMPIStatus* rc) const
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "getOneGlimmarkCapabilitiesCMPIInstance", [&] {
         return parameterList(" broker=", broker, " ref=", ref, " key=", key, " properties=", properties,
                              " instances=", &instances, " rc=", rc);
-    };
-    const FunctionTrace flow(traceModule, "getOneGlimmarkCapabilitiesCMPIInstance");
-    flow.entering(parameters());
+    });
     const auto found = findKey(capabilitiesMap, key, rc);
+    // Deliberate: no EXITING line, no status, as for an alarm device.
+    // Test: CapabilitiesObjectsTest.OneInstanceIsNotFoundByAnythingElse.
     if (found == capabilitiesMap.end())
-        return nothingFound; // meant: no EXITING line, no status
+        return nothingFound;
     instances.push_back(makeGlimmarkCapabilitiesInstance(broker, ref, found->second, properties, false, rc));
-    flow.exiting(parameters());
+    flow.exiting();
     return success;
 }
 
@@ -344,12 +330,10 @@ int GlimmarkFactory::getAllGlimmarkCapabilitiesCMPIObjPaths(const CMPIBroker* br
                                                             std::vector<CMPIObjectPath*>& objectPaths,
                                                             CMPIStatus* status) const
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "getAllGlimmarkCapabilitiesCMPIObjPaths", [&] {
         return parameterList(" broker=", broker, " ref=", ref, " objectPaths=", &objectPaths,
                              " status=", status);
-    };
-    const FunctionTrace flow(traceModule, "getAllGlimmarkCapabilitiesCMPIObjPaths");
-    flow.entering(parameters());
+    });
     if (capabilitiesMap.empty()) {
         // A warning, unlike the alarm devices': a system always has its capabilities.
         Cmpi::trace(broker, CMPI_LEV_WARNING, GlimmarkCapabilitiesProvider, "***No instance found***");
@@ -359,7 +343,8 @@ int GlimmarkFactory::getAllGlimmarkCapabilitiesCMPIObjPaths(const CMPIBroker* br
         CMPIObjectPath* const path =
             Cmpi::newObjectPath(broker, Cmpi::nameSpaceOf(ref, status), GlimmarkCapabilitiesClass, status);
         if (!Cmpi::exists(path)) {
-            // No full stop in the status, unlike the alarm devices': meant.
+            // Deliberate: no full stop in the status, unlike the alarm devices'; log filters match it.
+            // Test: CapabilitiesObjectsTest.APathThatCannotBeMadeIsReported.
             Cmpi::reportFailure(
                 broker, GlimmarkCapabilitiesProvider, status, "Create CMPIObjectPath failed",
                 "Create CMPIObjectPath failed for                     GlimmarkCapabilities class");
@@ -370,7 +355,7 @@ int GlimmarkFactory::getAllGlimmarkCapabilitiesCMPIObjPaths(const CMPIBroker* br
         Cmpi::addKey(path, "InstanceID", copy.getInstanceID());
         objectPaths.push_back(path);
     }
-    flow.exiting(parameters());
+    flow.exiting();
     return success;
 }
 
@@ -409,21 +394,21 @@ const char* GlimmarkFactory::get_assoc_targetClass_Name(const CMPIBroker* broker
                                                         const char* assocClass, const char* resultClass,
                                                         CMPIStatus* rc) const
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "get_assoc_targetClass_Name", [&] {
         return parameterList(" broker=", broker, " ref=", ref, " _RefLeftClass=", assocClass,
                              " _RefRightClass=", resultClass, " rc=", rc);
-    };
-    const FunctionTrace flow(traceModule, "get_assoc_targetClass_Name");
-    flow.entering(parameters());
+    });
     for (const Route& route : routes) {
         // The class of the path is read afresh for each route.
         if (equals(Cmpi::classNameOf(ref, rc), route.sourceClass) && equals(assocClass, route.assocClass)) {
             Cmpi::trace(broker, CMPI_LEV_INFO, route.provider, route.traceText);
-            flow.exiting(parameters());
+            flow.exiting();
             return route.targetClass;
         }
     }
-    return nullptr; // meant: no EXITING line
+    // Deliberate: no EXITING line; log filters count on it.
+    // Test: UnknownWays.LeadNowhereWithoutATraceAndAnExit.
+    return nullptr;
 }
 
 CMPIObjectPath* GlimmarkFactory::get_assoc_targetClass_ObjectPath(const CMPIBroker* broker,
@@ -432,18 +417,16 @@ CMPIObjectPath* GlimmarkFactory::get_assoc_targetClass_ObjectPath(const CMPIBrok
                                                                   const char* resultClass,
                                                                   CMPIStatus* rc) const
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "get_assoc_targetClass_ObjectPath", [&] {
         return parameterList(" broker=", broker, " ref=", ref, " _RefLeftClass=", assocClass,
                              " _RefRightClass=", resultClass, " rc=", rc);
-    };
-    const FunctionTrace flow(traceModule, "get_assoc_targetClass_ObjectPath");
-    flow.entering(parameters());
+    });
     CMPIObjectPath* path = nullptr;
     if (const char* target = get_assoc_targetClass_Name(broker, ref, assocClass, resultClass, rc)) {
         path = Cmpi::newObjectPath(broker, Cmpi::nameSpaceOf(ref, rc), target, rc);
         setOrigin(path, ref, rc);
     }
-    flow.exiting(parameters());
+    flow.exiting();
     return path;
 }
 

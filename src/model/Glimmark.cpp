@@ -81,7 +81,7 @@ Glimmark readNode(const Instrumentation& node)
     require(record.setRequestedState(nodeOk), "Failed while setting Requested State");
 
     require(record.setAudibleAlarm(false), "Failed while setting AudibleAlarm");
-    // The audible alarm's text, on purpose: there is no visible alarm's.
+    // The audible alarm's text here too. This setter accepts every value: nobody ever sees the text.
     require(record.setVisibleAlarm(true), "Failed while setting AudibleAlarm");
     require(record.setMotionAlarm(false), "Failed while setting MotionAlarm");
 
@@ -240,22 +240,19 @@ int getGlimmarkInstances(std::vector<Glimmark>& out)
 
 int setVector(std::vector<Glimmark>& out, Instrumentation& cursor)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "setVector", [&] {
         return parameterList(" vectGlimmark=", &out, " instrumentation=", &cursor);
-    };
-    const FunctionTrace flow(traceModule, "setVector");
-    flow.entering(parameters());
+    });
     for (; cursor; ++cursor)
         out.push_back(readNode(cursor));
-    flow.exiting(parameters());
+    flow.exiting();
     return 0;
 }
 
 int getGlimmarkCapabilitiesInstances(std::vector<GlimmarkCapabilities>& out)
 {
-    const auto parameters = [&] { return parameterList(" vectGlimmarkCapabilities=", &out); };
-    const FunctionTrace flow(traceModule, "getGlimmarkCapabilitiesInstances");
-    flow.entering(parameters());
+    const FunctionTrace flow(traceModule, "getGlimmarkCapabilitiesInstances",
+                             [&] { return parameterList(" vectGlimmarkCapabilities=", &out); });
     try {
         out.emplace_back();
     } catch (const std::exception& failure) {
@@ -263,7 +260,7 @@ int getGlimmarkCapabilitiesInstances(std::vector<GlimmarkCapabilities>& out)
         std::cerr << failure.what() << '\n';
         return 1;
     }
-    flow.exiting(parameters());
+    flow.exiting();
     return 0;
 }
 

@@ -1,9 +1,15 @@
 // The provider of TAVRO_GlimmarkCapabilities.
 
+#include "BrokerPointer.h"
+#include "Cmpi.h"
+#include "Counted.h"
 #include "EntryPoints.h"
+#include "FunctionTables.h"
 #include "GlimmarkFactory.h"
 #include "Names.h"
-#include "ProviderFrame.h"
+#include "RequestChecks.h"
+#include "ResultLists.h"
+#include "Statuses.h"
 #include "Trace.h"
 
 #include <string>
@@ -24,25 +30,26 @@ const TraceModule traceModule{"GlimmarkCapabilitiesProvider.cpp", loggerGlimmark
 CMPIStatus GlimmarkCapabilities_EnumInstanceNames(CMPIInstanceMI* mi, const CMPIContext* ctx,
                                                   const CMPIResult* rslt, const CMPIObjectPath* ref)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "GlimmarkCapabilities_EnumInstanceNames", [&] {
         return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " ref=", ref);
-    };
-    const FunctionTrace flow(traceModule, "GlimmarkCapabilities_EnumInstanceNames");
-    flow.entering(parameters());
+    });
     CMPIStatus status = okStatus();
 
     const GlimmarkFactory factory(false, true);
     std::vector<CMPIObjectPath*> paths;
     reserveFor(factory, paths);
+    // Deliberate: neither returnDone nor an EXITING line, here as in every early return below; brokers go by
+    // the status.
+    // Test: GlimmarkCapabilitiesProviderTest.NamesWithoutAPathEndWithoutDoneAndExit.
     if (factory.getAllGlimmarkCapabilitiesCMPIObjPaths(broker, ref, paths, &status) != 0)
-        return status; // meant: neither returnDone nor an EXITING line, here as in every early return below
-    forEach(paths, [&](const CMPIObjectPath* path) {
+        return status;
+    for (const CMPIObjectPath* path : Counted(paths)) {
         if (Cmpi::exists(path))
             returnObjectPathOf(rslt, path, ref, &status);
-    });
+    }
 
     Cmpi::returnDone(rslt);
-    flow.exiting(parameters());
+    flow.exiting();
     return status;
 }
 
@@ -50,12 +57,10 @@ CMPIStatus GlimmarkCapabilities_EnumInstances(CMPIInstanceMI* mi, const CMPICont
                                               const CMPIResult* rslt, const CMPIObjectPath* ref,
                                               const char** properties)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "GlimmarkCapabilities_EnumInstances", [&] {
         return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " ref=", ref,
                              " properties=", properties);
-    };
-    const FunctionTrace flow(traceModule, "GlimmarkCapabilities_EnumInstances");
-    flow.entering(parameters());
+    });
     CMPIStatus status = okStatus();
 
     const GlimmarkFactory factory(false, true);
@@ -67,7 +72,7 @@ CMPIStatus GlimmarkCapabilities_EnumInstances(CMPIInstanceMI* mi, const CMPICont
     returnInstances(rslt, instances);
 
     Cmpi::returnDone(rslt);
-    flow.exiting(parameters());
+    flow.exiting();
     return status;
 }
 
@@ -91,19 +96,22 @@ int returnByInstanceID(const CMPIResult* rslt, const CMPIObjectPath* cop, CMPISt
 int returnByPath(const CMPIResult* rslt, const CMPIObjectPath* cop, const char** properties,
                  CMPIStatus& status)
 {
-    // Meant: collected are the alarm devices and not the capabilities, so that this way finds nothing. A
+    // Deliberate: collected are the alarm devices and not the capabilities, so that this way finds nothing; a
     // client without the InstanceID is told "not found" by its broker.
+    // Test: GlimmarkCapabilitiesProviderTest.GetFindsNothingEvenAtTheCapabilitiesOwnPath.
     const GlimmarkFactory factory(true, false);
     std::vector<CMPIInstance*> instances;
     reserveFor(factory, instances);
     const int result =
         factory.getAllGlimmarkCapabilitiesCMPIInstances(broker, cop, properties, false, instances, &status);
     if (result == 0) {
-        // Unlike the alarm device provider, the walk goes on after a match.
-        forEach(instances, [&](const CMPIInstance* instance) {
+        // Deliberate: unlike the alarm device provider's, the walk goes on after a match; a client gets them
+        // all.
+        // Test: CapabilitiesOfAnotherFactory.AreReturnedForEachMatchOfTheWholePath.
+        for (const CMPIInstance* instance : Counted(instances)) {
             if (isAt(instance, cop, false, status))
                 Cmpi::returnInstance(rslt, instance);
-        });
+        }
     }
     return result;
 }
@@ -114,12 +122,10 @@ CMPIStatus GlimmarkCapabilities_GetInstance(CMPIInstanceMI* mi, const CMPIContex
                                             const CMPIResult* rslt, const CMPIObjectPath* cop,
                                             const char** properties)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "GlimmarkCapabilities_GetInstance", [&] {
         return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " cop=", cop,
                              " properties=", properties);
-    };
-    const FunctionTrace flow(traceModule, "GlimmarkCapabilities_GetInstance");
-    flow.entering(parameters());
+    });
     CMPIStatus status = okStatus();
 
     if (requireKeys(broker, GlimmarkCapabilitiesProvider, cop, status)) {
@@ -132,7 +138,7 @@ CMPIStatus GlimmarkCapabilities_GetInstance(CMPIInstanceMI* mi, const CMPIContex
     }
 
     Cmpi::returnDone(rslt);
-    flow.exiting(parameters());
+    flow.exiting();
     return status;
 }
 

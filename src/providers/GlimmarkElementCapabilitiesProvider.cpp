@@ -1,13 +1,18 @@
 // The provider of the association TAVRO_GlimmarkElementCapabilities, between each indicator and the
 // capabilities object: its instances and its traversal.
 
+#include "BrokerPointer.h"
+#include "Cmpi.h"
+#include "Counted.h"
 #include "EntryPoints.h"
+#include "FunctionTables.h"
 #include "GlimmarkFactory.h"
 #include "Names.h"
-#include "ProviderFrame.h"
+#include "RequestChecks.h"
+#include "ResultLists.h"
+#include "Statuses.h"
 #include "Trace.h"
 
-#include <cstdint>
 #include <cstring>
 #include <string>
 #include <vector>
@@ -22,10 +27,6 @@ namespace {
 
 const TraceModule traceModule{"GlimmarkElementCapabilitiesProvider.cpp",
                               loggerGlimmarkElementCapabilitiesProvider};
-
-} // namespace
-
-namespace {
 
 /// The path of an association in the request's terms; null, or without a handle, when the broker could not
 /// make it.
@@ -52,8 +53,9 @@ CMPIInstance* newAssociation(const CMPIObjectPath* path, const CMPIObjectPath* d
 {
     CMPIInstance* const instance = Cmpi::newInstance(broker, path, nullptr);
     if (Cmpi::exists(instance)) {
-        // The names of the class that associations of dependency share, not those of the two properties:
-        // meant, brokers are told so from the beginning.
+        // Deliberate: the names that associations of dependency share, not those of the two properties;
+        // brokers filter by them.
+        // Test: ElementCapabilitiesInstances.ThePropertyListIsTheInstancesFilterAndNothingElse.
         const char* keys[] = {"Antecedent", "Dependent", nullptr};
         Cmpi::setPropertyFilter(instance, properties, keys);
         Cmpi::setProperty(instance, "ManagedElement", device);
@@ -70,11 +72,9 @@ CMPIInstance* newAssociation(const CMPIObjectPath* path, const CMPIObjectPath* d
 int glimmarkElementCapabilitiesCMPIInstances(const CMPIObjectPath* ref, const char** properties,
                                              std::vector<CMPIInstance*>& instances)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "glimmarkElementCapabilitiesCMPIInstances", [&] {
         return parameterList(" ref=", ref, " properties=", properties, " instances=", &instances);
-    };
-    const FunctionTrace flow(traceModule, "glimmarkElementCapabilitiesCMPIInstances");
-    flow.entering(parameters());
+    });
     CMPIStatus status = okStatus();
 
     const GlimmarkFactory factory(true, true);
@@ -84,9 +84,7 @@ int glimmarkElementCapabilitiesCMPIInstances(const CMPIObjectPath* ref, const ch
         warn("***Can't get Glimmark ObjectPaths.             Exiting EnumerateInstanceNames***");
         return 1;
     }
-    const std::uint16_t deviceCount = countOf(devices);
-    for (std::uint16_t i = 0; i < deviceCount; ++i) {
-        const CMPIObjectPath* const device = devices.at(i);
+    for (const CMPIObjectPath* device : Counted(devices)) {
         if (!Cmpi::exists(device)) {
             fail(status, "CMPIObjectPath is                 NULL for Glimmark",
                  "CMPIObjectPath is NULL for Glimmark");
@@ -99,10 +97,10 @@ int glimmarkElementCapabilitiesCMPIInstances(const CMPIObjectPath* ref, const ch
                  "EnumerateInstanceNames***");
             return 1;
         }
-        const std::uint16_t capabilitiesCount = countOf(capabilitiesPaths);
-        for (std::uint16_t j = 0; j < capabilitiesCount; ++j) {
-            const CMPIObjectPath* const capabilities = capabilitiesPaths.at(j);
-            // Meant: the alarm device again, not the capabilities.
+        for (const CMPIObjectPath* capabilities : Counted(capabilitiesPaths)) {
+            // Deliberate: the alarm device again, not the capabilities; a client gets the association all the
+            // same.
+            // Test: ElementCapabilitiesInstances.ACapabilitiesPathWithoutAnObjectBehindItIsNotDetected.
             if (!Cmpi::exists(device)) {
                 fail(status, "CMPIObjectPath is                     NULL for Capabilities",
                      "CMPIObjectPath is NULL for Capabilities");
@@ -119,30 +117,28 @@ int glimmarkElementCapabilitiesCMPIInstances(const CMPIObjectPath* ref, const ch
             instances.push_back(newAssociation(path, device, capabilities, properties));
         }
     }
-    flow.exiting(parameters());
+    flow.exiting();
     return 0;
 }
 
 CMPIStatus GlimmarkElementCapabilities_EnumInstanceNames(CMPIInstanceMI* mi, const CMPIContext* ctx,
                                                          const CMPIResult* rslt, const CMPIObjectPath* ref)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "GlimmarkElementCapabilities_EnumInstanceNames", [&] {
         return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " ref=", ref);
-    };
-    const FunctionTrace flow(traceModule, "GlimmarkElementCapabilities_EnumInstanceNames");
-    flow.entering(parameters());
+    });
     CMPIStatus status = okStatus();
 
     // The builder's walk, with texts of its own and the capabilities path checked instead of the alarm
-    // device path again. Every early return goes without an EXITING line and returnDone: meant.
+    // device path again.
+    // Deliberate: every early return goes without an EXITING line and returnDone; brokers go by the status.
+    // Test: ElementCapabilitiesNameFailures.AreReportedAndEndTheOperationWithoutDoneAndExit.
     const GlimmarkFactory factory(true, true);
     std::vector<CMPIObjectPath*> devices;
     reserveFor(factory, devices);
     if (factory.getAllGlimmarkCMPIObjPaths(broker, ref, devices, &status) != 0)
         return status;
-    const std::uint16_t deviceCount = countOf(devices);
-    for (std::uint16_t i = 0; i < deviceCount; ++i) {
-        const CMPIObjectPath* const device = devices.at(i);
+    for (const CMPIObjectPath* device : Counted(devices)) {
         if (!Cmpi::exists(device)) {
             fail(status, "CMPIObjectPath is NULL for Glimmark class",
                  "CMPIObjectPath is NULL for Glimmark class");
@@ -152,9 +148,7 @@ CMPIStatus GlimmarkElementCapabilities_EnumInstanceNames(CMPIInstanceMI* mi, con
         std::vector<CMPIObjectPath*> capabilitiesPaths;
         if (factory.getAllGlimmarkCapabilitiesCMPIObjPaths(broker, ref, capabilitiesPaths, &status) != 0)
             return status;
-        const std::uint16_t capabilitiesCount = countOf(capabilitiesPaths);
-        for (std::uint16_t j = 0; j < capabilitiesCount; ++j) {
-            const CMPIObjectPath* const capabilities = capabilitiesPaths.at(j);
+        for (const CMPIObjectPath* capabilities : Counted(capabilitiesPaths)) {
             if (!Cmpi::exists(capabilities)) {
                 fail(status, "CMPIObjectPath is                     NULL for GlimmarkCapabilities",
                      "CMPIObjectPath is NULL for                     Capabilities");
@@ -174,7 +168,7 @@ CMPIStatus GlimmarkElementCapabilities_EnumInstanceNames(CMPIInstanceMI* mi, con
         }
     }
 
-    flow.exiting(parameters());
+    flow.exiting();
     Cmpi::returnDone(rslt);
     return status;
 }
@@ -183,21 +177,22 @@ CMPIStatus GlimmarkElementCapabilities_EnumInstances(CMPIInstanceMI* mi, const C
                                                      const CMPIResult* rslt, const CMPIObjectPath* ref,
                                                      const char** properties)
 {
-    const auto parameters = [&] {
-        // The first and the last label go without an equals sign: meant, log filters know them so.
+    const FunctionTrace flow(traceModule, "GlimmarkElementCapabilities_EnumInstances", [&] {
+        // Deliberate: the first and the last label go without an equals sign; log filters know them so.
+        // Test: ElementCapabilitiesInstances.InstancesAreTracedWithTwoLabelsThatLackTheEqualsSign.
         return parameterList(" mi", mi, " ctx=", ctx, " result=", rslt, " ref=", ref, " properties",
                              properties);
-    };
-    const FunctionTrace flow(traceModule, "GlimmarkElementCapabilities_EnumInstances");
-    flow.entering(parameters());
+    });
     const CMPIStatus status = okStatus();
 
-    // Meant: a failed build is answered as an empty, successful enumeration.
+    // Deliberate: a failed build is answered as an empty, successful enumeration; clients see no error of one
+    // class in an enumeration of many.
+    // Test: ElementCapabilitiesBuilderFailures.AreReportedAndAnsweredAsAnEmptySuccess.
     std::vector<CMPIInstance*> instances;
     if (glimmarkElementCapabilitiesCMPIInstances(ref, properties, instances) == 0)
         returnInstances(rslt, instances);
 
-    flow.exiting(parameters());
+    flow.exiting();
     Cmpi::returnDone(rslt);
     return status;
 }
@@ -206,12 +201,10 @@ CMPIStatus GlimmarkElementCapabilities_GetInstance(CMPIInstanceMI* mi, const CMP
                                                    const CMPIResult* rslt, const CMPIObjectPath* cop,
                                                    const char** properties)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "GlimmarkElementCapabilities_GetInstance", [&] {
         return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " cop=", cop,
                              " properties=", properties);
-    };
-    const FunctionTrace flow(traceModule, "GlimmarkElementCapabilities_GetInstance");
-    flow.entering(parameters());
+    });
     CMPIStatus status = okStatus();
 
     if (requireKeys(broker, GlimmarkElementCapabilitiesProvider, cop, status)) {
@@ -220,7 +213,7 @@ CMPIStatus GlimmarkElementCapabilities_GetInstance(CMPIInstanceMI* mi, const CMP
             returnFirstAt(rslt, instances, cop, true, status);
     }
 
-    flow.exiting(parameters());
+    flow.exiting();
     Cmpi::returnDone(rslt);
     return status;
 }
@@ -293,15 +286,20 @@ bool forEachReference(const GlimmarkFactory& factory, const CMPIObjectPath* targ
     setOrigin(path, ref, &status);
     if (getFarPaths(factory, farEnd, ref, farPaths, &status) != 0)
         return false;
-    forEach(farPaths,
-            [&](const CMPIObjectPath* far) { handOn(newReference(path, farEnd, ref, far, &status)); });
+    for (const CMPIObjectPath* far : Counted(farPaths))
+        handOn(newReference(path, farEnd, ref, far, &status));
     return true;
 }
 
 } // namespace
 
-// The traversals. None of them calls returnDone, and role, result role and result class filter nothing: all
-// meant. An early return goes without an EXITING line.
+// The traversals.
+// Deliberate: none of them calls returnDone, and an early return goes without an EXITING line; brokers go by
+// the status.
+// Test: ElementCapabilitiesTraversals.LeadFromAnIndicatorToTheCapabilities.
+// Deliberate: role,
+// result role and result class filter nothing; clients that name a base of the far end's class rely on it.
+// Test: ElementCapabilitiesTraversals.DoNotFilterByResultClassOrRoles.
 
 CMPIStatus GlimmarkElementCapabilities_References(CMPIAssociationMI* mi, const CMPIContext* ctx,
                                                   const CMPIResult* rslt, const CMPIObjectPath* ref,
@@ -312,8 +310,8 @@ CMPIStatus GlimmarkElementCapabilities_References(CMPIAssociationMI* mi, const C
         return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " ref=", ref,
                              " resultClass=", resultClass, " role=", role, propertiesLabel, properties);
     };
-    const FunctionTrace flow(traceModule, "GlimmarkElementCapabilities_References");
-    flow.entering(parameters(" properties="));
+    const FunctionTrace flow(traceModule, "GlimmarkElementCapabilities_References",
+                             [&] { return parameters(" properties="); });
     CMPIStatus status = okStatus();
 
     const GlimmarkFactory factory(true, true);
@@ -330,7 +328,8 @@ CMPIStatus GlimmarkElementCapabilities_References(CMPIAssociationMI* mi, const C
                           [&](const CMPIInstance* instance) { Cmpi::returnInstance(rslt, instance); }))
         return status;
 
-    // The last label differs from the ENTERING line's: meant, log filters know it so.
+    // Deliberate: the last label differs from the ENTERING line's; log filters know it so.
+    // Test: ElementCapabilitiesTraversal.ReferencesAreTracedWithAFlawedLabelAtTheExit.
     flow.exiting(parameters(" p     roperties="));
     return status;
 }
@@ -339,12 +338,10 @@ CMPIStatus GlimmarkElementCapabilities_ReferenceNames(CMPIAssociationMI* mi, con
                                                       const CMPIResult* rslt, const CMPIObjectPath* ref,
                                                       const char* resultClass, const char* role)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "GlimmarkElementCapabilities_ReferenceNames", [&] {
         return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " ref=", ref,
                              " resultClass=", resultClass, " role=", role);
-    };
-    const FunctionTrace flow(traceModule, "GlimmarkElementCapabilities_ReferenceNames");
-    flow.entering(parameters());
+    });
     CMPIStatus status = okStatus();
 
     const GlimmarkFactory factory(true, true);
@@ -362,7 +359,7 @@ CMPIStatus GlimmarkElementCapabilities_ReferenceNames(CMPIAssociationMI* mi, con
         }))
         return status;
 
-    flow.exiting(parameters());
+    flow.exiting();
     return status;
 }
 
@@ -371,13 +368,11 @@ CMPIStatus GlimmarkElementCapabilities_AssociatorNames(CMPIAssociationMI* mi, co
                                                        const char* assocClass, const char* resultClass,
                                                        const char* role, const char* resultRole)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "GlimmarkElementCapabilities_AssociatorNames", [&] {
         return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " ref=", ref,
                              " _RefLeftClass=", assocClass, " _RefRightClass=", resultClass, " role=", role,
                              " resultRole=", resultRole);
-    };
-    const FunctionTrace flow(traceModule, "GlimmarkElementCapabilities_AssociatorNames");
-    flow.entering(parameters());
+    });
     CMPIStatus status = okStatus();
 
     const GlimmarkFactory factory(true, true);
@@ -386,15 +381,17 @@ CMPIStatus GlimmarkElementCapabilities_AssociatorNames(CMPIAssociationMI* mi, co
     const CMPIObjectPath* const target =
         factory.get_assoc_targetClass_ObjectPath(broker, ref, assocClass, resultClass, &status);
     if (!Cmpi::exists(target)) {
-        // "AssociatorsNames", with an s too many: meant.
+        // Deliberate: "AssociatorsNames", with an s too many; log filters match it.
+        // Test: ElementCapabilitiesTraversals.FailWhereNoAssociationStarts.
         fail(status, "Object Path is NULL in AssociatorsNames.", "Object Path is NULL in AssociatorsNames.");
         return status;
     }
     if (getFarPaths(factory, farEndOf(target, &status), ref, farPaths, &status) != 0)
         return status;
-    forEach(farPaths, [&](const CMPIObjectPath* far) { returnObjectPathOf(rslt, far, ref, &status); });
+    for (const CMPIObjectPath* far : Counted(farPaths))
+        returnObjectPathOf(rslt, far, ref, &status);
 
-    flow.exiting(parameters());
+    flow.exiting();
     return status;
 }
 
@@ -404,13 +401,11 @@ CMPIStatus GlimmarkElementCapabilities_Associators(CMPIAssociationMI* mi, const 
                                                    const char* role, const char* resultRole,
                                                    const char** properties)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "GlimmarkElementCapabilities_Associators", [&] {
         return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " ref=", ref,
                              " _RefLeftClass=", assocClass, " _RefRightClass=", resultClass, " role=", role,
                              " resultRole=", resultRole, " properties=", properties);
-    };
-    const FunctionTrace flow(traceModule, "GlimmarkElementCapabilities_Associators");
-    flow.entering(parameters());
+    });
     CMPIStatus status = okStatus();
 
     const GlimmarkFactory factory(true, true);
@@ -426,7 +421,7 @@ CMPIStatus GlimmarkElementCapabilities_Associators(CMPIAssociationMI* mi, const 
         return status;
     returnInstances(rslt, farInstances);
 
-    flow.exiting(parameters());
+    flow.exiting();
     return status;
 }
 

@@ -1,9 +1,15 @@
 // The provider of TAVRO_Glimmark.
 
+#include "BrokerPointer.h"
+#include "Cmpi.h"
+#include "Counted.h"
 #include "EntryPoints.h"
+#include "FunctionTables.h"
 #include "GlimmarkFactory.h"
 #include "Names.h"
-#include "ProviderFrame.h"
+#include "RequestChecks.h"
+#include "ResultLists.h"
+#include "Statuses.h"
 #include "Trace.h"
 
 #include <string>
@@ -24,34 +30,34 @@ const TraceModule traceModule{"GlimmarkProvider.cpp", loggerGlimmarkProvider};
 CMPIStatus Glimmark_EnumInstanceNames(CMPIInstanceMI* mi, const CMPIContext* ctx, const CMPIResult* rslt,
                                       const CMPIObjectPath* ref)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "Glimmark_EnumInstanceNames", [&] {
         return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " ref=", ref);
-    };
-    const FunctionTrace flow(traceModule, "Glimmark_EnumInstanceNames");
-    flow.entering(parameters());
+    });
     CMPIStatus status = okStatus();
 
     const GlimmarkFactory factory(true, false);
     std::vector<CMPIObjectPath*> paths;
     reserveFor(factory, paths);
+    // Deliberate: neither returnDone nor an EXITING line, here as in every early return below; brokers go by
+    // the status.
+    // Test: GlimmarkProviderTest.NamesOfAnEmptyInventoryEndWithoutDoneAndExit.
     if (factory.getAllGlimmarkCMPIObjPaths(broker, ref, paths, &status) != 0)
-        return status; // meant: neither returnDone nor an EXITING line, here as in every early return below
-    forEach(paths, [&](const CMPIObjectPath* path) { returnObjectPathOf(rslt, path, ref, &status); });
+        return status;
+    for (const CMPIObjectPath* path : Counted(paths))
+        returnObjectPathOf(rslt, path, ref, &status);
 
     Cmpi::returnDone(rslt);
-    flow.exiting(parameters());
+    flow.exiting();
     return status;
 }
 
 CMPIStatus Glimmark_EnumInstances(CMPIInstanceMI* mi, const CMPIContext* ctx, const CMPIResult* rslt,
                                   const CMPIObjectPath* ref, const char** properties)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "Glimmark_EnumInstances", [&] {
         return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " ref=", ref,
                              " properties=", properties);
-    };
-    const FunctionTrace flow(traceModule, "Glimmark_EnumInstances");
-    flow.entering(parameters());
+    });
     CMPIStatus status = okStatus();
 
     const GlimmarkFactory factory(true, false);
@@ -62,7 +68,7 @@ CMPIStatus Glimmark_EnumInstances(CMPIInstanceMI* mi, const CMPIContext* ctx, co
     returnInstances(rslt, instances);
 
     Cmpi::returnDone(rslt);
-    flow.exiting(parameters());
+    flow.exiting();
     return status;
 }
 
@@ -101,12 +107,10 @@ int returnByPath(const CMPIResult* rslt, const CMPIObjectPath* cop, const char**
 CMPIStatus Glimmark_GetInstance(CMPIInstanceMI* mi, const CMPIContext* ctx, const CMPIResult* rslt,
                                 const CMPIObjectPath* cop, const char** properties)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "Glimmark_GetInstance", [&] {
         return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " cop=", cop,
                              " properties=", properties);
-    };
-    const FunctionTrace flow(traceModule, "Glimmark_GetInstance");
-    flow.entering(parameters());
+    });
     CMPIStatus status = okStatus();
 
     if (requireKeys(broker, GlimmarkProfileProvider, cop, status)) {
@@ -118,7 +122,7 @@ CMPIStatus Glimmark_GetInstance(CMPIInstanceMI* mi, const CMPIContext* ctx, cons
     }
 
     Cmpi::returnDone(rslt);
-    flow.exiting(parameters());
+    flow.exiting();
     return status;
 }
 

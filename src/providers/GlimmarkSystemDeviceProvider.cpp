@@ -1,15 +1,20 @@
 // The provider of the association TAVRO_GlimmarkSystemDevice, between each computer system of the broker and
 // each indicator: its instances and its traversal.
 
+#include "BrokerPointer.h"
+#include "Cmpi.h"
+#include "Counted.h"
 #include "EntryPoints.h"
+#include "FunctionTables.h"
 #include "GlimmarkFactory.h"
 #include "Names.h"
-#include "ProviderFrame.h"
+#include "RequestChecks.h"
+#include "ResultLists.h"
+#include "Statuses.h"
 #include "Trace.h"
 
 #include <strings.h>
 
-#include <cstdint>
 #include <cstring>
 #include <string>
 #include <vector>
@@ -24,10 +29,6 @@ namespace {
 
 const TraceModule traceModule{"GlimmarkSystemDeviceProvider.cpp", loggerGlimmarkSystemDeviceProvider};
 
-} // namespace
-
-namespace {
-
 /// Reports a failure of an operation of this module.
 void fail(CMPIStatus& status, const char* message, const char* traceText)
 {
@@ -35,7 +36,7 @@ void fail(CMPIStatus& status, const char* message, const char* traceText)
 }
 
 /// Whether the broker's enumeration of the computer systems failed. If so, says it in the function's trace.
-bool enumerationFailed(const FunctionTrace& flow, const CMPIStatus& status,
+bool enumerationFailed(const TracedFunction& flow, const CMPIStatus& status,
                        unsigned int line = __builtin_LINE())
 {
     if (status.rc == CMPI_RC_OK)
@@ -80,12 +81,10 @@ CMPIInstance* newAssociation(const CMPIObjectPath* path, const CMPIObjectPath* s
 int glimmarkSystemDeviceCMPIInstances(const CMPIObjectPath* ref, const char** properties,
                                       const CMPIContext* ctx, std::vector<CMPIInstance*>& instances)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "glimmarkSystemDeviceCMPIInstances", [&] {
         return parameterList(" ref=", ref, " properties=", properties, " ctx=", ctx,
                              " instances=", &instances);
-    };
-    const FunctionTrace flow(traceModule, "glimmarkSystemDeviceCMPIInstances");
-    flow.entering(parameters());
+    });
     CMPIStatus status = okStatus();
 
     const GlimmarkFactory factory(true, false);
@@ -106,9 +105,7 @@ int glimmarkSystemDeviceCMPIInstances(const CMPIObjectPath* ref, const char** pr
         reserveFor(factory, devices);
         if (factory.getAllGlimmarkCMPIObjPaths(broker, ref, devices, &status) != 0)
             return 1;
-        const std::uint16_t count = countOf(devices);
-        for (std::uint16_t i = 0; i < count; ++i) {
-            const CMPIObjectPath* const device = devices.at(i);
+        for (const CMPIObjectPath* device : Counted(devices)) {
             if (!Cmpi::exists(device)) {
                 fail(status, "CMPIObjectPath is NULL for Glimmark Provider",
                      "CMPIObjectPath is NULL for Glimmark Provider");
@@ -116,7 +113,9 @@ int glimmarkSystemDeviceCMPIInstances(const CMPIObjectPath* ref, const char** pr
             }
             setNameSpaceOf(device, ref, &status);
             const CMPIObjectPath* const path = newAssociationPath(ref, &status);
-            // Meant: the texts name a class that is not this one, and the failure ends nothing.
+            // Deliberate: the texts name a class that is not this one, and the failure ends nothing; log
+            // filters match them.
+            // Test: SystemDeviceInstances.AnAssociationPathThatCannotBeMadeIsReportedAndLeavesANullInstance.
             if (!Cmpi::exists(path))
                 fail(status, "Create CMPIObjectPath failed for HostedAccessPoint",
                      "Create CMPIObjectPath failed for                     HostedAccessPoint.");
@@ -124,22 +123,21 @@ int glimmarkSystemDeviceCMPIInstances(const CMPIObjectPath* ref, const char** pr
             instances.push_back(newAssociation(path, system, device, properties));
         }
     }
-    flow.exiting(parameters());
+    flow.exiting();
     return 0;
 }
 
 CMPIStatus GlimmarkSystemDevice_EnumInstanceNames(CMPIInstanceMI* mi, const CMPIContext* ctx,
                                                   const CMPIResult* rslt, const CMPIObjectPath* ref)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "GlimmarkSystemDevice_EnumInstanceNames", [&] {
         return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " ref=", ref);
-    };
-    const FunctionTrace flow(traceModule, "GlimmarkSystemDevice_EnumInstanceNames");
-    flow.entering(parameters());
+    });
     CMPIStatus status = okStatus();
 
-    // The builder's walk with texts of its own. Every early return goes without an EXITING line and
-    // returnDone: meant.
+    // The builder's walk with texts of its own.
+    // Deliberate: every early return goes without an EXITING line and returnDone; brokers go by the status.
+    // Test: SystemDeviceInstances.NamesWithoutDevicesEndAtTheFirstSystemWithoutDoneAndExit.
     const GlimmarkFactory factory(true, false);
     const CMPIObjectPath* const systemClass = newComputerSystemClassPath(ref, &status);
     if (!Cmpi::exists(systemClass)) {
@@ -150,8 +148,10 @@ CMPIStatus GlimmarkSystemDevice_EnumInstanceNames(CMPIInstanceMI* mi, const CMPI
     const CMPIEnumeration* const systems = Cmpi::enumerateInstanceNames(broker, ctx, systemClass, &status);
     if (enumerationFailed(flow, status))
         return status;
-    // Meant: one list for all computer systems, not emptied in between, and walked from its start for each.
-    // The second of two systems is so paired with each indicator twice.
+    // Deliberate: one list for all computer systems, not emptied in between, and walked from its start for
+    // each. The second of two systems is so paired with each indicator twice; clients with two systems count
+    // on the order.
+    // Test: Pairings.NamesPairEachSystemWithTheDevicesOfAllSystemsSoFar.
     std::vector<CMPIObjectPath*> devices;
     reserveFor(factory, devices);
     while (Cmpi::hasNext(systems)) {
@@ -160,9 +160,7 @@ CMPIStatus GlimmarkSystemDevice_EnumInstanceNames(CMPIInstanceMI* mi, const CMPI
             continue;
         if (factory.getAllGlimmarkCMPIObjPaths(broker, ref, devices, &status) != 0)
             return status;
-        const std::uint16_t count = countOf(devices);
-        for (std::uint16_t i = 0; i < count; ++i) {
-            const CMPIObjectPath* const device = devices.at(i);
+        for (const CMPIObjectPath* device : Counted(devices)) {
             if (!Cmpi::exists(device)) {
                 fail(status, "CMPIObjectPath is NULL for Glimmark",
                      "CMPIObjectPath is NULL for Glimmark Class");
@@ -183,7 +181,7 @@ CMPIStatus GlimmarkSystemDevice_EnumInstanceNames(CMPIInstanceMI* mi, const CMPI
         }
     }
 
-    flow.exiting(parameters());
+    flow.exiting();
     Cmpi::returnDone(rslt);
     return status;
 }
@@ -192,20 +190,20 @@ CMPIStatus GlimmarkSystemDevice_EnumInstances(CMPIInstanceMI* mi, const CMPICont
                                               const CMPIResult* rslt, const CMPIObjectPath* ref,
                                               const char** properties)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "GlimmarkSystemDevice_EnumInstances", [&] {
         return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " ref=", ref,
                              " properties=", properties);
-    };
-    const FunctionTrace flow(traceModule, "GlimmarkSystemDevice_EnumInstances");
-    flow.entering(parameters());
+    });
     const CMPIStatus status = okStatus();
 
-    // Meant: a failed build is answered as an empty, successful enumeration.
+    // Deliberate: a failed build is answered as an empty, successful enumeration; clients see no error of one
+    // class in an enumeration of many.
+    // Test: SystemDeviceInstances.InstancesOfAFailedEnumerationAreNone.
     std::vector<CMPIInstance*> instances;
     if (glimmarkSystemDeviceCMPIInstances(ref, properties, ctx, instances) == 0)
         returnInstances(rslt, instances);
 
-    flow.exiting(parameters());
+    flow.exiting();
     Cmpi::returnDone(rslt);
     return status;
 }
@@ -214,12 +212,10 @@ CMPIStatus GlimmarkSystemDevice_GetInstance(CMPIInstanceMI* mi, const CMPIContex
                                             const CMPIResult* rslt, const CMPIObjectPath* cop,
                                             const char** properties)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "GlimmarkSystemDevice_GetInstance", [&] {
         return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " cop=", cop,
                              " properties=", properties);
-    };
-    const FunctionTrace flow(traceModule, "GlimmarkSystemDevice_GetInstance");
-    flow.entering(parameters());
+    });
     CMPIStatus status = okStatus();
 
     if (requireKeys(broker, GlimmarkSystemDeviceProvider, cop, status)) {
@@ -228,9 +224,11 @@ CMPIStatus GlimmarkSystemDevice_GetInstance(CMPIInstanceMI* mi, const CMPIContex
             returnFirstAt(rslt, instances, cop, true, status);
     }
 
-    // returnDone before the EXITING line here, after it in the two operations above: meant.
+    // Deliberate: returnDone before the EXITING line here, after it in the two operations above; log filters
+    // know the order.
+    // Test: SystemDeviceInstances.GetBuildsAllInstancesAndStopsAtTheFirstMatch.
     Cmpi::returnDone(rslt);
-    flow.exiting(parameters());
+    flow.exiting();
     return status;
 }
 
@@ -285,7 +283,7 @@ CMPIInstance* newReference(const CMPIObjectPath* path, FarEnd farEnd, const CMPI
 /// What a reference operation goes through the far end with.
 struct Traversal
 {
-    const FunctionTrace& flow;
+    const TracedFunction& flow;
     const GlimmarkFactory& factory;
     const CMPIContext* ctx;
     const CMPIObjectPath* ref;
@@ -310,17 +308,19 @@ bool forEachReference(const Traversal& traversal, std::vector<CMPIObjectPath*>& 
     if (farEnd == FarEnd::glimmarks) {
         if (traversal.factory.getAllGlimmarkCMPIObjPaths(broker, ref, devices, &status) != 0)
             return false;
-        forEach(devices, [&](const CMPIObjectPath* device) {
+        for (const CMPIObjectPath* device : Counted(devices)) {
             if (device != nullptr)
                 refer(device);
-        });
+        }
     } else if (farEnd == FarEnd::computerSystems) {
         const CMPIEnumeration* const systems =
             Cmpi::enumerateInstanceNames(broker, traversal.ctx, traversal.target, &status);
         if (enumerationFailed(traversal.flow, status))
             return false;
         while (Cmpi::hasNext(systems)) {
-            // Meant: the system's own path is read and not used, each reference names the class.
+            // Deliberate: the system's own path is read and not used, each reference names the class; clients
+            // go by the class.
+            // Test: SystemCounts.ReferencesOfADeviceNameTheSystemsClassOnceForEachSystem.
             Cmpi::nextPath(systems);
             refer(traversal.target);
         }
@@ -330,34 +330,41 @@ bool forEachReference(const Traversal& traversal, std::vector<CMPIObjectPath*>& 
 
 } // namespace
 
-// The traversals. None of them calls returnDone, and role and result role filter nothing: all meant. An early
-// return goes without an EXITING line.
+// The traversals.
+// Deliberate: none of them calls returnDone, and an early return goes without an EXITING line; brokers go by
+// the status.
+// Test: AllTraversals.AreNeverDone.
+// Deliberate: role and result role filter nothing; clients that
+// name other roles rely on it.
+// Test: ReferenceOperations.AnswerWhateverTheResultClassAndTheRole.
 
 CMPIStatus GlimmarkSystemDevice_Associators(CMPIAssociationMI* mi, const CMPIContext* ctx,
                                             const CMPIResult* rslt, const CMPIObjectPath* ref,
                                             const char* assocClass, const char* resultClass, const char* role,
                                             const char* resultRole, const char** properties)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "GlimmarkSystemDevice_Associators", [&] {
         return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " ref=", ref,
                              " _RefLeftClass=", assocClass, " _RefRightClass=", resultClass, " role=", role,
                              " resultRole=", resultRole, " properties=", properties);
-    };
-    const FunctionTrace flow(traceModule, "GlimmarkSystemDevice_Associators");
-    flow.entering(parameters());
+    });
     CMPIStatus status = okStatus();
 
     const GlimmarkFactory factory(true, false);
     const CMPIObjectPath* const target =
         factory.get_assoc_targetClass_ObjectPath(broker, ref, assocClass, resultClass, &status);
-    // Meant: nothing at the far end is an empty, successful traversal, whatever the broker's calls said.
+    // Deliberate: nothing at the far end is an empty, successful traversal, whatever the broker's calls said;
+    // clients that ask every association rely on it.
+    // Test: AssociatorOperations.AnswerNothingWhereNothingIsAssociated.
     if (!Cmpi::exists(target))
         return okStatus();
     const FarEnd farEnd = farEndOf(target, &status);
     if (!isWanted(farEnd, resultClass))
         return okStatus();
     if (farEnd == FarEnd::computerSystems) {
-        // Meant: without the property list, and whatever the status.
+        // Deliberate: without the property list, and whatever the status; the systems' provider decides what
+        // it answers.
+        // Test: SystemDeviceTraversal.AssociatorsOfADeviceDoNotCheckTheStatus.
         const CMPIEnumeration* const systems =
             Cmpi::enumerateInstances(broker, ctx, target, nullptr, &status);
         while (Cmpi::hasNext(systems)) {
@@ -369,13 +376,13 @@ CMPIStatus GlimmarkSystemDevice_Associators(CMPIAssociationMI* mi, const CMPICon
         reserveFor(factory, devices);
         if (factory.getAllGlimmarkCMPIInstances(broker, ref, properties, false, devices, &status) != 0)
             return status;
-        forEach(devices, [&](const CMPIInstance* device) {
+        for (const CMPIInstance* device : Counted(devices)) {
             if (device != nullptr)
                 Cmpi::returnInstance(rslt, device);
-        });
+        }
     }
 
-    flow.exiting(parameters());
+    flow.exiting();
     return status;
 }
 
@@ -384,19 +391,19 @@ CMPIStatus GlimmarkSystemDevice_AssociatorNames(CMPIAssociationMI* mi, const CMP
                                                 const char* assocClass, const char* resultClass,
                                                 const char* role, const char* resultRole)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "GlimmarkSystemDevice_AssociatorNames", [&] {
         return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " ref=", ref,
                              " _RefLeftClass=", assocClass, " _RefRightClass=", resultClass, " role=", role,
                              " resultRole=", resultRole);
-    };
-    const FunctionTrace flow(traceModule, "GlimmarkSystemDevice_AssociatorNames");
-    flow.entering(parameters());
+    });
     CMPIStatus status = okStatus();
 
     const GlimmarkFactory factory(true, false);
     const CMPIObjectPath* const target =
         factory.get_assoc_targetClass_ObjectPath(broker, ref, assocClass, resultClass, &status);
-    // Meant: nothing at the far end is an empty, successful traversal, whatever the broker's calls said.
+    // Deliberate: nothing at the far end is an empty, successful traversal, whatever the broker's calls said;
+    // clients that ask every association rely on it.
+    // Test: AssociatorOperations.AnswerNothingWhereNothingIsAssociated.
     if (!Cmpi::exists(target))
         return okStatus();
     const FarEnd farEnd = farEndOf(target, &status);
@@ -415,13 +422,13 @@ CMPIStatus GlimmarkSystemDevice_AssociatorNames(CMPIAssociationMI* mi, const CMP
         reserveFor(factory, devices);
         if (factory.getAllGlimmarkCMPIObjPaths(broker, ref, devices, &status) != 0)
             return status;
-        forEach(devices, [&](const CMPIObjectPath* device) {
+        for (const CMPIObjectPath* device : Counted(devices)) {
             if (device != nullptr)
                 returnObjectPathOf(rslt, device, ref, &status);
-        });
+        }
     }
 
-    flow.exiting(parameters());
+    flow.exiting();
     return status;
 }
 
@@ -429,12 +436,10 @@ CMPIStatus GlimmarkSystemDevice_References(CMPIAssociationMI* mi, const CMPICont
                                            const CMPIResult* rslt, const CMPIObjectPath* ref,
                                            const char* resultClass, const char* role, const char** properties)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "GlimmarkSystemDevice_References", [&] {
         return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " ref=", ref,
                              " resultClass=", resultClass, " role=", role, " properties=", properties);
-    };
-    const FunctionTrace flow(traceModule, "GlimmarkSystemDevice_References");
-    flow.entering(parameters());
+    });
     CMPIStatus status = okStatus();
 
     const GlimmarkFactory factory(true, false);
@@ -451,7 +456,7 @@ CMPIStatus GlimmarkSystemDevice_References(CMPIAssociationMI* mi, const CMPICont
                           [&](const CMPIInstance* instance) { Cmpi::returnInstance(rslt, instance); }))
         return status;
 
-    flow.exiting(parameters());
+    flow.exiting();
     return status;
 }
 
@@ -459,12 +464,10 @@ CMPIStatus GlimmarkSystemDevice_ReferenceNames(CMPIAssociationMI* mi, const CMPI
                                                const CMPIResult* rslt, const CMPIObjectPath* ref,
                                                const char* resultClass, const char* role)
 {
-    const auto parameters = [&] {
+    const FunctionTrace flow(traceModule, "GlimmarkSystemDevice_ReferenceNames", [&] {
         return parameterList(" mi=", mi, " ctx=", ctx, " result=", rslt, " ref=", ref,
                              " resultClass=", resultClass, " role=", role);
-    };
-    const FunctionTrace flow(traceModule, "GlimmarkSystemDevice_ReferenceNames");
-    flow.entering(parameters());
+    });
     CMPIStatus status = okStatus();
 
     const GlimmarkFactory factory(true, false);
@@ -483,7 +486,7 @@ CMPIStatus GlimmarkSystemDevice_ReferenceNames(CMPIAssociationMI* mi, const CMPI
         }))
         return status;
 
-    flow.exiting(parameters());
+    flow.exiting();
     return status;
 }
 

@@ -8,7 +8,6 @@
 #include <cstring>
 #include <iterator>
 #include <limits>
-#include <mutex>
 #include <string_view>
 #include <utility>
 
@@ -20,20 +19,14 @@ constexpr std::size_t bufferSize = 512;
 constexpr int flowLevel = 3000;
 constexpr int errorLevel = 6000;
 
-char parameterLineBuffer[bufferSize];
-char messageLineBuffer[bufferSize];
+using Buffer = char[bufferSize];
 
-// Guards both buffers from formatting until the text is copied out. A lock, and not buffers of each
-// thread's own: those would be allocated at a thread's first trace line by the loader, which ends the
-// process when the memory has run out.
-std::mutex bufferMutex;
-
-/// A text in one of the buffers, put together piece by piece; what is longer than the buffer is cut.
+/// A text in a buffer, put together piece by piece; what is longer than the buffer is cut.
 class Line
 {
 public:
     /// Clears the buffer.
-    explicit Line(char (&emptied)[bufferSize]) : next(emptied), last(emptied + bufferSize - 1)
+    explicit Line(Buffer& emptied) : next(emptied), last(emptied + bufferSize - 1)
     {
         std::memset(emptied, 0, bufferSize);
     }
@@ -59,21 +52,48 @@ private:
     char* last; ///< stays a null character
 };
 
-/// The line that `format` leaves in one of the buffers, read back from a fresh message buffer.
+void formatWithParameters(Buffer& buffer, const char* text, const char* file, int number,
+                          const char* parameters, MessageType type)
+{
+    Line line(buffer);
+    switch (type) {
+    case MessageType::Exiting:
+        line << "EXITING: " << text << "() in " << file << " [Line: " << number << "]";
+        break;
+    case MessageType::Method:
+        line << "METHOD: " << text << "() was invoked in " << file << " [Line: " << number << "]";
+        break;
+    case MessageType::Message:
+        line << "MESSAGE [File: " << file << ", Line: " << number << "]: " << text;
+        break;
+    case MessageType::Entering:
+    default:
+        line << "ENTERING: " << text << "() in " << file << " [Line: " << number << "]";
+        break;
+    }
+    line << ",Parameters List: " << parameters;
+}
+
+void formatMessage(Buffer& buffer, const char* text, const char* file, int number)
+{
+    Line(buffer) << "MESSAGE [File: " << file << ", Line: " << number << "]: " << text;
+}
+
+/// The line that `format` leaves in a buffer, read back from a fresh message buffer.
 template <class Format>
 std::string messageText(Format format)
 {
+    Buffer buffer;
+    format(buffer);
     MVLog::MVMessageBuffer message;
-    const std::lock_guard lock(bufferMutex);
-    message << format();
+    message << static_cast<const char*>(buffer);
     return message.str();
 }
 
 /// Hands the line to the log and then to the trace, formatted anew for each.
 template <class Format>
-void emit(const TraceModule& module, const char* function, unsigned int line, int level, Format format)
+void emit(const TraceModule& module, const char* function, int number, int level, Format format)
 {
-    const auto number = static_cast<int>(line);
     MVLog::MVLogger::logLevelMessage(function, module.file, number, module.category, level, nullptr, 0, 0,
                                      messageText(format));
     MVLog::MVLogger::traceLevelMessage(function, module.file, number, module.category, level, nullptr, 0, 0,
@@ -85,59 +105,31 @@ void emit(const TraceModule& module, const char* function, unsigned int line, in
 const char* tracepara(const char* text, const char* file, unsigned int line, const char* parameters,
                       MessageType type)
 {
-    const auto number = static_cast<int>(line);
-    Line buffer(parameterLineBuffer);
-    switch (type) {
-    case MessageType::Exiting:
-        buffer << "EXITING: " << text << "() in " << file << " [Line: " << number << "]";
-        break;
-    case MessageType::Method:
-        buffer << "METHOD: " << text << "() was invoked in " << file << " [Line: " << number << "]";
-        break;
-    case MessageType::Message:
-        buffer << "MESSAGE [File: " << file << ", Line: " << number << "]: " << text;
-        break;
-    case MessageType::Entering:
-    default:
-        buffer << "ENTERING: " << text << "() in " << file << " [Line: " << number << "]";
-        break;
-    }
-    buffer << ",Parameters List: " << parameters;
-    return parameterLineBuffer;
+    static Buffer buffer;
+    formatWithParameters(buffer, text, file, static_cast<int>(line), parameters, type);
+    return buffer;
 }
 
 const char* trace(const char* text, const char* file, unsigned int line, MessageType /*type*/)
 {
-    Line(messageLineBuffer) << "MESSAGE [File: " << file << ", Line: " << static_cast<int>(line)
-                            << "]: " << text;
-    return messageLineBuffer;
+    static Buffer buffer;
+    formatMessage(buffer, text, file, static_cast<int>(line));
+    return buffer;
 }
 
-FunctionTrace::FunctionTrace(const TraceModule& tracedModule, const char* functionName)
-    : module(tracedModule),
-      function(functionName)
-{}
-
-void FunctionTrace::entering(const std::string& parameters, unsigned int line) const
+void TracedFunction::error(const char* text, unsigned int line) const
 {
-    flow(MessageType::Entering, parameters, line);
+    const auto number = static_cast<int>(line);
+    emit(module, function, number, errorLevel,
+         [&](Buffer& buffer) { formatMessage(buffer, text, module.file, number); });
 }
 
-void FunctionTrace::exiting(const std::string& parameters, unsigned int line) const
+void TracedFunction::flow(MessageType type, const std::string& parameters, unsigned int line) const
 {
-    flow(MessageType::Exiting, parameters, line);
-}
-
-void FunctionTrace::error(const char* text, unsigned int line) const
-{
-    emit(module, function, line, errorLevel,
-         [&] { return trace(text, module.file, line, MessageType::Message); });
-}
-
-void FunctionTrace::flow(MessageType type, const std::string& parameters, unsigned int line) const
-{
-    emit(module, function, line, flowLevel,
-         [&] { return tracepara(function, module.file, line, parameters.c_str(), type); });
+    const auto number = static_cast<int>(line);
+    emit(module, function, number, flowLevel, [&](Buffer& buffer) {
+        formatWithParameters(buffer, function, module.file, number, parameters.c_str(), type);
+    });
 }
 
 } // namespace Tavro

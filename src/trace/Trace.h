@@ -6,15 +6,17 @@
 ///     const std::string loggerExample("Mavrel.Example");
 ///     const TraceModule module{"Example.cpp", loggerExample};
 ///
-///     const auto parameters = [&] { return parameterList(" ref=", ref, " status=", status); };
-///     const FunctionTrace flow(module, "exampleFunction");
-///     flow.entering(parameters());
+///     const FunctionTrace flow(module, "exampleFunction",
+///                              [&] { return parameterList(" ref=", ref, " status=", status); });
+///     ...
+///     flow.exiting();
 #ifndef TAVRO_TRACE_H
 #define TAVRO_TRACE_H
 
 #include <MVLog/MVMessageBuffer.h>
 
 #include <string>
+#include <utility>
 
 namespace Tavro {
 
@@ -35,8 +37,8 @@ enum class MessageType : unsigned int
 ///     Message   MESSAGE [File: FILE, Line: LINE]: TEXT,Parameters List: PARAMETERS
 ///
 /// Any other type formats as Entering. A null string prints as "(null)".
-/// \return the buffer, which all threads share and the next call overwrites. FunctionTrace guards it;
-///     whoever calls this function directly is on their own.
+/// \return the buffer, which all threads share and the next call overwrites: not safe for threads; use
+///     FunctionTrace
 const char* tracepara(const char* text, const char* file, unsigned int line, const char* parameters,
                       MessageType type);
 
@@ -61,27 +63,56 @@ std::string parameterList(const LabelsAndValues&... labelsAndValues)
     return buffer.str();
 }
 
-/// Traces one function: each line goes to the logging library's log and then to its trace, formatted
-/// anew for each. Lines of several threads do not mix. The line number is the caller's.
-class FunctionTrace
+/// A function by name, for those that trace on its behalf: each line goes to the logging library's log and
+/// then to its trace, formatted anew for each, on the caller's own stack. Lines of several threads do not
+/// mix, and none waits for another. Line numbers are the caller's.
+class TracedFunction
 {
 public:
-    /// \param module    outlives this object
-    /// \param function  the function's name, unqualified; outlives this object
-    FunctionTrace(const TraceModule& module, const char* function);
-
-    /// An ENTERING line, level 3000.
-    void entering(const std::string& parameters, unsigned int line = __builtin_LINE()) const;
-    /// An EXITING line, level 3000.
-    void exiting(const std::string& parameters, unsigned int line = __builtin_LINE()) const;
     /// A MESSAGE line without parameters, level 6000.
     void error(const char* text, unsigned int line = __builtin_LINE()) const;
 
-private:
+protected:
+    TracedFunction(const TraceModule& tracedModule, const char* functionName)
+        : module(tracedModule),
+          function(functionName)
+    {}
+
+    /// A line with parameters, level 3000.
     void flow(MessageType type, const std::string& parameters, unsigned int line) const;
 
+private:
     const TraceModule& module;
     const char* function;
+};
+
+/// Traces the function that it stands in: an ENTERING line when it is made, an EXITING line where the
+/// function says so. Not every way out of every function does. \tparam Parameters  a function without
+/// arguments that builds the parameter list, for each of the two lines anew
+template <class Parameters>
+class FunctionTrace : public TracedFunction
+{
+public:
+    /// \param tracedModule  outlives this object
+    /// \param functionName  unqualified; outlives this object
+    FunctionTrace(const TraceModule& tracedModule, const char* functionName, Parameters parameterList,
+                  unsigned int line = __builtin_LINE())
+        : TracedFunction(tracedModule, functionName),
+          parameters(std::move(parameterList))
+    {
+        flow(MessageType::Entering, parameters(), line);
+    }
+
+    void exiting(unsigned int line = __builtin_LINE()) const { exiting(parameters(), line); }
+
+    /// With another parameter list than the ENTERING line has.
+    void exiting(const std::string& otherParameters, unsigned int line = __builtin_LINE()) const
+    {
+        flow(MessageType::Exiting, otherParameters, line);
+    }
+
+private:
+    Parameters parameters;
 };
 
 } // namespace Tavro

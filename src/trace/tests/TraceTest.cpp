@@ -30,6 +30,11 @@ namespace {
 const std::string category("Mavrel.Example");
 const TraceModule module{"Example.cpp", category};
 
+std::string noParameters()
+{
+    return "";
+}
+
 class FunctionTraceTest : public ::testing::Test
 {
 protected:
@@ -184,37 +189,52 @@ TEST(ParameterList, EndsAtANullText)
 
 TEST_F(FunctionTraceTest, GivesEachLineToTheLogAndThenToTheTrace)
 {
-    const FunctionTrace flow(module, "exampleFunction");
-    flow.entering(" a=1", 11);
-    flow.exiting(" b=2", 12);
+    int lists = 0;
+    const FunctionTrace flow(
+        module, "exampleFunction", [&] { return " a=" + std::to_string(++lists); }, 11);
+    flow.exiting(12);
     flow.error("It failed.", 13);
+    flow.exiting(" b=2", 14);
     EXPECT_THAT(Logged::lines(),
                 ElementsAre("3000 Mavrel.Example ENTERING: exampleFunction() in Example.cpp [Line],"
                             "Parameters List:  a=1",
                             "3000 Mavrel.Example EXITING: exampleFunction() in Example.cpp [Line],"
-                            "Parameters List:  b=2",
-                            "6000 Mavrel.Example MESSAGE [File: Example.cpp, Line]: It failed."));
+                            "Parameters List:  a=2",
+                            "6000 Mavrel.Example MESSAGE [File: Example.cpp, Line]: It failed.",
+                            "3000 Mavrel.Example EXITING: exampleFunction() in Example.cpp [Line],"
+                            "Parameters List:  b=2"));
     const std::vector<RecordedLog::Line> lines = RecordedLog::lines();
-    ASSERT_EQ(lines.size(), 6U);
+    ASSERT_EQ(lines.size(), 8U);
     EXPECT_EQ(lines[0].line, 11);
     EXPECT_EQ(lines[2].line, 12);
     EXPECT_EQ(lines[4].line, 13);
+    EXPECT_EQ(lines[6].line, 14);
 }
 
 TEST_F(FunctionTraceTest, ReadsEachTextBackFromAMessageBuffer)
 {
-    const FunctionTrace flow(module, "f");
-    flow.entering("", 1);
+    const FunctionTrace flow(module, "f", noParameters, 1);
     const std::string line = "ENTERING: f() in Example.cpp [Line: 1],Parameters List: ";
     EXPECT_THAT(RecordedLog::insertions(), ElementsAre(line, line));
 }
 
 TEST_F(FunctionTraceTest, TakesTheLineOfTheStatementThatTraces)
 {
-    const FunctionTrace flow(module, "f");
-    flow.entering("");
+    const FunctionTrace flow(module, "f", noParameters);
     const int line = __LINE__ - 1;
+    flow.exiting();
     EXPECT_EQ(RecordedLog::lines().at(0).line, line);
+    EXPECT_EQ(RecordedLog::lines().at(2).line, line + 2);
+}
+
+TEST_F(FunctionTraceTest, LeavesTheSharedBuffersAlone)
+{
+    const char* const withParameters = tracepara("T", "F", 5, "P", MessageType::Entering);
+    const char* const message = trace("T", "F", 5, MessageType::Message);
+    const FunctionTrace flow(module, "f", noParameters);
+    flow.error("It failed.");
+    EXPECT_STREQ(withParameters, "ENTERING: T() in F [Line: 5],Parameters List: P");
+    EXPECT_STREQ(message, "MESSAGE [File: F, Line: 5]: T");
 }
 
 TEST_F(FunctionTraceTest, KeepsTheLinesOfThreadsApart)
@@ -226,9 +246,9 @@ TEST_F(FunctionTraceTest, KeepsTheLinesOfThreadsApart)
     for (int i = 0; i < threads; ++i) {
         running.emplace_back([i] {
             const std::string name(static_cast<std::size_t>(20 * (i + 1)), static_cast<char>('a' + i));
-            const FunctionTrace flow(module, name.c_str());
             for (int round = 0; round < rounds; ++round) {
-                flow.entering(name, 1);
+                const FunctionTrace flow(
+                    module, name.c_str(), [&] { return name; }, 1);
                 flow.error(name.c_str(), 1);
             }
         });
