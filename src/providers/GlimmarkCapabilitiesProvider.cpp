@@ -4,12 +4,12 @@
 #include "Cmpi.h"
 #include "Counted.h"
 #include "EntryPoints.h"
+#include "FixedOperations.h"
 #include "FunctionTables.h"
 #include "GlimmarkFactory.h"
 #include "Names.h"
 #include "RequestChecks.h"
 #include "ResultLists.h"
-#include "Statuses.h"
 #include "Trace.h"
 
 #include <string>
@@ -142,36 +142,7 @@ CMPIStatus GlimmarkCapabilities_GetInstance(CMPIInstanceMI* mi, const CMPIContex
     return status;
 }
 
-// The library only reads: what would change something is not supported, and cleaning up has nothing to do.
-
-CMPIStatus GlimmarkCapabilities_Cleanup(CMPIInstanceMI*, const CMPIContext*, CMPIBoolean)
-{
-    return okStatus();
-}
-
-CMPIStatus GlimmarkCapabilities_CreateInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
-                                               const CMPIObjectPath*, const CMPIInstance*)
-{
-    return notSupportedStatus();
-}
-
-CMPIStatus GlimmarkCapabilities_ModifyInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
-                                               const CMPIObjectPath*, const CMPIInstance*, const char**)
-{
-    return notSupportedStatus();
-}
-
-CMPIStatus GlimmarkCapabilities_DeleteInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
-                                               const CMPIObjectPath*)
-{
-    return notSupportedStatus();
-}
-
-CMPIStatus GlimmarkCapabilities_ExecQuery(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
-                                          const CMPIObjectPath*, const char*, const char*)
-{
-    return notSupportedStatus();
-}
+GLIMMARK_FIXED_INSTANCE_OPERATIONS(GlimmarkCapabilities)
 
 static FunctionTable<CMPIInstanceMI> instMIFT__ = {
     interfaceVersion,

@@ -5,12 +5,12 @@
 #include "Cmpi.h"
 #include "Counted.h"
 #include "EntryPoints.h"
+#include "FixedOperations.h"
 #include "FunctionTables.h"
 #include "GlimmarkFactory.h"
 #include "Names.h"
 #include "RequestChecks.h"
 #include "ResultLists.h"
-#include "Statuses.h"
 #include "Trace.h"
 
 #include <cstring>
@@ -425,42 +425,8 @@ CMPIStatus GlimmarkElementCapabilities_Associators(CMPIAssociationMI* mi, const 
     return status;
 }
 
-// The library only reads: what would change something is not supported, and cleaning up has nothing to do.
-
-CMPIStatus GlimmarkElementCapabilities_Cleanup(CMPIInstanceMI*, const CMPIContext*, CMPIBoolean)
-{
-    return okStatus();
-}
-
-CMPIStatus GlimmarkElementCapabilities_CreateInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
-                                                      const CMPIObjectPath*, const CMPIInstance*)
-{
-    return notSupportedStatus();
-}
-
-CMPIStatus GlimmarkElementCapabilities_ModifyInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
-                                                      const CMPIObjectPath*, const CMPIInstance*,
-                                                      const char**)
-{
-    return notSupportedStatus();
-}
-
-CMPIStatus GlimmarkElementCapabilities_DeleteInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
-                                                      const CMPIObjectPath*)
-{
-    return notSupportedStatus();
-}
-
-CMPIStatus GlimmarkElementCapabilities_ExecQuery(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
-                                                 const CMPIObjectPath*, const char*, const char*)
-{
-    return notSupportedStatus();
-}
-
-CMPIStatus GlimmarkElementCapabilities_AssociationCleanup(CMPIAssociationMI*, const CMPIContext*, CMPIBoolean)
-{
-    return okStatus();
-}
+GLIMMARK_FIXED_INSTANCE_OPERATIONS(GlimmarkElementCapabilities)
+GLIMMARK_FIXED_ASSOCIATION_OPERATIONS(GlimmarkElementCapabilities)
 
 static FunctionTable<CMPIInstanceMI> instMIFT__ = {
     interfaceVersion,

@@ -4,12 +4,12 @@
 #include "Cmpi.h"
 #include "Counted.h"
 #include "EntryPoints.h"
+#include "FixedOperations.h"
 #include "FunctionTables.h"
 #include "GlimmarkFactory.h"
 #include "Names.h"
 #include "RequestChecks.h"
 #include "ResultLists.h"
-#include "Statuses.h"
 #include "Trace.h"
 
 #include <string>
@@ -126,36 +126,7 @@ CMPIStatus Glimmark_GetInstance(CMPIInstanceMI* mi, const CMPIContext* ctx, cons
     return status;
 }
 
-// The library only reads: what would change something is not supported, and cleaning up has nothing to do.
-
-CMPIStatus Glimmark_Cleanup(CMPIInstanceMI*, const CMPIContext*, CMPIBoolean)
-{
-    return okStatus();
-}
-
-CMPIStatus Glimmark_CreateInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
-                                   const CMPIObjectPath*, const CMPIInstance*)
-{
-    return notSupportedStatus();
-}
-
-CMPIStatus Glimmark_ModifyInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
-                                   const CMPIObjectPath*, const CMPIInstance*, const char**)
-{
-    return notSupportedStatus();
-}
-
-CMPIStatus Glimmark_DeleteInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
-                                   const CMPIObjectPath*)
-{
-    return notSupportedStatus();
-}
-
-CMPIStatus Glimmark_ExecQuery(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*, const CMPIObjectPath*,
-                              const char*, const char*)
-{
-    return notSupportedStatus();
-}
+GLIMMARK_FIXED_INSTANCE_OPERATIONS(Glimmark)
 
 static FunctionTable<CMPIInstanceMI> instMIFT__ = {
     interfaceVersion,

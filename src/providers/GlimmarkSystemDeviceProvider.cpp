@@ -5,12 +5,12 @@
 #include "Cmpi.h"
 #include "Counted.h"
 #include "EntryPoints.h"
+#include "FixedOperations.h"
 #include "FunctionTables.h"
 #include "GlimmarkFactory.h"
 #include "Names.h"
 #include "RequestChecks.h"
 #include "ResultLists.h"
-#include "Statuses.h"
 #include "Trace.h"
 
 #include <strings.h>
@@ -490,41 +490,8 @@ CMPIStatus GlimmarkSystemDevice_ReferenceNames(CMPIAssociationMI* mi, const CMPI
     return status;
 }
 
-// The library only reads: what would change something is not supported, and cleaning up has nothing to do.
-
-CMPIStatus GlimmarkSystemDevice_Cleanup(CMPIInstanceMI*, const CMPIContext*, CMPIBoolean)
-{
-    return okStatus();
-}
-
-CMPIStatus GlimmarkSystemDevice_CreateInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
-                                               const CMPIObjectPath*, const CMPIInstance*)
-{
-    return notSupportedStatus();
-}
-
-CMPIStatus GlimmarkSystemDevice_ModifyInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
-                                               const CMPIObjectPath*, const CMPIInstance*, const char**)
-{
-    return notSupportedStatus();
-}
-
-CMPIStatus GlimmarkSystemDevice_DeleteInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
-                                               const CMPIObjectPath*)
-{
-    return notSupportedStatus();
-}
-
-CMPIStatus GlimmarkSystemDevice_ExecQuery(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*,
-                                          const CMPIObjectPath*, const char*, const char*)
-{
-    return notSupportedStatus();
-}
-
-CMPIStatus GlimmarkSystemDevice_AssociationCleanup(CMPIAssociationMI*, const CMPIContext*, CMPIBoolean)
-{
-    return okStatus();
-}
+GLIMMARK_FIXED_INSTANCE_OPERATIONS(GlimmarkSystemDevice)
+GLIMMARK_FIXED_ASSOCIATION_OPERATIONS(GlimmarkSystemDevice)
 
 static FunctionTable<CMPIInstanceMI> instMIFT__ = {
     interfaceVersion,
