@@ -236,7 +236,7 @@ private:
 
     [[nodiscard]] unsigned int kindCalled(const std::string& name) const
     {
-        const auto kind = findCalled(namedKinds, name);
+        const auto* const kind = findCalled(namedKinds, name);
         if (kind == namedKinds.end())
             refuse(inQuotes(escaped(name)));
         return kind->kind;

@@ -72,7 +72,7 @@ void appendEnclosures(const std::string& place, Sysfs& sysfs, std::vector<Node>&
         const SysfsDirectory enclosure(enclosures, name);
         if (!enclosure.isOpen())
             continue;
-        const Paths paths{devicePath(enclosures, place, name), place + '/' + name};
+        const Paths paths{devicePath(enclosures, place, name), std::string(place).append("/").append(name)};
         for (const std::string& slotName : enclosure.names()) {
             if (!enclosure.hasDirectory(slotName))
                 continue;
