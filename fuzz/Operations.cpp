@@ -7,11 +7,12 @@
 //     node KIND DESCRIPTION PATH STATUS ALARM-STATE   one more node; - for no alarm state
 //     clear                                           no nodes
 //     systems NAME,...                                the computer systems that the broker knows
-//     broker own|null|bare|empty|lost                 what the provider is made with, and so with the next
-//     two: context own|null|bare|empty|lost                its own; a null pointer; one without tables, with
-//     empty result own|null|bare|empty|lost                 tables, without a handle fail NTH HOW a call of
-//     the broker that fails in the next operation exhaust NTH                                     an
-//     allocation that fails in the next operation
+//     broker|context|result OBJECT                    what the provider is made and called with: own; null;
+//                                                     bare: without tables; empty: with empty tables;
+//                                                     lost: without a handle
+//     fail NTH HOW                                    a call of the broker that fails in the next operation:
+//                                                     handle, status, value, state, lost, or a null result
+//     exhaust NTH                                     an allocation that fails in the next operation
 //
 // and the operations, of a PROVIDER Glimmark, Capabilities, ElementCapabilities or SystemDevice. A PATH is an
 // object path as text, or null, bare, empty or lost as above:

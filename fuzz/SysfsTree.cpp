@@ -5,7 +5,7 @@
 // a pipe.
 
 #include "FuzzTarget.h"
-#include "SysfsNodeSource.h"
+#include "sources/NodeSource.h"
 #include "testing/TemporaryDirectory.h"
 
 #include <filesystem>
@@ -13,6 +13,7 @@
 #include <optional>
 #include <string_view>
 #include <system_error>
+#include <vector>
 
 #include <sys/stat.h>
 
@@ -100,7 +101,9 @@ int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size)
         if (place.size() > 2 && place[1] == ' ')
             tree.make(place[0], place.substr(2), with);
     }
-    for (const Tavro::Node& node : Tavro::SysfsNodeSource(Tavro::allSysfsClasses()).read())
+    std::vector<Tavro::Node> nodes;
+    Tavro::appendNodesOf(Tavro::nodeSources(), nodes);
+    for (const Tavro::Node& node : nodes)
         requireSound(node);
     return 0;
 }

@@ -66,7 +66,7 @@ set(maker ${WORK_DIR}/maker)
 execute_process(
     COMMAND ${CMAKE_COMMAND} -G ${GENERATOR} -S ${CMAKE_CURRENT_LIST_DIR}/development -B ${maker}
             -DCMAKE_PREFIX_PATH=${moved} -DCMAKE_CXX_COMPILER=${COMPILER}
-            -DREPLACEMENT=${REPLACEMENTS}/Instrumentation.cpp -DSANITIZED=${SANITIZED}
+            -DSANITIZED=${SANITIZED}
     OUTPUT_QUIET COMMAND_ERROR_IS_FATAL ANY)
 execute_process(COMMAND ${CMAKE_COMMAND} --build ${maker} OUTPUT_QUIET COMMAND_ERROR_IS_FATAL ANY)
 
@@ -77,9 +77,9 @@ function(expect text expected)
 endfunction()
 
 execute_process(
-    COMMAND ${CMAKE_COMMAND} -E env LD_LIBRARY_PATH=${maker} ${moved}/bin/cimhost ein TAVRO_Glimmark
+    COMMAND ${CMAKE_COMMAND} -E env LD_LIBRARY_PATH=${maker}/example ${moved}/bin/cimhost ein TAVRO_Glimmark
     OUTPUT_VARIABLE names COMMAND_ERROR_IS_FATAL ANY)
-expect("${names}" "Replaced indicator:replaced path")
+expect("${names}" "^[^\n]*Fan Tray Fault LED:fan tray, left\"[^\n]*\n[^\n]*Identification LED:front panel\"[^\n]*\n$")
 if(NOT SANITIZED)
     execute_process(
         COMMAND ${CMAKE_COMMAND} -E env LD_LIBRARY_PATH=${moved}/${LIBDIR} TAVRO_INVENTORY=${INVENTORY} ${maker}/program

@@ -47,6 +47,6 @@ function(add_support_library_tests name)
         NAME ${name}.SharedObject
         COMMAND
             ${CMAKE_COMMAND} -DLIBRARY=$<TARGET_FILE:${name}> -DSONAME=lib${name}.so.1
-            "-DNEEDED=${NEEDS_${name}}" -DEXPORTS=${CMAKE_CURRENT_SOURCE_DIR}/../exports.map -DREADELF=${CMAKE_READELF}
+            "-DNEEDED=${NEEDS_${name}}" -DEXPORTS=${CMAKE_CURRENT_SOURCE_DIR}/exports.map -DREADELF=${CMAKE_READELF}
             -DNM=${CMAKE_NM} -P ${PROJECT_SOURCE_DIR}/platform/cmake/CheckSharedObject.cmake)
 endfunction()

@@ -37,7 +37,8 @@ CMPIInstance* newInstance(const CMPIBroker* broker, const CMPIObjectPath* path);
 void setHostname(const CMPIObjectPath* path, const std::string& host);
 void addKey(const CMPIObjectPath* path, const char* name, const std::string& value);
 
-/// \param properties  ended by a null pointer, or null for all  \param keys  ended by a null pointer
+/// \param properties  ended by a null pointer, or null for all
+/// \param keys        ended by a null pointer
 void setPropertyFilter(const CMPIInstance* instance, const char** properties, const char** keys);
 void setProperty(const CMPIInstance* instance, const char* name, const std::string& value);
 void setProperty(const CMPIInstance* instance, const char* name, CMPIUint16 value);

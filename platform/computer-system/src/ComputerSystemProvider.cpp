@@ -46,8 +46,9 @@ std::string caption()
     return make_string(text);
 }
 
-/// \param path  from pathOf  \param properties  those wanted besides the keys, ended by a null pointer; null
-/// for all. The broker keeps the others out by the filter.
+/// \param path        from pathOf
+/// \param properties  those wanted besides the keys, ended by a null pointer; null for all. The broker keeps
+///                    the others out by the filter.
 CMPIInstance* instanceAt(const CMPIObjectPath* path, const std::string& name, const char** properties)
 {
     CMPIInstance* const instance = Cmpi::newInstance(theBroker, path);
@@ -95,7 +96,8 @@ void getInstance(const CMPIResult* result, const CMPIObjectPath* instancePath, c
     throw Cmpi::Failure(CMPI_RC_ERR_NOT_FOUND, "There is no TAVRO_ComputerSystem with these keys");
 }
 
-/// Runs an operation; no exception gets into the broker.
+/// Runs an operation; no exception gets into the broker: one written in C, whose frames may have no unwind
+/// tables, would be ended by it. The provider library lets them pass, since that is how its brokers know it.
 template <class Operation>
 CMPIStatus statusOf(Operation operation) noexcept
 {
@@ -145,8 +147,10 @@ CMPIInstanceMIFT functions = {
 } // namespace
 } // namespace Tavro::ComputerSystem
 
-/// The factory function. \return a record with static storage; null, and the reason in `rc`, without a
-/// broker. \param broker  replaces that of an earlier call  \param rc  may be null
+/// The factory function.
+/// \param broker  replaces that of an earlier call
+/// \param rc      may be null
+/// \return a record with static storage; null, and the reason in `rc`, without a broker
 extern "C" __attribute__((visibility("default"))) CMPIInstanceMI*
 TavroComputerSystemProvider_Create_InstanceMI(const CMPIBroker* broker, const CMPIContext* /*ctx*/,
                                               CMPIStatus* rc)

@@ -3,6 +3,8 @@
 
 #include "ComputerSystemTest.h"
 
+#include <new>
+
 #include <dlfcn.h>
 
 namespace {
@@ -271,6 +273,18 @@ TEST_F(Services, ThatMakeNothingFail)
         return static_cast<CMPIInstance*>(nullptr);
     };
     expectFailure(broker.enumerateInstances(classPath()), CMPI_RC_ERR_FAILED, "newInstance");
+}
+
+TEST_F(Services, ThatRunOutOfMemoryFailTheOperation)
+{
+    CMPIInstanceMI* const provider = create(broker.cmpiBroker(), nullptr);
+    broker.tables().enc.newInstance = [](const CMPIBroker*, const CMPIObjectPath*,
+                                         CMPIStatus*) -> CMPIInstance* { throw std::bad_alloc(); };
+    Request request(broker);
+    CMPIStatus status{CMPI_RC_OK, nullptr};
+    EXPECT_NO_THROW(status = provider->ft->enumerateInstances(provider, request.context(), request.result(),
+                                                              request.path(classPath()), nullptr));
+    EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
 }
 
 TEST_F(Services, WithoutTextOfTheNamespaceFail)

@@ -1,7 +1,7 @@
 #include "Tavro/Instrumentation.h"
 
 #include "ErrorLine.h"
-#include "NodeSource.h"
+#include "sources/NodeSource.h"
 
 #include <algorithm>
 #include <cstddef>
@@ -11,7 +11,7 @@ namespace Tavro {
 
 struct Instrumentation::Implementation
 {
-    const std::vector<Node> nodes = chooseNodeSource()->read();
+    const std::vector<Node> nodes = readNodes();
     unsigned int kind = 0;
     std::size_t position = nodes.size(); ///< off the end: on no node
 

@@ -8,7 +8,6 @@
 #include <cstddef>
 #include <cstdint>
 #include <functional>
-#include <iterator>
 #include <limits>
 #include <set>
 #include <string_view>
@@ -35,6 +34,12 @@ constexpr std::array inventoryFields = {Field{"$schema", false}, Field{"nodes", 
                                         Field{"sources", false}};
 constexpr std::array nodeFields = {Field{"kind", true}, Field{"description", true}, Field{"path", true},
                                    Field{"status", true}, Field{"alarmState", false}};
+
+template <class Items>
+auto findCalled(const Items& items, std::string_view name)
+{
+    return std::find_if(items.begin(), items.end(), [name](const auto& item) { return item.name == name; });
+}
 
 std::string inQuotes(std::string_view text)
 {
@@ -213,8 +218,7 @@ private:
     template <class Fields>
     void enterField(const Fields& known, Names& seen)
     {
-        if (std::none_of(std::begin(known), std::end(known),
-                         [this](const Field& f) { return f.name == field_; }))
+        if (findCalled(known, field_) == known.end())
             throw InventoryError(place() + ": unknown field, expected one of " + quotedNames(known));
         if (!seen.insert(field_).second)
             throw InventoryError(place() + ": field given twice, expected it once");
@@ -232,19 +236,19 @@ private:
 
     [[nodiscard]] unsigned int kindCalled(const std::string& name) const
     {
-        const std::optional<unsigned int> kind = findNodeKind(name);
-        if (!kind)
+        const auto* const kind = findCalled(namedKinds, name);
+        if (kind == namedKinds.end())
             refuse(inQuotes(escaped(name)));
-        return *kind;
+        return kind->kind;
     }
 
-    [[nodiscard]] SysfsClass sourceCalled(const std::string& name) const
+    [[nodiscard]] NodeSource sourceCalled(const std::string& name) const
     {
-        const std::optional<SysfsClass> source = findSysfsClass(name);
-        if (!source)
+        const std::vector<NodeSource> all = nodeSources();
+        const auto source = findCalled(all, name);
+        if (source == all.end())
             refuse(inQuotes(escaped(name)));
-        const std::vector<SysfsClass>& before = inventory_.sources;
-        if (std::find(before.begin(), before.end(), *source) != before.end())
+        if (findCalled(inventory_.sources, name) != inventory_.sources.end())
             throw InventoryError(place() + ": source given twice, expected it once");
         return *source;
     }
@@ -284,14 +288,14 @@ private:
         if (level_ == Level::NodeList)
             return "a node, which is an object";
         if (level_ == Level::SourceList)
-            return "one of " + listSysfsClasses();
+            return "one of " + quotedNames(nodeSources());
         if (field_ == "nodes")
             return "a list of nodes";
         if (field_ == "sources")
             return "a list of sources";
         std::string number = "a whole number from 0 to " + std::to_string(largestNumber);
         if (field_ == "kind")
-            return number + " or one of " + listNodeKinds();
+            return number + " or one of " + quotedNames(namedKinds);
         if (field_ == "status" || field_ == "alarmState")
             return number;
         return "a text";

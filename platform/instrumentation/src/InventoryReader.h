@@ -4,7 +4,7 @@
 #define TAVRO_INVENTORYREADER_H
 
 #include "Node.h"
-#include "SysfsClasses.h"
+#include "sources/NodeSource.h"
 
 #include <stdexcept>
 #include <string>
@@ -24,7 +24,7 @@ public:
 struct Inventory
 {
     std::vector<Node> nodes;         ///< in their order there
-    std::vector<SysfsClass> sources; ///< read after the nodes, in this order; none twice
+    std::vector<NodeSource> sources; ///< read after the nodes, in this order; none twice
 };
 
 /// \throw InventoryError at the first fault

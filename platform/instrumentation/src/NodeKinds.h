@@ -1,19 +1,32 @@
 /// \file
-/// The kinds of nodes by the names that an inventory file may call them.
+/// The kinds of nodes by the names that an inventory file may call them; letter case matters.
 #ifndef TAVRO_NODEKINDS_H
 #define TAVRO_NODEKINDS_H
 
-#include <optional>
-#include <string>
+#include "Tavro/NodeLexicon.h"
+
+#include <array>
 #include <string_view>
 
 namespace Tavro {
 
-/// The number of the kind with that name, such as "diagnostic indicator"; letter case matters.
-std::optional<unsigned int> findNodeKind(std::string_view name);
+struct NamedKind
+{
+    std::string_view name;
+    NodeLexicon::NodeType kind;
+};
 
-/// All names, quoted and separated by commas.
-std::string listNodeKinds();
+inline constexpr std::array namedKinds = {
+    NamedKind{"chassis", NodeLexicon::Chassis},
+    NamedKind{"system board", NodeLexicon::SystemBoard},
+    NamedKind{"processor", NodeLexicon::Processor},
+    NamedKind{"memory module", NodeLexicon::MemoryModule},
+    NamedKind{"drive", NodeLexicon::Drive},
+    NamedKind{"fan", NodeLexicon::Fan},
+    NamedKind{"power supply", NodeLexicon::PowerSupply},
+    NamedKind{"temperature sensor", NodeLexicon::TemperatureSensor},
+    NamedKind{"diagnostic indicator", NodeLexicon::DiagnosticIndicator},
+};
 
 } // namespace Tavro
 

@@ -65,15 +65,12 @@ bool SysfsDirectory::isAbsent() const
 
 std::vector<std::string> SysfsDirectory::names() const
 {
-    const int listed = openat(descriptor_.number(), ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC);
-    if (listed < 0)
-        return {};
+    Descriptor listed(openat(descriptor_.number(), ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC));
     const auto closeStream = [](DIR* stream) { closedir(stream); };
-    const std::unique_ptr<DIR, decltype(closeStream)> stream(fdopendir(listed), closeStream);
-    if (!stream) {
-        close(listed);
+    const std::unique_ptr<DIR, decltype(closeStream)> stream(fdopendir(listed.number()), closeStream);
+    if (!stream)
         return {};
-    }
+    (void)listed.release(); // the stream's
     std::vector<std::string> names;
     while (const dirent* const entry = readdir(stream.get())) // of a stream that no other thread has
         if (const std::string name = entry->d_name; name != "." && name != "..")

@@ -43,10 +43,11 @@ public:
     /// There is no such directory, or no longer.
     [[nodiscard]] bool isAbsent() const;
 
-    // For a directory that is open.
-
-    /// The names of all that is in it, sorted; without "." and "..". Empty where it cannot be listed.
+    /// The names of all that is in it, sorted; without "." and "..". Empty where it is not open or cannot be
+    /// listed.
     [[nodiscard]] std::vector<std::string> names() const;
+
+    // For a directory that is open.
 
     /// Whether the name is that of a directory, not of a link to one.
     [[nodiscard]] bool hasDirectory(const std::string& name) const;

@@ -7,6 +7,7 @@
 
 #include <algorithm>
 #include <filesystem>
+#include <fstream>
 #include <iterator>
 #include <optional>
 #include <ostream>
@@ -15,11 +16,13 @@
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
+#include <nlohmann/json.hpp>
 
 #include <sys/stat.h>
 
 namespace {
 
+using testing::EndsWith;
 using Testing::Environment;
 using testing::StartsWith;
 using Testing::TemporaryDirectory;
@@ -340,6 +343,28 @@ INSTANTIATE_TEST_SUITE_P(Descriptions, ContentFaults,
                          testing::ValuesIn(valueFaults("description", "expected a text", noTexts)));
 INSTANTIATE_TEST_SUITE_P(Paths, ContentFaults,
                          testing::ValuesIn(valueFaults("path", "expected a text", noTexts)));
+
+/// As an error lists them.
+std::string quoted(const nlohmann::json& names)
+{
+    std::string list;
+    for (const nlohmann::json& name : names)
+        list += (list.empty() ? "" : ", ") + name.dump();
+    return list;
+}
+
+TEST_F(InventoryFaults, theSchemaHasTheNamesThatAreExpected)
+{
+    std::ifstream file(INVENTORIES "/inventory.schema.json");
+    const nlohmann::json schema = nlohmann::json::parse(file);
+    EXPECT_EQ(faultIn(R"({"sources":["x"]})"),
+              "/sources/0: expected one of " + quoted(schema["/properties/sources/items/enum"_json_pointer]) +
+                  ", found \"x\"");
+    EXPECT_THAT(faultIn(R"({"nodes":[{"kind":"x"}]})"),
+                EndsWith(" or one of " +
+                         quoted(schema["/$defs/node/properties/kind/anyOf/1/enum"_json_pointer]) +
+                         ", found \"x\""));
+}
 
 INSTANTIATE_TEST_SUITE_P(
     Fields, ContentFaults,

@@ -7,7 +7,6 @@
 #include <sys/socket.h>
 #include <sys/time.h>
 #include <sys/un.h>
-#include <unistd.h>
 
 namespace MVLog {
 namespace {
@@ -20,15 +19,8 @@ DatagramSink::DatagramSink(std::string path, std::unique_ptr<spdlog::formatter> 
     : path_(std::move(path))
 {
     set_formatter_(std::move(formatter));
-    if (const int error = connect(); error != 0) {
-        close(socket_);
+    if (const int error = connect(); error != 0)
         throw spdlog::spdlog_ex("cannot connect to " + path_, error);
-    }
-}
-
-DatagramSink::~DatagramSink()
-{
-    close(socket_);
 }
 
 int DatagramSink::connect()
@@ -39,12 +31,14 @@ int DatagramSink::connect()
         return ENAMETOOLONG;
     std::memcpy(&address.sun_path, path_.c_str(), path_.size());
 
-    if (socket_ < 0)
-        socket_ = socket(AF_UNIX, SOCK_DGRAM | SOCK_CLOEXEC, 0);
-    if (socket_ < 0)
+    if (!socket_.isOpen())
+        socket_ = Tavro::Descriptor(socket(AF_UNIX, SOCK_DGRAM | SOCK_CLOEXEC, 0));
+    if (!socket_.isOpen())
         return errno;
-    setsockopt(socket_, SOL_SOCKET, SO_SNDTIMEO, &longestWait, sizeof longestWait);
-    return ::connect(socket_, reinterpret_cast<const sockaddr*>(&address), sizeof address) == 0 ? 0 : errno;
+    setsockopt(socket_.number(), SOL_SOCKET, SO_SNDTIMEO, &longestWait, sizeof longestWait);
+    return ::connect(socket_.number(), reinterpret_cast<const sockaddr*>(&address), sizeof address) == 0
+               ? 0
+               : errno;
 }
 
 int DatagramSink::send(const spdlog::memory_buf_t& datagram)
@@ -52,7 +46,7 @@ int DatagramSink::send(const spdlog::memory_buf_t& datagram)
     const int flags = MSG_NOSIGNAL | (isStuck_ ? MSG_DONTWAIT : 0);
     ssize_t sent = 0;
     do
-        sent = ::send(socket_, datagram.data(), datagram.size(), flags);
+        sent = ::send(socket_.number(), datagram.data(), datagram.size(), flags);
     while (sent < 0 && errno == EINTR);
     const int error = sent < 0 ? errno : 0;
     isStuck_ = error == EAGAIN;

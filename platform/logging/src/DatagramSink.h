@@ -3,6 +3,8 @@
 #ifndef MVLOG_DATAGRAMSINK_H
 #define MVLOG_DATAGRAMSINK_H
 
+#include "Descriptor.h"
+
 #include <memory>
 #include <string>
 
@@ -18,12 +20,9 @@ namespace MVLog {
 class DatagramSink : public spdlog::sinks::base_sink<spdlog::details::null_mutex>
 {
 public:
-    /// \param formatter  makes the datagrams  \throw spdlog::spdlog_ex when nobody listens there
+    /// \param formatter  makes the datagrams
+    /// \throw spdlog::spdlog_ex when nobody listens there
     DatagramSink(std::string path, std::unique_ptr<spdlog::formatter> formatter);
-    ~DatagramSink() override;
-
-    DatagramSink(const DatagramSink&) = delete;
-    DatagramSink& operator=(const DatagramSink&) = delete;
 
 protected:
     /// \throw spdlog::spdlog_ex when the line cannot be sent
@@ -36,7 +35,7 @@ private:
     int send(const spdlog::memory_buf_t& datagram);
 
     std::string path_;
-    int socket_ = -1;
+    Tavro::Descriptor socket_;
     bool isStuck_ = false; ///< the last wait for the daemon was in vain
 };
 

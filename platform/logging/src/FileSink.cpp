@@ -3,10 +3,10 @@
 #include <cerrno>
 #include <filesystem>
 #include <system_error>
+#include <utility>
 
 #include <fcntl.h>
 #include <sys/stat.h>
-#include <unistd.h>
 
 namespace MVLog {
 namespace {
@@ -26,32 +26,20 @@ FileSink::FileSink(const std::string& path) : path_(absolute(path))
         throw spdlog::spdlog_ex("cannot open " + path, error);
 }
 
-FileSink::~FileSink()
-{
-    close();
-}
-
 int FileSink::open()
 {
     // A pipe that nobody reads is refused instead of waited for.
-    const int descriptor =
-        ::open(path_.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC | O_NOCTTY | O_NONBLOCK, 0640);
+    Tavro::Descriptor file(
+        ::open(path_.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC | O_NOCTTY | O_NONBLOCK, 0640));
     struct stat status
     {};
-    if (descriptor < 0 || fstat(descriptor, &status) != 0)
+    if (!file.isOpen() || fstat(file.number(), &status) != 0)
         return errno;
-    close();
-    descriptor_ = descriptor;
+    file_ = std::move(file);
     device_ = status.st_dev;
     inode_ = status.st_ino;
-    writer_.emplace(descriptor, path_);
+    writer_.emplace(file_.number(), path_);
     return 0;
-}
-
-void FileSink::close() const
-{
-    if (descriptor_ >= 0)
-        ::close(descriptor_);
 }
 
 bool FileSink::isMoved() const

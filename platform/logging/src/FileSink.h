@@ -3,6 +3,7 @@
 #ifndef MVLOG_FILESINK_H
 #define MVLOG_FILESINK_H
 
+#include "Descriptor.h"
 #include "LineWriter.h"
 
 #include <optional>
@@ -20,13 +21,9 @@ namespace MVLog {
 class FileSink : public spdlog::sinks::base_sink<spdlog::details::null_mutex>
 {
 public:
-    /// \param path  relative to the process's folder of now  \throw spdlog::spdlog_ex when it cannot be
-    /// opened
+    /// \param path  relative to the process's folder of now
+    /// \throw spdlog::spdlog_ex when it cannot be opened
     explicit FileSink(const std::string& path);
-    ~FileSink() override;
-
-    FileSink(const FileSink&) = delete;
-    FileSink& operator=(const FileSink&) = delete;
 
 protected:
     /// \throw spdlog::spdlog_ex when the line cannot be written, or goes into the file that was moved away
@@ -37,11 +34,10 @@ protected:
 private:
     /// Opens the file of that name. \return 0, or why it cannot be opened; what is open then stays open
     int open();
-    void close() const;
     [[nodiscard]] bool isMoved() const;
 
     std::string path_;
-    int descriptor_ = -1;
+    Tavro::Descriptor file_;
     dev_t device_ = 0; ///< of the open file, as the next
     ino_t inode_ = 0;
     std::optional<LineWriter> writer_;

@@ -13,7 +13,8 @@ namespace MVLog {
 class LineWriter
 {
 public:
-    /// \param descriptor  stays the caller's  \param name  of the file, for errors
+    /// \param descriptor  stays the caller's
+    /// \param name        of the file, for errors
     LineWriter(int descriptor, std::string name) : descriptor_(descriptor), name_(std::move(name)) {}
 
     /// Writes the line, which has its newline. A pipe that nobody reads and a file that has reached the

@@ -12,9 +12,8 @@
 ///     MVLOG_FILE          as MVLOG_OUTPUT=file:PATH, which goes before it
 ///     MVLOG_TRACE_LEVEL   the least level of the trace that is written; off if unset
 ///     MVLOG_TRACE_OUTPUT  where the trace goes; where the log goes, if unset
-///     MVLOG_CATEGORIES    the categories that are written, of both channels, separated by commas; * at the
-///     end
-///                         stands for any ending; all, if unset
+///     MVLOG_CATEGORIES    the categories that are written, of both channels, separated by commas; * at
+///                         the end stands for any ending; all, if unset
 ///
 /// A value that cannot be used, or an output that cannot be opened, is complained of once on standard
 /// error; the default holds in its place, for an output standard error. An empty variable counts as unset.

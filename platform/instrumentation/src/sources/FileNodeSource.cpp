@@ -3,10 +3,9 @@
 #include "ErrorLine.h"
 #include "InventoryReader.h"
 #include "ReadFile.h"
-#include "SysfsNodeSource.h"
 
 #include <cstddef>
-#include <iterator>
+#include <utility>
 
 namespace Tavro {
 namespace {
@@ -21,20 +20,16 @@ std::vector<Node> emptyInventory(const std::string& reason)
 
 } // namespace
 
-std::vector<Node> FileNodeSource::read() const
+std::vector<Node> readNodesOfFile(const std::string& file)
 {
     try {
-        Inventory inventory = readInventory(readFile(file_, mostOfAFile));
-        if (!inventory.sources.empty()) {
-            std::vector<Node> read = SysfsNodeSource(inventory.sources).read();
-            inventory.nodes.insert(inventory.nodes.end(), std::make_move_iterator(read.begin()),
-                                   std::make_move_iterator(read.end()));
-        }
+        Inventory inventory = readInventory(readFile(file, mostOfAFile));
+        appendNodesOf(inventory.sources, inventory.nodes);
         return std::move(inventory.nodes);
     } catch (const ReadFailure& failure) {
-        return emptyInventory(file_ + ": " + failure.what());
+        return emptyInventory(file + ": " + failure.what());
     } catch (const InventoryError& error) {
-        return emptyInventory(file_ + ": " + error.what());
+        return emptyInventory(file + ": " + error.what());
     }
 }
 

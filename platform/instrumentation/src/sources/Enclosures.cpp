@@ -1,17 +1,16 @@
-#include "Enclosures.h"
-
 #include "SysfsAttributes.h"
 #include "SysfsNode.h"
+#include "SysfsNodeSource.h"
 #include "Words.h"
 
 #include <array>
 #include <optional>
 #include <string>
+#include <utility>
+#include <vector>
 
 namespace Tavro {
 namespace {
-
-constexpr const char* enclosureFolder = "/sys/class/enclosure";
 
 struct Light
 {
@@ -21,15 +20,15 @@ struct Light
 
 constexpr std::array lights = {Light{"fault", "Fault LED"}, Light{"locate", "Locate LED"}};
 
-/// The places that an enclosure, or a slot of it, has in sysfs.
-struct Place
+/// The paths that an enclosure, or a slot of it, has in sysfs.
+struct Paths
 {
-    std::string devicePath;
-    std::string classPath;
+    std::string ofDevice;
+    std::string ofClass;
 
-    [[nodiscard]] Place below(const std::string& name) const
+    [[nodiscard]] Paths below(const std::string& name) const
     {
-        return {devicePath + '/' + name, classPath + '/' + name};
+        return {ofDevice + '/' + name, ofClass + '/' + name};
     }
 };
 
@@ -43,7 +42,7 @@ std::string describeSlot(const std::string& enclosure, const std::string& slot)
     return "Enclosure " + printable(enclosure) + ' ' + words;
 }
 
-void appendSlot(const SysfsDirectory& slot, const std::string& description, const Place& place,
+void appendSlot(const SysfsDirectory& slot, const std::string& description, const Paths& paths,
                 std::vector<Node>& nodes)
 {
     // First: where it is missing because the slot has gone, so are the lights.
@@ -52,9 +51,9 @@ void appendSlot(const SysfsDirectory& slot, const std::string& description, cons
         const SysfsAttribute value = slot.attribute(light.attribute);
         if (value.isAbsent())
             continue;
-        const Place lightPlace = place.below(light.attribute);
+        const Paths lightPaths = paths.below(light.attribute);
         Node node =
-            indicatorNode(description + ' ' + light.description, lightPlace.devicePath, lightPlace.classPath);
+            indicatorNode(description + ' ' + light.description, lightPaths.ofDevice, lightPaths.ofClass);
         node.status = status.isRead() ? slotStatus(status.text) : unknownStatus;
         if (value.isRead())
             if (const std::optional<unsigned int> number = wholeNumber(value.text))
@@ -65,19 +64,21 @@ void appendSlot(const SysfsDirectory& slot, const std::string& description, cons
 
 } // namespace
 
-void appendEnclosures(const SysfsDirectory& enclosures, std::vector<Node>& nodes)
+/// The fault and the locate indicator of each slot, in the order of the enclosures' and the slots' names.
+void appendEnclosures(const std::string& place, Sysfs& sysfs, std::vector<Node>& nodes)
 {
+    const SysfsDirectory enclosures = sysfs.open(place);
     for (const std::string& name : enclosures.names()) {
         const SysfsDirectory enclosure(enclosures, name);
         if (!enclosure.isOpen())
             continue;
-        const Place place{devicePath(enclosures, enclosureFolder, name), enclosureFolder + ('/' + name)};
+        const Paths paths{devicePath(enclosures, place, name), std::string(place).append("/").append(name)};
         for (const std::string& slotName : enclosure.names()) {
             if (!enclosure.hasDirectory(slotName))
                 continue;
             const SysfsDirectory slot(enclosure, slotName);
             if (slot.isOpen())
-                appendSlot(slot, describeSlot(name, slotName), place.below(slotName), nodes);
+                appendSlot(slot, describeSlot(name, slotName), paths.below(slotName), nodes);
         }
     }
 }

@@ -1,18 +1,16 @@
-#include "Leds.h"
-
 #include "LedName.h"
 #include "SysfsAttributes.h"
 #include "SysfsNode.h"
-#include "Tavro/NodeLexicon.h"
+#include "SysfsNodeSource.h"
 
 #include <cerrno>
 #include <optional>
 #include <string>
+#include <utility>
+#include <vector>
 
 namespace Tavro {
 namespace {
-
-constexpr const char* ledFolder = "/sys/class/leds";
 
 /// The list of triggers has an entry for each processor, and so can be longer than a page.
 constexpr std::size_t longestTriggerList = 16 * SysfsDirectory::pageSize;
@@ -28,12 +26,12 @@ unsigned int alarmStateOf(unsigned int brightness, const SysfsAttribute& trigger
 }
 
 /// Nothing: it has vanished.
-std::optional<Node> readLed(const SysfsDirectory& leds, const std::string& name)
+std::optional<Node> readLed(const SysfsDirectory& leds, const std::string& place, const std::string& name)
 {
     const SysfsDirectory led(leds, name);
     if (led.isAbsent() || led.errorCode() == ENOTDIR)
         return std::nullopt;
-    Node node = indicatorNode(describeLed(name), devicePath(leds, ledFolder, name), ledFolder + ('/' + name));
+    Node node = indicatorNode(describeLed(name), devicePath(leds, place, name), place + '/' + name);
     if (!led.isOpen())
         return node;
 
@@ -53,10 +51,12 @@ std::optional<Node> readLed(const SysfsDirectory& leds, const std::string& name)
 
 } // namespace
 
-void appendLeds(const SysfsDirectory& leds, std::vector<Node>& nodes)
+/// An indicator for each LED, in the order of their names.
+void appendLeds(const std::string& place, Sysfs& sysfs, std::vector<Node>& nodes)
 {
+    const SysfsDirectory leds = sysfs.open(place);
     for (const std::string& name : leds.names())
-        if (std::optional<Node> node = readLed(leds, name))
+        if (std::optional<Node> node = readLed(leds, place, name))
             nodes.push_back(*std::move(node));
 }
 
