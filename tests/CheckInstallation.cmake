@@ -87,11 +87,19 @@ if(NOT SANITIZED)
     expect("${answer}" "^four libraries in all: a node\n$")
 endif()
 
-# The same headers by pkg-config.
+# The same by pkg-config.
 file(GLOB_RECURSE package ${moved}/tavro-support.pc)
 get_filename_component(package_directory ${package} DIRECTORY)
 execute_process(
     COMMAND ${CMAKE_COMMAND} -E env PKG_CONFIG_PATH=${package_directory} pkg-config --cflags tavro-support
     OUTPUT_VARIABLE flags OUTPUT_STRIP_TRAILING_WHITESPACE COMMAND_ERROR_IS_FATAL ANY)
 separate_arguments(flags UNIX_COMMAND "${flags}")
-execute_process(COMMAND ${COMPILER} -std=c++17 ${flags} -fsyntax-only ${REPLACEMENTS}/Common.cpp COMMAND_ERROR_IS_FATAL ANY)
+file(REMOVE_RECURSE ${maker})
+file(MAKE_DIRECTORY ${maker})
+execute_process(
+    COMMAND ${COMPILER} -std=c++17 -shared -fPIC -Wl,-soname,libtavro-instrumentation.so.1 ${flags} -o
+            ${maker}/libtavro-instrumentation.so.1 ${CMAKE_CURRENT_LIST_DIR}/../platform/example/Instrumentation.cpp COMMAND_ERROR_IS_FATAL ANY)
+execute_process(
+    COMMAND ${CMAKE_COMMAND} -E env LD_LIBRARY_PATH=${maker} ${moved}/bin/cimhost ein TAVRO_Glimmark
+    OUTPUT_VARIABLE names COMMAND_ERROR_IS_FATAL ANY)
+expect("${names}" "Fan Tray Fault LED:fan tray, left")

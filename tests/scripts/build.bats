@@ -3,6 +3,8 @@
 bats_require_minimum_version 1.5.0
 
 setup() {
+    # Of `./test NAME`, where that runs this.
+    unset GTEST_FILTER
     project=$BATS_TEST_TMPDIR/project
     mkdir -p "$project/scripts"
     cp "$SOURCE/scripts/build" "$SOURCE/scripts/run-tests" "$project/scripts/"

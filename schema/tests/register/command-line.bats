@@ -7,6 +7,9 @@ load machine
     make_machine
     register 3 register
     says "there is no broker"
+    # What a person can do then.
+    says "cimhost serve"
+    says "docs/brokers.md"
 }
 
 @test "half of a broker's tools are no broker" {
