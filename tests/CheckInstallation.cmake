@@ -1,6 +1,6 @@
 # Installs the build into an empty prefix and asks the provider from there, with nothing set in the environment. Run as
 #   cmake -DBUILD_DIR=DIR -DPREFIX=DIR -DINVENTORY=FILE -DPROVIDERDIR=lib/... -DLIBDIR=lib -DREADELF=... -DCOMPILER=...
-#         -DGENERATOR=... -DSANITIZED=BOOL -DREPLACEMENTS=DIR -DWORK_DIR=DIR -P THIS
+#         -DGENERATOR=... -DSANITIZED=BOOL -DWORK_DIR=DIR -P THIS
 
 cmake_minimum_required(VERSION 3.20)
 
