@@ -43,6 +43,7 @@ public:
     template <class Around>
     void run(const Task& task, Around around)
     {
+        joinFreedMemory();
         cimhost::Request request(host);
         CMPIObjectPath* const path = request.path(task.path);
         const RequestHandles handles{host.cmpiBroker(), request.context(), request.result(),
@@ -59,6 +60,11 @@ public:
     cimhost::Broker host;
 
 private:
+    /// Lets every run begin with the memory of earlier requests joined to large pieces. The C library does so
+    /// when something large is allocated, as the library's list of records is. A tape allocates nothing of
+    /// its own: its objects would lie scattered, and take up to twice as long to make.
+    static void joinFreedMemory();
+
     std::size_t count = 0;
 };
 

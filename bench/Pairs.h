@@ -1,6 +1,6 @@
 /// \file
-/// Two things measured in turn: each iteration of a benchmark is a pair, one run of the first and one of the
-/// second, and what is told of the pairs is the median, of both times and of the ratio of each pair.
+/// Two things measured in turn. Each iteration of a benchmark is a pair: one run of the first thing and one
+/// of the second. Reported are medians over the pairs: of both times, and of the ratio within a pair.
 #ifndef BENCH_PAIRS_H
 #define BENCH_PAIRS_H
 
@@ -36,15 +36,15 @@ double secondsOf(Run run)
     return threadSeconds() - begin;
 }
 
-/// Lets the benchmark run pairs, and counts them out. \param first, second  each runs once and returns
-/// seconds
+/// Runs a pair in each iteration of the benchmark and sets its counters. The two go first in turn.
+/// \param first, second  each runs once and returns seconds
 template <class First, class Second>
 void comparePairs(benchmark::State& state, First first, Second second)
 {
     std::vector<double> firsts;
     std::vector<double> seconds;
     std::vector<double> ratios;
-    first(); // what is made once, on both sides
+    first(); // both once before, for what is made only at first use
     second();
     bool firstGoesFirst = true;
     for ([[maybe_unused]] auto _ : state) {

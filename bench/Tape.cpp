@@ -25,9 +25,10 @@ void Tape::replay(const TapeRequest& request)
     words[pathWord].pointer = const_cast<CMPIObjectPath*>(request.ref);
     words[statusWord].pointer = &status;
     const Step* const known = steps().data();
+    Word* const places = words.data();
     const Number* const end = code.data() + code.size();
     for (const Number* next = code.data(); next != end;)
-        next = known[*next].make(next + 1, words.data());
+        next = known[*next].make(next + 1, places);
 }
 
 std::vector<std::string> Tape::calls() const

@@ -7,8 +7,9 @@
 /// that of a word: a constant, whose text or value the tape holds, or what an earlier call of the tape has
 /// brought. What a call brings and no later one takes is dropped at once.
 ///
-/// Making a call of a tape costs some 3 ns more than the call: finding its step, and reading its numbers and
-/// words.
+/// Replaying costs 2 to 4 ns for each call on top of the call itself, measured with steps that read their
+/// arguments and call nothing: 81 of 4,800 ns for an instance of the system device association, 210 of some
+/// 8,000 ns for one of an indicator.
 #ifndef BENCH_TAPE_H
 #define BENCH_TAPE_H
 
