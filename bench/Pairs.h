@@ -68,6 +68,30 @@ void comparePairs(benchmark::State& state, First first, Second second)
     state.counters["ratio"] = median(ratios);
 }
 
+/// Runs a program's benchmarks. \param tell  prints one's result: is called with its benchmark::UserCounters
+template <class Tell>
+int runAndTell(int argc, char** argv, Tell tell)
+{
+    class Reporter : public benchmark::BenchmarkReporter
+    {
+    public:
+        explicit Reporter(Tell& printer) : print(printer) {}
+        bool ReportContext(const Context&) override { return true; }
+        void ReportRuns(const std::vector<Run>& runs) override
+        {
+            for (const Run& run : runs)
+                print(run.counters);
+        }
+
+    private:
+        Tell& print;
+    };
+    benchmark::Initialize(&argc, argv);
+    Reporter reporter(tell);
+    benchmark::RunSpecifiedBenchmarks(&reporter);
+    return 0;
+}
+
 } // namespace bench
 
 #endif

@@ -1,7 +1,6 @@
 #include "Recorder.h"
 
 #include <cstring>
-#include <sstream>
 #include <stdexcept>
 
 namespace bench {
@@ -13,6 +12,13 @@ using Number = Tape::Number;
 std::string quoted(const std::string& text)
 {
     return '"' + text + '"';
+}
+
+Tape::Word pointerTo(const void* kept)
+{
+    Tape::Word word{};
+    word.pointer = const_cast<void*>(kept);
+    return word;
 }
 
 /// A service of the broker: the layer stands in its slot.
@@ -174,10 +180,10 @@ void Recorder::addResult(const CMPIData& data)
     addResult((data.type & CMPI_ENC) != 0 ? data.value.inst : nullptr);
 }
 
-Number Recorder::newWord(Tape::Word word, std::string shown)
+Number Recorder::newWord(Tape::Word word, const std::string& shown)
 {
     tape.words.push_back(word);
-    tape.shown.push_back(std::move(shown));
+    tape.shown.push_back(shown);
     return static_cast<Number>(tape.words.size() - 1);
 }
 
@@ -186,78 +192,51 @@ Number Recorder::newObject(const void* object)
     return objects[object] = newWord(Tape::Word(), "#" + std::to_string(tape.words.size()));
 }
 
-Number Recorder::numberOfObject(const void* object)
+/// \param shown  another for every other constant \param make  returns the word of a new one
+template <class Make>
+Number Recorder::constant(const std::string& shown, Make make)
 {
-    const auto known = objects.find(object);
-    if (known == objects.end())
-        fail("an object is used that is not the request's and that no call has brought");
+    const auto [known, isNew] = constants.try_emplace(shown);
+    if (isNew)
+        known->second = newWord(make(), shown);
     return known->second;
 }
 
-/// \param make  the word of a constant that the tape keeps
-template <class Map, class Key, class Make>
-Number Recorder::constant(Map& known, const Key& key, std::string shown, Make make)
-{
-    const auto [entry, isNew] = known.try_emplace(key, Number{});
-    if (isNew)
-        entry->second = newWord(make(entry->first), std::move(shown));
-    return entry->second;
-}
-
-namespace {
-
-Tape::Word pointerTo(const void* kept)
-{
-    Tape::Word word{};
-    word.pointer = const_cast<void*>(kept);
-    return word;
-}
-
-} // namespace
-
 Number Recorder::numberOf(std::uint64_t number)
 {
-    return constant(tape.numbers, number, std::to_string(number),
-                    [](std::uint64_t kept) { return Tape::Word{kept}; });
-}
-
-Number Recorder::numberOf(const void* address)
-{
-    return numberOf(reinterpret_cast<std::uintptr_t>(address));
+    return constant(std::to_string(number), [&] { return Tape::Word{number}; });
 }
 
 Number Recorder::numberOf(const std::string& text)
 {
-    return constant(tape.strings, text, quoted(text),
-                    [](const std::string& kept) { return pointerTo(&kept); });
+    return constant("string " + quoted(text), [&] { return pointerTo(&tape.texts.emplace_back(text)); });
 }
 
 Number Recorder::numberOf(const std::wstring& text)
 {
-    return constant(tape.wideStrings, text, quoted({text.begin(), text.end()}),
-                    [](const std::wstring& kept) { return pointerTo(&kept); });
+    return constant("wide " + quoted({text.begin(), text.end()}),
+                    [&] { return pointerTo(&tape.wideTexts.emplace_back(text)); });
 }
 
 Number Recorder::numberOf(const char* text)
 {
     if (text == nullptr)
         return Tape::nullWord;
-    return constant(tape.characters, std::string(text), quoted(text),
-                    [](const std::string& kept) { return pointerTo(kept.c_str()); });
+    return constant(quoted(text), [&] { return pointerTo(tape.texts.emplace_back(text).c_str()); });
 }
 
 Number Recorder::numberOf(const char** list)
 {
     if (list == nullptr)
         return Tape::nullWord;
-    std::vector<const char*> texts;
-    std::string shown;
+    std::string shown = "list";
+    std::vector<const char*> kept;
     for (; *list != nullptr; ++list) {
-        texts.push_back(static_cast<const char*>(tape.words[numberOf(*list)].pointer));
-        shown += quoted(*list);
+        shown += ' ' + quoted(*list);
+        kept.push_back(static_cast<const char*>(tape.words[numberOf(*list)].pointer));
     }
-    texts.push_back(nullptr);
-    return constant(tape.lists, texts, shown, [](const auto& kept) { return pointerTo(kept.data()); });
+    kept.push_back(nullptr);
+    return constant(shown, [&] { return pointerTo(tape.lists.emplace_back(kept).data()); });
 }
 
 Number Recorder::numberOf(CMPIStatus* status)
@@ -267,25 +246,20 @@ Number Recorder::numberOf(CMPIStatus* status)
 
 Number Recorder::numberOf(const CMPIValue* value)
 {
-    const auto numeric = [&](std::uint64_t number, auto set) {
-        return constant(tape.values, std::pair(valueType, number), std::to_string(number),
-                        [&](const auto& /*kept*/) {
-                            Tape::Word word{};
-                            set(word.value);
-                            return word;
-                        });
-    };
+    Tape::Word word{};
     switch (valueType) {
     case CMPI_chars:
         return numberOf(reinterpret_cast<const char*>(value)) | Tape::textInPlaceOfValue;
     case CMPI_boolean:
-        return numeric(value->boolean, [&](CMPIValue& kept) { kept.boolean = value->boolean; });
+        word.value.boolean = value->boolean;
+        return constant("boolean " + std::to_string(value->boolean), [&] { return word; });
     case CMPI_uint16:
-        return numeric(value->uint16, [&](CMPIValue& kept) { kept.uint16 = value->uint16; });
+        word.value.uint16 = value->uint16;
+        return constant("uint16 " + std::to_string(value->uint16), [&] { return word; });
     case CMPI_uint16A:
-        return numberOfObject(value->array);
+        return numberOf(value->array);
     case CMPI_ref:
-        return numberOfObject(value->ref);
+        return numberOf(value->ref);
     default:
         fail("a value has type " + std::to_string(valueType));
     }

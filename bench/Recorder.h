@@ -15,14 +15,15 @@
 #include <optional>
 #include <tuple>
 #include <type_traits>
+#include <unordered_map>
 #include <utility>
 
 namespace bench {
 
-/// Runs something in a request and records its calls. Allocations that the calls make themselves are not
-/// counted, but for the texts that they return. \throw std::logic_error  a call cannot be recorded: of a
-/// service that is not in Recorder.cpp's list, on an object
-///     that is not the request's and that no call has brought, or with a value of an unknown type
+/// Runs something in a request and records its calls. What the calls allocate is not counted, but for those
+/// that return a text. \throw std::logic_error  a call cannot be recorded: of a service that is not in
+/// Recorder.cpp's list, on an
+///     object that is not the request's and that no call has brought, or with a value of an unknown type
 Tape record(cimhost::Broker& host, const TapeRequest& request, const std::function<void()>& run);
 
 /// An object of a support library, which its user keeps a place for.
@@ -58,15 +59,14 @@ public:
         Recorder& recorder;
     };
 
-    /// Begins a call. \param typeOfValue  of the value that is among its arguments
+    /// Adds the number of a call's step. \param typeOfValue  of the value that is among its arguments
     void begin(Tape::Number step, CMPIType typeOfValue);
-    /// Adds the number of an argument to the call.
+    /// Adds the number of an argument.
     template <class Value>
     void addArgument(const Value& value)
     {
         add(numberOf(value));
     }
-    void addArgument(const CMPIData& data) = delete;
     /// Adds the number of what the call has brought.
     void addResult(const void* object);
     void addResult(const CMPIData& data);
@@ -75,40 +75,42 @@ private:
     void pause();
     void resume();
     void add(Tape::Number number) { tape.code.push_back(number); }
-    Tape::Number newWord(Tape::Word word, std::string shown);
-    Tape::Number numberOfObject(const void* object);
-    template <class Map, class Key, class Make>
-    Tape::Number constant(Map& known, const Key& key, std::string shown, Make make);
+    Tape::Number newWord(Tape::Word word, const std::string& shown);
+    Tape::Number newObject(const void* object);
+    template <class Make>
+    Tape::Number constant(const std::string& shown, Make make);
 
-    template <class Number, class = std::enable_if_t<std::is_integral_v<Number> || std::is_enum_v<Number>>>
-    Tape::Number numberOf(Number number)
+    template <class Integer, class = std::enable_if_t<std::is_integral_v<Integer> || std::is_enum_v<Integer>>>
+    Tape::Number numberOf(Integer number)
     {
         return numberOf(static_cast<std::uint64_t>(number));
     }
     Tape::Number numberOf(std::uint64_t number);
+    Tape::Number numberOf(const void* address) { return numberOf(reinterpret_cast<std::uintptr_t>(address)); }
     Tape::Number numberOf(const std::string& text);
     Tape::Number numberOf(const std::wstring& text);
     Tape::Number numberOf(const char* text);
     Tape::Number numberOf(const char** list);
-    Tape::Number numberOf(const void* address);
     Tape::Number numberOf(CMPIStatus* status);
     Tape::Number numberOf(const CMPIValue* value);
     template <class Object, class = std::enable_if_t<std::is_class_v<Object>>>
     Tape::Number numberOf(Object* object)
     {
-        if constexpr (std::is_base_of_v<Held, Object>)
-            return objects.count(object) > 0 ? objects[object] : newObject(object);
-        else
-            return numberOfObject(object);
+        const auto known = objects.find(object);
+        if (known != objects.end())
+            return known->second;
+        if constexpr (!std::is_base_of_v<Held, Object>)
+            fail("an object is used that is not the request's and that no call has brought");
+        return newObject(object);
     }
-    Tape::Number newObject(const void* object);
 
     static inline Recorder* active = nullptr;
     cimhost::Broker& broker;
     const cimhost::FunctionTables ownTables;
     cimhost::FunctionTables recordingTables;
     Tape tape;
-    std::map<const void*, Tape::Number> objects;
+    std::unordered_map<const void*, Tape::Number> objects;
+    std::unordered_map<std::string, Tape::Number> constants;
     CMPIType valueType = CMPI_null;
     std::string failure;
 };
@@ -144,35 +146,15 @@ struct Recorded
     static constexpr bool bringsObject =
         std::is_same_v<Result, CMPIData> ||
         (std::is_pointer_v<Result> && std::is_class_v<std::remove_pointer_t<Result>>);
-    /// Whether it returns a text, which is its caller's from then on.
     static constexpr bool returnsText =
         std::is_same_v<Result, std::string> || std::is_same_v<Result, std::wstring>;
 
-    /// Makes the call and writes it down. Not inlined, so that handing on a call that is not recorded takes
-    /// little.
+    /// Writes the call down and makes it. Not inlined, so that handing on what is not recorded takes little.
     [[gnu::noinline]] static Result record(Recorder& recorder, const char* name, Parameters... parameters)
-    {
-        if constexpr (returnsText) {
-            std::optional<Result> made;
-            {
-                const Allocations::Pause pause;
-                made = makeAndWrite(recorder, name, parameters...);
-            }
-            Result text = *made;
-            const Allocations::Pause pause;
-            made.reset();
-            return text;
-        } else {
-            const Allocations::Pause pause;
-            return makeAndWrite(recorder, name, parameters...);
-        }
-    }
-
-private:
-    static Result makeAndWrite(Recorder& recorder, const char* name, Parameters... parameters)
     {
         static const Tape::Number step =
             Tape::addStep({name, sizeof...(Parameters) + (bringsObject ? 1 : 0), &replay});
+        std::optional<Allocations::Pause> uncounted(std::in_place);
         recorder.begin(step, typeAmong(parameters...));
         (recorder.addArgument(parameters), ...);
         const Recorder::Pause pause(recorder);
@@ -181,10 +163,13 @@ private:
             recorder.addResult(result);
             return result;
         } else {
+            if (returnsText)
+                uncounted.reset(); // the text is the caller's
             return Call::call(parameters...);
         }
     }
 
+private:
     /// The type of the value that is among the arguments: the last one.
     static CMPIType typeAmong(const Parameters&... parameters)
     {

@@ -15,10 +15,8 @@
 
 #include <cstddef>
 #include <cstdint>
-#include <map>
+#include <deque>
 #include <string>
-#include <unordered_map>
-#include <utility>
 #include <vector>
 
 #include <cmpift.h>
@@ -99,13 +97,10 @@ private:
     std::vector<Word> words;
     std::vector<std::string> shown; ///< each of the words in calls()
 
-    // The constants: words point to the keys, which stay where they are.
-    std::map<std::uint64_t, Number> numbers;
-    std::map<std::pair<CMPIType, std::uint64_t>, Number> values;
-    std::unordered_map<std::string, Number> characters;
-    std::unordered_map<std::string, Number> strings;
-    std::map<std::wstring, Number> wideStrings;
-    std::map<std::vector<const char*>, Number> lists;
+    // What words point to.
+    std::deque<std::string> texts;
+    std::deque<std::wstring> wideTexts;
+    std::deque<std::vector<const char*>> lists;
 };
 
 } // namespace bench
