@@ -71,15 +71,15 @@ void Bed::joinFreedMemory()
     std::free(memory);
 }
 
-void Bed::setIndicators(std::size_t wanted)
+void Bed::setIndicators(std::size_t count)
 {
     std::vector<MadeInventory::Node> nodes;
-    nodes.reserve(wanted);
-    for (std::size_t number = 1; number < wanted; ++number)
+    nodes.reserve(count);
+    for (std::size_t number = 1; number < count; ++number)
         nodes.push_back(makeNode(number));
     nodes.push_back({"b", "2"});
     MadeInventory::set(std::move(nodes));
-    count = wanted;
+    indicators = count;
 }
 
 Tape Bed::record(const Task& task)

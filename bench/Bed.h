@@ -36,7 +36,7 @@ public:
     /// with the texts of a large server, in an order that is not that of their identifiers, of every kind of
     /// status.
     void setIndicators(std::size_t count);
-    [[nodiscard]] std::size_t indicatorCount() const { return count; }
+    [[nodiscard]] std::size_t indicatorCount() const { return indicators; }
 
     /// Makes a request with the task's path, and calls `around` with what the request hands over and a
     /// function that runs the operation. The request ends after that, with all of its objects.
@@ -65,7 +65,7 @@ private:
     /// its own: its objects would lie scattered, and take up to twice as long to make.
     static void joinFreedMemory();
 
-    std::size_t count = 0;
+    std::size_t indicators = 0;
 };
 
 } // namespace bench

@@ -56,12 +56,15 @@ static_assert(sizeof(MVLog::MVMessageBuffer) <= sizeof(Tape::Word) &&
 using Text = const std::string&;
 using WideText = const std::wstring&;
 
+// NOLINTBEGIN(bugprone-macro-parentheses): a declarator, and arguments that bring theirs
 #define FORWARD(Result, name, symbol, parameters, arguments)                                                 \
     Result name parameters __asm__(symbol);                                                                  \
     Result name parameters                                                                                   \
     {                                                                                                        \
         return Forward<&name>(symbol, #name) arguments;                                                      \
     }
+
+// NOLINTEND(bugprone-macro-parentheses)
 
 // Logging.
 
