@@ -1,16 +1,17 @@
 /// \file
-/// Where the library and the floor run: the host's broker, an inventory, and one request for each run.
+/// Where the library runs and where tapes of it are replayed: the host's broker, an inventory, and one
+/// request for each run.
 #ifndef BENCH_BED_H
 #define BENCH_BED_H
 
-#include "Floor.h"
-#include "Indicators.h"
+#include "Recorder.h"
+#include "Tape.h"
 
 #include "broker/Broker.h"
 #include "testing/Operations.h"
 
 #include <cstddef>
-#include <string>
+#include <functional>
 #include <vector>
 
 namespace bench {
@@ -19,18 +20,11 @@ namespace bench {
 struct Task
 {
     Operation operation;
-    FloorOperation floor;
     cimhost::cim::ObjectPath path;
 };
 
-/// Every operation of testing/Operations.h that has a floor.
+/// Every operation of testing/Operations.h.
 std::vector<Task> allTasks();
-
-enum class Side
-{
-    library,
-    floor
-};
 
 /// One server with its broker, which knows one computer system.
 class Bed
@@ -38,35 +32,40 @@ class Bed
 public:
     Bed();
 
-    /// What the inventory has from now on.
+    /// What the inventory has from now on: an indicator that testing/Operations.h calls "b:/2", the others
+    /// with the texts of a large server, in an order that is not that of their identifiers, of every kind of
+    /// status.
     void setIndicators(std::size_t count);
-    [[nodiscard]] std::size_t indicatorCount() const { return indicators.deviceIDs.size(); }
+    [[nodiscard]] std::size_t indicatorCount() const { return indicators; }
 
-    /// Makes a request with its path, and calls `around` with the handles and a function that runs the
-    /// operation. The request ends after that, with all of its objects.
+    /// Makes a request with the task's path, and calls `around` with what the request hands over and a
+    /// function that runs the operation. The request ends after that, with all of its objects.
     template <class Around>
-    void run(const Task& task, Side side, Around around)
+    void run(const Task& task, Around around)
     {
+        joinFreedMemory();
         cimhost::Request request(host);
         CMPIObjectPath* const path = request.path(task.path);
         const RequestHandles handles{host.cmpiBroker(), request.context(), request.result(),
                                      [path](const auto&...) { return path; }};
-        const FloorRequest floorRequest{handles.broker, handles.ctx, handles.rslt, path, indicators};
-        around(handles, path, [&] {
-            if (side == Side::library)
-                task.operation.run(handles);
-            else
-                task.floor(floorRequest);
-        });
+        around(TapeRequest{handles.broker, handles.ctx, handles.rslt, path},
+               [&] { task.operation.run(handles); });
     }
 
-    /// The floor of collecting the indicators.
-    void collectAtFloor() const;
+    /// A tape of the task.
+    Tape record(const Task& task);
+    /// A tape of something that makes no call of the broker.
+    Tape record(const std::function<void()>& run);
 
     cimhost::Broker host;
 
 private:
-    Indicators indicators;
+    /// Lets every run begin with the memory of earlier requests joined to large pieces. The C library does so
+    /// when something large is allocated, as the library's list of records is. A tape allocates nothing of
+    /// its own: its objects would lie scattered, and take up to twice as long to make.
+    static void joinFreedMemory();
+
+    std::size_t indicators = 0;
 };
 
 } // namespace bench

@@ -1,64 +1,89 @@
-// The floor makes the library's calls, all of them, in the same order with the same arguments; and what the
-// library holds on top of what the broker and the support libraries do.
+// Replaying a tape makes the library's calls, all of them, in the same order with the same arguments; a call
+// that a tape cannot hold is no secret; and what the library holds on top of what the broker and the support
+// libraries do.
 
 #include "Bed.h"
-#include "RecordedCalls.h"
 
 #include "testing/Allocations.h"
+#include "testing/RecordedLog.h"
 #include "testing/RecordingBroker.h"
 
+#include <algorithm>
 #include <cstddef>
+#include <cstdio>
+#include <memory>
+#include <sstream>
+#include <stdexcept>
 #include <string>
-#include <tuple>
 #include <vector>
 
+#include <dlfcn.h>
 #include <gtest/gtest.h>
 
 namespace bench {
-namespace {
 
-/// Calls of the broker and of the support libraries, in the order in which they were made.
-std::vector<std::string> sequence(const RecordingBroker& broker)
+void PrintTo(const Task& task, std::ostream* stream)
 {
-    const std::vector<std::string> support = RecordedCalls::all();
-    const std::vector<std::string> calls = broker.calls();
-    const std::vector<std::size_t> supportBefore = broker.othersBeforeCalls();
-    std::vector<std::string> all;
-    std::size_t next = 0;
-    for (std::size_t call = 0; call < calls.size(); ++call) {
-        for (; next < supportBefore[call]; ++next)
-            all.push_back(support[next]);
-        all.push_back(calls[call]);
-    }
-    all.insert(all.end(), support.begin() + static_cast<std::ptrdiff_t>(next), support.end());
-    return all;
+    *stream << task.operation.name;
 }
 
-std::vector<std::string> callsOf(Bed& bed, const Task& task, Side side)
+namespace {
+
+using Calls = std::vector<std::string>;
+
+/// What one run has called: as a tape has it, and as two witnesses do that know nothing of tapes.
+struct Seen
 {
-    RecordingBroker broker(bed.host, RecordedCalls::count);
-    bed.run(task, side, [&](const RequestHandles& handles, const CMPIObjectPath* path, const auto& run) {
-        broker.name(handles.ctx, "ctx");
-        broker.name(path, "ref");
-        broker.clear();
-        RecordedCalls::clear();
-        run();
+    Tape tape;
+    Calls ofBroker; ///< those inside the support libraries too
+    Calls ofLog;
+};
+
+Calls loggedCalls()
+{
+    Calls calls = RecordedLog::insertions();
+    for (const RecordedLog::Line& line : RecordedLog::lines()) {
+        std::ostringstream call;
+        call << (line.channel == RecordedLog::Channel::log ? "log " : "trace ") << line.function << ' '
+             << line.file << ' ' << line.line << ' ' << line.category << ' ' << line.level << ' '
+             << line.reservedIsNull << ' ' << line.first << ' ' << line.second << ' ' << line.text;
+        calls.push_back(call.str());
+    }
+    return calls;
+}
+
+/// \param run  called with the request and a function that runs the library's operation
+template <class Run>
+Seen seenWhile(Bed& bed, const Task& task, Run run)
+{
+    Seen seen;
+    RecordingBroker witness(bed.host);
+    bed.run(task, [&](const TapeRequest& request, const auto& operation) {
+        witness.name(request.ctx, "ctx");
+        witness.name(request.ref, "ref");
+        witness.clear();
+        RecordedLog::clear();
+        seen.tape = record(bed.host, request, [&] { run(request, operation); });
     });
-    return sequence(broker);
+    seen.ofBroker = witness.calls();
+    seen.ofLog = loggedCalls();
+    return seen;
 }
 
 /// The two sequences side by side from a little before the place where they part.
-std::string difference(const std::vector<std::string>& library, const std::vector<std::string>& floor)
+std::string difference(const Calls& library, const Calls& floor)
 {
-    constexpr std::size_t shownBefore = 3;
-    constexpr std::size_t shownAfter = 3;
-    std::size_t place = 0;
-    while (place < library.size() && place < floor.size() && library[place] == floor[place])
-        ++place;
+    constexpr std::ptrdiff_t shown = 3;
+    const auto parted = std::mismatch(library.begin(), library.end(), floor.begin(), floor.end());
+    const auto place = parted.first - library.begin();
     std::string text = "they part at call " + std::to_string(place) + ":\n";
-    for (std::size_t i = place - std::min(place, shownBefore); i <= place + shownAfter; ++i)
-        text += "  library  " + (i < library.size() ? library[i] : "-") + "\n  floor    " +
-                (i < floor.size() ? floor[i] : "-") + "\n";
+    const auto show = [&](const char* side, const Calls& calls) {
+        const auto end = std::min(place + shown, static_cast<std::ptrdiff_t>(calls.size()));
+        for (auto i = std::max(place - shown, std::ptrdiff_t{0}); i < end; ++i)
+            text += side + calls[static_cast<std::size_t>(i)] + '\n';
+    };
+    show("  library  ", library);
+    show("  floor    ", floor);
     return text;
 }
 
@@ -70,10 +95,20 @@ TEST_P(FloorTest, MakesTheCallsOfTheLibrary)
     Bed bed;
     for (const std::size_t count : {1U, 2U, 10U}) {
         bed.setIndicators(count);
-        const std::vector<std::string> library = callsOf(bed, GetParam(), Side::library);
-        const std::vector<std::string> floor = callsOf(bed, GetParam(), Side::floor);
-        EXPECT_FALSE(library.empty());
-        EXPECT_TRUE(library == floor) << "with " << count << " indicators " << difference(library, floor);
+        Seen library = seenWhile(bed, GetParam(),
+                                 [](const TapeRequest& /*request*/, const auto& operation) { operation(); });
+        const Seen floor =
+            seenWhile(bed, GetParam(), [&](const TapeRequest& request, const auto& /*operation*/) {
+                library.tape.replay(request);
+            });
+        const auto expectEqual = [&](const char* calls, const Calls& expected, const Calls& actual) {
+            EXPECT_FALSE(expected.empty()) << calls;
+            EXPECT_TRUE(expected == actual)
+                << calls << ", " << count << " indicators " << difference(expected, actual);
+        };
+        expectEqual("the tape", library.tape.calls(), floor.tape.calls());
+        expectEqual("the broker", library.ofBroker, floor.ofBroker);
+        expectEqual("the log", library.ofLog, floor.ofLog);
     }
 }
 
@@ -82,12 +117,13 @@ TEST_P(FloorTest, MakesTheCallsOfTheLibrary)
 std::ptrdiff_t heldBy(Bed& bed, const Task& task, std::size_t indicators)
 {
     Allocations::Use use;
-    RecordingBroker pausing(bed.host);
     bed.setIndicators(indicators);
-    bed.run(task, Side::library, [&](const auto&, const auto*, const auto& run) {
-        Allocations::startCounting();
-        run();
-        use = Allocations::stopCounting();
+    bed.run(task, [&](const TapeRequest& request, const auto& operation) {
+        record(bed.host, request, [&] {
+            Allocations::startCounting();
+            operation();
+            use = Allocations::stopCounting();
+        });
     });
     return use.peak;
 }
@@ -106,11 +142,67 @@ TEST_P(FloorTest, HoldsAtMostOneKibibyteForAnIndicator)
 INSTANTIATE_TEST_SUITE_P(AllOperations, FloorTest, ::testing::ValuesIn(allTasks()),
                          [](const auto& task) { return task.param.operation.name; });
 
-} // namespace
-
-void PrintTo(const Task& task, std::ostream* stream)
+/// Records a run on the path of a request. \param run  called with that path
+template <class Run>
+void recordOnPath(Run run)
 {
-    *stream << task.operation.name;
+    Bed bed;
+    bed.run(allTasks().front(), [&](const TapeRequest& request, const auto& /*operation*/) {
+        record(bed.host, request, [&] { run(request.ref); });
+    });
 }
+
+TEST(TapeTest, RefusesWhatItCannotRecord)
+{
+    EXPECT_NO_THROW(recordOnPath([](const auto* path) { path->ft->getClassName(path, nullptr); }));
+    const auto unknownService = [](const auto* path) { path->ft->getHostname(path, nullptr); };
+    EXPECT_THROW(recordOnPath(unknownService), std::logic_error);
+    const auto unknownObject = [](const auto* path) {
+        const CMPIObjectPath other = *path;
+        path->ft->getClassName(&other, nullptr);
+    };
+    EXPECT_THROW(recordOnPath(unknownObject), std::logic_error);
+    const auto unknownType = [](const auto* path) {
+        const CMPIValue value{};
+        path->ft->addKey(path, "Key", &value, CMPI_real32);
+    };
+    EXPECT_THROW(recordOnPath(unknownType), std::logic_error);
+}
+
+TEST(TapeTest, TellsOfARefusalThatTheLibraryHasCaught)
+{
+    const auto caught = [](const auto* path) {
+        try {
+            path->ft->getHostname(path, nullptr);
+        } catch (const std::exception&) {
+        }
+    };
+    EXPECT_THROW(recordOnPath(caught), std::logic_error);
+}
+
+/// The file that a function lies in.
+std::string fileOf(const void* function)
+{
+    Dl_info info{};
+    return dladdr(function, &info) != 0 ? info.dli_fname : "no file";
+}
+
+TEST(TapeTest, KnowsEveryFunctionOfTheSupportLibrariesThatTheLibraryCalls)
+{
+    const std::string command = "nm -D --undefined-only --format=posix " TEST_PROVIDER_LIBRARY;
+    const std::unique_ptr<FILE, int (*)(FILE*)> names(::popen(command.c_str(), "r"), ::pclose);
+    std::string executable = fileOf(reinterpret_cast<const void*>(&fileOf));
+    int count = 0;
+    for (char name[1024]; std::fscanf(names.get(), "%1023s%*[^\n]", name) == 1;) {
+        const std::string symbol(name);
+        if (symbol.find("5Tavro") == std::string::npos && symbol.find("5MVLog") == std::string::npos)
+            continue;
+        EXPECT_EQ(fileOf(dlsym(RTLD_DEFAULT, name)), executable) << "SupportCalls.cpp lacks " << symbol;
+        ++count;
+    }
+    EXPECT_GT(count, 0);
+}
+
+} // namespace
 
 } // namespace bench

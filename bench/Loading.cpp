@@ -70,29 +70,15 @@ void loading(benchmark::State& state)
 }
 BENCHMARK(loading)->UseManualTime()->Iterations(51);
 
-class Reporter : public benchmark::BenchmarkReporter
-{
-public:
-    bool ReportContext(const Context&) override { return true; }
-    void ReportRuns(const std::vector<Run>& runs) override
-    {
-        for (const Run& run : runs) {
-            const double library = run.counters.at("first_ns") / 1e6;
-            const double empty = run.counters.at("second_ns") / 1e6;
-            std::printf(
-                "loading the library and six factory functions: %.2f ms; an empty C++ library: %.2f ms; "
-                "difference %.2f ms\n",
-                library, empty, library - empty);
-        }
-    }
-};
-
 } // namespace
 
 int main(int argc, char** argv)
 {
-    benchmark::Initialize(&argc, argv);
-    Reporter reporter;
-    benchmark::RunSpecifiedBenchmarks(&reporter);
-    return 0;
+    return bench::runAndTell(argc, argv, [](const benchmark::UserCounters& counters) {
+        const double library = counters.at("first_ns") / 1e6;
+        const double empty = counters.at("second_ns") / 1e6;
+        std::printf("loading the library and six factory functions: %.2f ms; an empty C++ library: %.2f ms; "
+                    "difference %.2f ms\n",
+                    library, empty, library - empty);
+    });
 }

@@ -1,6 +1,6 @@
 /// \file
-/// Two things measured in turn: each iteration of a benchmark is a pair, one run of the first and one of the
-/// second, and what is told of the pairs is the median, of both times and of the ratio of each pair.
+/// Two things measured in turn. Each iteration of a benchmark is a pair: one run of the first thing and one
+/// of the second. Reported are medians over the pairs: of both times, and of the ratio within a pair.
 #ifndef BENCH_PAIRS_H
 #define BENCH_PAIRS_H
 
@@ -36,15 +36,15 @@ double secondsOf(Run run)
     return threadSeconds() - begin;
 }
 
-/// Lets the benchmark run pairs, and counts them out. \param first, second  each runs once and returns
-/// seconds
+/// Runs a pair in each iteration of the benchmark and sets its counters. The two go first in turn.
+/// \param first, second  each runs once and returns seconds
 template <class First, class Second>
 void comparePairs(benchmark::State& state, First first, Second second)
 {
     std::vector<double> firsts;
     std::vector<double> seconds;
     std::vector<double> ratios;
-    first(); // what is made once, on both sides
+    first(); // both once before, for what is made only at first use
     second();
     bool firstGoesFirst = true;
     for ([[maybe_unused]] auto _ : state) {
@@ -66,6 +66,30 @@ void comparePairs(benchmark::State& state, First first, Second second)
     state.counters["first_ns"] = median(firsts) * 1e9;
     state.counters["second_ns"] = median(seconds) * 1e9;
     state.counters["ratio"] = median(ratios);
+}
+
+/// Runs a program's benchmarks. \param tell  prints one's result: is called with its benchmark::UserCounters
+template <class Tell>
+int runAndTell(int argc, char** argv, Tell tell)
+{
+    class Reporter : public benchmark::BenchmarkReporter
+    {
+    public:
+        explicit Reporter(Tell& printer) : print(printer) {}
+        bool ReportContext(const Context&) override { return true; }
+        void ReportRuns(const std::vector<Run>& runs) override
+        {
+            for (const Run& run : runs)
+                print(run.counters);
+        }
+
+    private:
+        Tell& print;
+    };
+    benchmark::Initialize(&argc, argv);
+    Reporter reporter(tell);
+    benchmark::RunSpecifiedBenchmarks(&reporter);
+    return 0;
 }
 
 } // namespace bench

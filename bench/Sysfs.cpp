@@ -99,27 +99,15 @@ void walkBesideReading(benchmark::State& state)
 }
 BENCHMARK(walkBesideReading)->UseManualTime()->Iterations(51);
 
-class Reporter : public benchmark::BenchmarkReporter
-{
-public:
-    bool ReportContext(const Context&) override { return true; }
-    void ReportRuns(const std::vector<Run>& runs) override
-    {
-        for (const Run& run : runs)
-            std::printf(
-                "reading sysfs with 2000 LEDs and 200 drive slots: %.1f µs for an indicator; the same files "
-                "and nothing else: %.1f µs; ratio %.2f\n",
-                run.counters.at("first_ns") / 1e3 / indicatorCount,
-                run.counters.at("second_ns") / 1e3 / indicatorCount, run.counters.at("ratio").value);
-    }
-};
-
 } // namespace
 
 int main(int argc, char** argv)
 {
-    benchmark::Initialize(&argc, argv);
-    Reporter reporter;
-    benchmark::RunSpecifiedBenchmarks(&reporter);
-    return 0;
+    return bench::runAndTell(argc, argv, [](const benchmark::UserCounters& counters) {
+        std::printf(
+            "reading sysfs with 2000 LEDs and 200 drive slots: %.1f µs for an indicator; the same files "
+            "and nothing else: %.1f µs; ratio %.2f\n",
+            counters.at("first_ns") / 1e3 / indicatorCount, counters.at("second_ns") / 1e3 / indicatorCount,
+            counters.at("ratio").value);
+    });
 }

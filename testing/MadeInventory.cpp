@@ -22,27 +22,8 @@ std::mutex mutex;
 State state;
 std::atomic<int> cursors{0};
 std::atomic<unsigned int> lastValue{0};
-std::atomic<void (*)(const std::string&)> listener{nullptr};
-
-/// \param call  returns the call's text; asked only when somebody listens
-template <class Call>
-void tellCall(Call call)
-{
-    if (auto* const listening = listener.load(std::memory_order_relaxed))
-        listening(call());
-}
-
-void tellCall(const char* name)
-{
-    tellCall([=] { return std::string(name); });
-}
 
 } // namespace
-
-void tell(void (*newListener)(const std::string& call))
-{
-    listener = newListener;
-}
 
 void set(std::vector<Node> nodes)
 {
@@ -69,8 +50,6 @@ unsigned int valueBeforeGetProperty()
 
 } // namespace MadeInventory
 
-using MadeInventory::tellCall;
-
 namespace Tavro {
 
 struct Instrumentation::Implementation
@@ -90,7 +69,6 @@ struct Instrumentation::Implementation
 
 Instrumentation::Instrumentation() : implementation_(std::make_unique<Implementation>())
 {
-    tellCall("Instrumentation()");
     const std::lock_guard lock(MadeInventory::mutex);
     implementation_->inventory = MadeInventory::state;
     ++MadeInventory::cursors;
@@ -98,13 +76,11 @@ Instrumentation::Instrumentation() : implementation_(std::make_unique<Implementa
 
 Instrumentation::~Instrumentation()
 {
-    tellCall("~Instrumentation()");
     --MadeInventory::cursors;
 }
 
 void Instrumentation::selectNode(NodeLexicon::NodeType kind)
 {
-    tellCall([=] { return "selectNode(" + std::to_string(kind) + ")"; });
     implementation_->kind = kind;
     implementation_->position = 0;
     implementation_->skipOthers();
@@ -112,13 +88,11 @@ void Instrumentation::selectNode(NodeLexicon::NodeType kind)
 
 Instrumentation::operator bool() const
 {
-    tellCall("Instrumentation to bool");
     return implementation_->onNode();
 }
 
 Instrumentation& Instrumentation::operator++()
 {
-    tellCall("++Instrumentation");
     ++implementation_->position;
     implementation_->skipOthers();
     return *this;
@@ -126,20 +100,17 @@ Instrumentation& Instrumentation::operator++()
 
 std::string Instrumentation::getPathToNode() const
 {
-    tellCall("getPathToNode()");
     return implementation_->node().path;
 }
 
 // Different from the path, so that a test sees which of the two is used.
 std::string Instrumentation::convertPathToString(const std::string& path) const
 {
-    tellCall([&] { return "convertPathToString(" + path + ")"; });
     return "/" + path;
 }
 
 std::string Instrumentation::getNodeDescription() const
 {
-    tellCall("getNodeDescription()");
     const MadeInventory::State& inventory = implementation_->inventory;
     if (inventory.throwingPosition == implementation_->position)
         std::rethrow_exception(inventory.exception);
@@ -148,13 +119,11 @@ std::string Instrumentation::getNodeDescription() const
 
 unsigned int Instrumentation::getNodeStatus() const
 {
-    tellCall("getNodeStatus()");
     return implementation_->node().status;
 }
 
 bool Instrumentation::getProperty(NodeLexicon::Properties property, unsigned int& value) const
 {
-    tellCall([&] { return "getProperty(" + std::to_string(property) + ", " + std::to_string(value) + ")"; });
     MadeInventory::lastValue = value;
     const auto& alarmState = implementation_->node().alarmState;
     if (property != static_cast<NodeLexicon::Properties>(1) || !alarmState)

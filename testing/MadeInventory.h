@@ -26,10 +26,6 @@ void set(std::vector<Node> nodes);
 /// by set(). \param position  nothing: none throws
 void throwAt(std::optional<std::size_t> position, std::exception_ptr exception);
 
-/// From now on, each call of a cursor is told as it begins: the function's name with its arguments.
-/// \param listener  null: nobody is told
-void tell(void (*listener)(const std::string& call));
-
 /// Cursors made and not yet destroyed.
 int openCursors();
 
