@@ -2,7 +2,7 @@
 /// The registration of providers, in the format of the small-footprint CIM broker:
 ///
 ///     # a comment
-///     [TAVRO_Example]
+///     [CIM_Example]
 ///        provider: ExampleProvider
 ///        location: ExampleLibrary
 ///        type: instance association

@@ -31,7 +31,7 @@ Examples:
   cimhost ai -ac ASSOC 'CLASS.Key="value"' what an association ties to it
   cimhost graph | dot -Tsvg > graph.svg    the whole picture
   cimhost serve                            for CIM clients on this machine
-  cimhost watch                            this server's indicators, live
+  cimhost watch                            what the installation is for, live
 
 Environment:
   CIMHOST_PROVIDER_DIR   directories of provider libraries, separated by colons
@@ -71,7 +71,7 @@ struct Arguments
     std::string format;
     OperationRequest request;
     Serve serve{"127.0.0.1", standardPort};
-    std::string watched = "TAVRO_Glimmark";
+    std::string watched; ///< empty: what the installation says
     double interval = 2; ///< seconds
     Settings settings;
 };
@@ -176,7 +176,7 @@ void addCommonOptions(CLI::App& app, Arguments& arguments)
         ->type_name("FILE")
         ->check(named("file"))
         ->allow_extra_args(false);
-    app.add_option("--inventory", settings.inventory, "Hardware inventory for the providers, TAVRO_INVENTORY")
+    app.add_option("--inventory", settings.inventory, "Hardware inventory for the providers")
         ->type_name("FILE")
         ->check(named("file"));
     app.add_option("--like", settings.like, "Behave as a real broker does to providers and clients")
@@ -251,9 +251,10 @@ void addServe(CLI::App& app, Serve& serve)
 void addWatch(CLI::App& app, Arguments& arguments)
 {
     CLI::App& command = addCommand(app, "watch", "Show a class's instances live, and what changes");
-    command.add_option("CLASS", arguments.watched, "The class, such as root/cimv2:CLASS")
-        ->type_name("")
-        ->capture_default_str();
+    command
+        .add_option("CLASS", arguments.watched,
+                    "The class, such as root/cimv2:CLASS; without it that of the installation")
+        ->type_name("");
     command.add_option("--interval", arguments.interval, "Seconds from one look to the next")
         ->type_name("SECONDS")
         ->capture_default_str();
@@ -273,7 +274,8 @@ Watch watchOf(const Arguments& arguments)
     constexpr double millisecondsASecond = 1000;
     if (!(arguments.interval >= leastInterval && arguments.interval <= mostInterval)) // nor is NaN one
         throw UsageError("--interval: expected 0.1 to 86400 seconds");
-    return {readClass("watch", arguments.watched, arguments.nameSpace),
+    return {arguments.watched.empty() ? cim::ObjectPath{"", arguments.nameSpace, "", {}}
+                                      : readClass("watch", arguments.watched, arguments.nameSpace),
             std::chrono::milliseconds(std::llround(arguments.interval * millisecondsASecond))};
 }
 

@@ -53,7 +53,7 @@ struct Serve
 /// Shows the instances of a class live until a signal ends it.
 struct Watch
 {
-    cim::ObjectPath target;             ///< the class, with a namespace
+    cim::ObjectPath target;             ///< the class, with a namespace; unnamed: that of the installation
     std::chrono::milliseconds interval; ///< from one answer to the next question
 };
 
@@ -64,7 +64,7 @@ struct Settings
 {
     std::vector<std::string> providerDirectories; ///< none: the default ones
     std::vector<std::string> registrationFiles;   ///< none: the default ones
-    std::optional<std::string> inventory;         ///< file for TAVRO_INVENTORY; nothing: as it is
+    std::optional<std::string> inventory;         ///< file for the providers; nothing: theirs
     bool trace = false;
     std::optional<std::string> like; ///< the broker whose habits to have; nothing: none
 };

@@ -3,6 +3,7 @@
 #include "broker/Broker.h"
 #include "broker/Habits.h"
 #include "cli/Arguments.h"
+#include "cli/Defaults.h"
 #include "cli/Execute.h"
 #include "cli/Reports.h"
 
@@ -19,12 +20,15 @@ ExitStatus follow(const Invocation& invocation, const Surroundings& surroundings
                   std::ostream& out, std::ostream& err)
 {
     const Settings& settings = invocation.settings;
-    Registration registration = readRegistrations(findRegistrationFiles(settings, surroundings));
+    const std::vector<std::string> files = findRegistrationFiles(settings, surroundings);
+    Registration registration = readRegistrations(files);
+    const Defaults defaults = readDefaults(files, surroundings);
+    const Command command = complete(invocation.command, defaults);
     if (settings.inventory)
-        useInventory(*settings.inventory);
+        useInventory(*settings.inventory, defaults);
     Broker broker(std::move(registration), findProviderDirectories(settings, surroundings),
                   reportTo(err, settings.trace), settings.like ? findHabits(*settings.like) : nullptr);
-    return execute(invocation.command, broker, isTerminal, out, err);
+    return execute(command, broker, isTerminal, out, err);
 }
 
 ExitStatus fail(const std::exception& error, ExitStatus status, std::ostream& err)

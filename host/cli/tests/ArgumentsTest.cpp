@@ -109,7 +109,7 @@ TEST(Arguments, watchHasAClassAndAnInterval)
     const auto watchOf = [](std::vector<std::string> arguments) {
         return std::get<Watch>(parse(std::move(arguments)).command);
     };
-    EXPECT_EQ(watchOf({"watch"}).target, (cim::ObjectPath{"", "root/cimv2", "TAVRO_Glimmark", {}}));
+    EXPECT_EQ(watchOf({"watch"}).target, (cim::ObjectPath{"", "root/cimv2", "", {}}));
     EXPECT_EQ(watchOf({"watch"}).interval, std::chrono::seconds(2));
     EXPECT_EQ(watchOf({"watch", "root/x:C", "--interval", "0.25"}).target,
               (cim::ObjectPath{"", "root/x", "C", {}}));

@@ -240,21 +240,21 @@ TEST(Traversals, handEveryArgumentOn)
     EXPECT_EQ(run({"ai", rackPath, "-ac", "CIMT_RackLamp", "-arc", "R", "-ar", "From", "-arr", "To", "Name",
                    "AlarmState", "--trace"})
                   .err,
-              "cimhost: trace INFO SampleProvider: CIMT_RackLamp R From To +Name +AlarmState\n");
+              "cimhost: trace INFO Sample: CIMT_RackLamp R From To +Name +AlarmState\n");
     EXPECT_EQ(
         run({"ain", rackPath, "-ac", "CIMT_RackLamp", "-arc", "R", "-ar", "From", "-arr", "To", "--trace"})
             .err,
-        "cimhost: trace INFO SampleProvider: CIMT_RackLamp R From To\n");
+        "cimhost: trace INFO Sample: CIMT_RackLamp R From To\n");
     EXPECT_EQ(run({"ri", rackPath, "-arc", "CIMT_RackLamp", "-ar", "From", "P", "--trace"}).err,
-              "cimhost: trace INFO SampleProvider: CIMT_RackLamp From +P\n");
+              "cimhost: trace INFO Sample: CIMT_RackLamp From +P\n");
     EXPECT_EQ(run({"rin", rackPath, "-arc", "CIMT_RackLamp", "-ar", "From", "--trace"}).err,
-              "cimhost: trace INFO SampleProvider: CIMT_RackLamp From\n");
+              "cimhost: trace INFO Sample: CIMT_RackLamp From\n");
 }
 
 TEST(Traversals, askEveryAssociationWithoutAClass)
 {
-    EXPECT_EQ(run({"ai", rackPath, "--trace"}).err, "cimhost: trace INFO SampleProvider: - - - -\n");
-    EXPECT_EQ(run({"rin", rackPath, "--trace"}).err, "cimhost: trace INFO SampleProvider: - -\n");
+    EXPECT_EQ(run({"ai", rackPath, "--trace"}).err, "cimhost: trace INFO Sample: - - - -\n");
+    EXPECT_EQ(run({"rin", rackPath, "--trace"}).err, "cimhost: trace INFO Sample: - -\n");
 }
 
 TEST(Traversals, printWhatTheyBring)
@@ -343,7 +343,7 @@ TEST(Errors, ofAMissingProviderAreTheAnswers)
     const Outcome outcome = run({"ei", "CIMT_Lamp", "--provider-dir", directory.path().string()});
     EXPECT_EQ(outcome.status, 1);
     EXPECT_THAT(outcome.err, StartsWith("cimhost: CMPI_RC_ERR_FAILED (1): "));
-    EXPECT_THAT(outcome.err, HasSubstr("libCimhostCliSample.so"));
+    EXPECT_THAT(outcome.err, HasSubstr("libCimhostSample.so"));
 }
 
 // Surroundings of the providers
@@ -352,11 +352,12 @@ TEST(Inventory, isSetBeforeTheProvidersAreLoaded)
 {
     const TemporaryDirectory directory;
     const std::string file = directory.file("inventory.json", "{}");
-    EXPECT_EQ(run({"ei", "CIMT_RackSystem", "--inventory", file, "--trace"}).err,
-              "cimhost: trace VERBOSE SampleProvider: inventory " + file + '\n');
-    unsetenv("TAVRO_INVENTORY");
-    EXPECT_EQ(run({"ei", "CIMT_RackSystem", "--trace"}).err,
-              "cimhost: trace VERBOSE SampleProvider: inventory unset\n");
+    const auto traced = [](const std::string& inventory) {
+        return StartsWith("cimhost: trace VERBOSE Sample: inventory " + inventory + '\n');
+    };
+    EXPECT_THAT(run({"ei", "CIMT_RackSystem", "--inventory", file, "--trace"}).err, traced(file));
+    unsetenv("CIMT_INVENTORY");
+    EXPECT_THAT(run({"ei", "CIMT_RackSystem", "--trace"}).err, traced("unset"));
 }
 
 TEST(Inventory, mustExist)
