@@ -82,16 +82,10 @@ CMPIEnumeration* enumerateObjects(const char* service, const CMPIBroker* broker,
     });
 }
 
-/// The one instance of an answer; null and the status CMPI_RC_ERR_NOT_FOUND when it has none.
+/// The one instance of an answer; null when the answer is an error.
 const cim::Instance* single(Call& call, const cim::Answer& answer)
 {
-    if (!passStatus(call, answer.status))
-        return nullptr;
-    if (answer.instances.empty()) {
-        call.answerWith(CMPI_RC_ERR_NOT_FOUND);
-        return nullptr;
-    }
-    return &answer.instances.front();
+    return passStatus(call, answer.status) ? &answer.instances.front() : nullptr;
 }
 
 // Threads of a provider's own. The objects that such a thread makes between attachThread and

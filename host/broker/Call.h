@@ -36,8 +36,9 @@ public:
     /// The broker that the call is made to. \throws Refusal  and reports when there is none
     Core& broker(const CMPIBroker* broker);
 
-    /// The content of an object that the provider passed. \param role  what it is in this call, for the
-    /// report. \throws Refusal  and reports when it is null, foreign, dead or of another kind
+    /// The content of an object that the provider passed.
+    /// \param role  what it is in this call, for the report
+    /// \throws Refusal  and reports when it is null, foreign, dead or of another kind
     template <class Object>
     Object& use(const EnvelopeOf<Object>* object, const char* role)
     {

@@ -53,8 +53,8 @@ Registration parseRegistration(const std::string& text, const std::string& name)
 /// The longest file read, in bytes.
 constexpr std::size_t maxRegistrationLength = 1048576;
 
-/// Reads a registration file. \throws RegistrationError  also when the file cannot be read, is no
-/// regular file or too long
+/// Reads a registration file.
+/// \throws RegistrationError  also when the file cannot be read, is no regular file or too long
 Registration readRegistrationFile(const std::string& fileName);
 
 } // namespace cimhost

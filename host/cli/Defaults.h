@@ -25,7 +25,8 @@ struct Defaults
 };
 
 /// Reads the first such file: beside the registrations, in their order, then in the schema directory of the
-/// tree that the executable stands in. \throws UsageError  it cannot be read, or has another line
+/// tree that the executable stands in.
+/// \throws UsageError  it cannot be read, or has another line
 Defaults readDefaults(const std::vector<std::string>& registrationFiles, const Surroundings& surroundings);
 
 /// The command with its class, where it leaves that to the installation.

@@ -1,16 +1,15 @@
 #include "serve/ListeningSocket.h"
 
+#include "cim/Descriptor.h"
 #include "cim/Utf8.h"
 
 #include <cerrno>
 #include <memory>
 #include <system_error>
-#include <utility>
 
 #include <netdb.h>
 #include <netinet/in.h>
 #include <sys/socket.h>
-#include <unistd.h>
 
 namespace cimhost::serve {
 
@@ -32,26 +31,6 @@ std::uint16_t portOf(const sockaddr_storage& address)
                                                : reinterpret_cast<const sockaddr_in&>(address).sin_port);
 }
 
-/// Closes the socket unless it is handed on.
-class Descriptor
-{
-public:
-    explicit Descriptor(int descriptor) : descriptor_(descriptor) {}
-    ~Descriptor()
-    {
-        if (descriptor_ >= 0)
-            close(descriptor_);
-    }
-    Descriptor(const Descriptor&) = delete;
-    Descriptor& operator=(const Descriptor&) = delete;
-
-    [[nodiscard]] int get() const { return descriptor_; }
-    int release() { return std::exchange(descriptor_, -1); }
-
-private:
-    int descriptor_;
-};
-
 } // namespace
 
 ListeningSocket listenAt(const Endpoint& endpoint)
@@ -66,15 +45,15 @@ ListeningSocket listenAt(const Endpoint& endpoint)
         fail(endpoint, "expected an IPv4 or IPv6 address");
     const std::unique_ptr<addrinfo, decltype(&freeaddrinfo)> address(found, &freeaddrinfo);
 
-    Descriptor socket(::socket(address->ai_family, SOCK_STREAM | SOCK_CLOEXEC, 0));
+    cim::Descriptor socket(::socket(address->ai_family, SOCK_STREAM | SOCK_CLOEXEC, 0));
     // A server that was started again need not wait until the connections of the last one are forgotten.
     const int on = 1;
     sockaddr_storage bound{};
     socklen_t length = sizeof bound;
-    if (socket.get() < 0 || setsockopt(socket.get(), SOL_SOCKET, SO_REUSEADDR, &on, sizeof on) != 0 ||
-        bind(socket.get(), address->ai_addr, address->ai_addrlen) != 0 ||
-        listen(socket.get(), SOMAXCONN) != 0 ||
-        getsockname(socket.get(), reinterpret_cast<sockaddr*>(&bound), &length) != 0)
+    if (!socket.isOpen() || setsockopt(socket.number(), SOL_SOCKET, SO_REUSEADDR, &on, sizeof on) != 0 ||
+        bind(socket.number(), address->ai_addr, address->ai_addrlen) != 0 ||
+        listen(socket.number(), SOMAXCONN) != 0 ||
+        getsockname(socket.number(), reinterpret_cast<sockaddr*>(&bound), &length) != 0)
         fail(endpoint, lastError());
     return {socket.release(), {endpoint.address, portOf(bound)}};
 }

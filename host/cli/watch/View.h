@@ -24,8 +24,9 @@ struct TerminalSize
 class Watched
 {
 public:
-    /// Takes the next answer in. \param time  of the answer, for people  \return the changes, as lines with
-    /// the time
+    /// Takes the next answer in.
+    /// \param time  of the answer, for people
+    /// \return the changes, as lines with the time
     std::vector<std::string> take(const cim::Answer& answer, const std::string& time);
 
     /// The terminal's lines, as many as fit, none wider than it is; with escape sequences for colours if
