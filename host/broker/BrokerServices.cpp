@@ -58,7 +58,8 @@ CMPIEnumeration* enumerate(Call& call, const cim::Status& status, std::vector<Co
     return call.make<EnumerationObject>(type, std::move(elements));
 }
 
-/// Runs an up-call that brings paths. \param ask  makes the request of the broker
+/// Runs an up-call that brings paths.
+/// \param ask  makes the request of the broker
 template <class Ask>
 CMPIEnumeration* enumeratePaths(const char* service, const CMPIBroker* broker, const CMPIContext* context,
                                 const CMPIObjectPath* path, CMPIStatus* rc, const Ask& ask)

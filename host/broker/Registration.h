@@ -45,7 +45,8 @@ struct Registration
     std::vector<RegisteredClass> classes;
 };
 
-/// Reads registration text. \param name  what to call it in error messages
+/// Reads registration text.
+/// \param name  what to call it in error messages
 /// \throws RegistrationError  on anything that the format does not have: a line outside a section, an
 /// unknown or repeated entry, a missing one, an unknown type, the same class and provider twice
 Registration parseRegistration(const std::string& text, const std::string& name);

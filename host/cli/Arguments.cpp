@@ -73,6 +73,7 @@ struct Arguments
     Serve serve{"127.0.0.1", standardPort};
     std::string watched; ///< empty: what the installation says
     double interval = 2; ///< seconds
+    bool isWide = false;
     Settings settings;
 };
 
@@ -208,6 +209,11 @@ void addFilters(CLI::App& command, Filters filters, Traversal& traversal)
         ->type_name("ROLE");
 }
 
+void addWide(CLI::App& command, bool& isWide)
+{
+    command.add_flag("--wide", isWide, "Show tables whole on a terminal too, however wide they are");
+}
+
 /// A command, with what all of them have.
 CLI::App& addCommand(CLI::App& app, const char* name, const char* description)
 {
@@ -232,6 +238,7 @@ void addQuestion(CLI::App& app, const QuestionEntry& entry, Arguments& arguments
         command.add_option("PROPERTY", arguments.properties, "Properties wanted; without any, all")
             ->type_name("");
     addFilters(command, entry.filters, arguments.request.traversal);
+    addWide(command, arguments.isWide);
 }
 
 void addServe(CLI::App& app, Serve& serve)
@@ -258,6 +265,7 @@ void addWatch(CLI::App& app, Arguments& arguments)
     command.add_option("--interval", arguments.interval, "Seconds from one look to the next")
         ->type_name("SECONDS")
         ->capture_default_str();
+    addWide(command, arguments.isWide);
 }
 
 /// The class that a command takes.
@@ -276,7 +284,8 @@ Watch watchOf(const Arguments& arguments)
         throw UsageError("--interval: expected 0.1 to 86400 seconds");
     return {arguments.watched.empty() ? cim::ObjectPath{"", arguments.nameSpace, "", {}}
                                       : readClass("watch", arguments.watched, arguments.nameSpace),
-            std::chrono::milliseconds(std::llround(arguments.interval * millisecondsASecond))};
+            std::chrono::milliseconds(std::llround(arguments.interval * millisecondsASecond)),
+            arguments.isWide};
 }
 
 Ask questionOf(const QuestionEntry& entry, Arguments& arguments)
@@ -288,7 +297,7 @@ Ask questionOf(const QuestionEntry& entry, Arguments& arguments)
                          : readTarget(arguments.target, arguments.nameSpace);
     if (!arguments.properties.empty())
         request.properties = arguments.properties;
-    Ask ask{request, {}};
+    Ask ask{request, {}, arguments.isWide};
     if (!arguments.format.empty())
         ask.format = formats().at(arguments.format);
     return ask;

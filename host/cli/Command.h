@@ -35,6 +35,7 @@ struct Ask
 {
     OperationRequest request;
     std::optional<Format> format; ///< nothing: the one that suits the operation and the output
+    bool isWide = false;          ///< tables are whole, however wide the terminal is
 };
 
 /// Draws the instances of a namespace.
@@ -55,6 +56,7 @@ struct Watch
 {
     cim::ObjectPath target;             ///< the class, with a namespace; unnamed: that of the installation
     std::chrono::milliseconds interval; ///< from one answer to the next question
+    bool isWide = false;                ///< the table is whole; the terminal shows its beginning
 };
 
 using Command = std::variant<Ask, DrawGraph, Serve, Watch>;

@@ -15,16 +15,17 @@ namespace {
 struct Execution
 {
     Broker& broker;
-    bool isTerminal;
+    std::optional<std::size_t> columns;
     std::ostream& out;
     std::ostream& err;
 
     ExitStatus operator()(const Ask& ask) const
     {
-        const Format format = formatOf(ask, isTerminal);
+        const Format format = formatOf(ask, columns.has_value());
         const cim::Answer answer = perform(ask.request, broker);
         if (answer.status.code == CMPI_RC_OK) {
-            out << answerText(answer, ask.request, format);
+            out << answerText(answer, ask.request, format,
+                              ask.isWide ? anyWidth : columns.value_or(anyWidth));
             return exitAnswered;
         }
         err << "cimhost: " << statusLine(answer.status) << '\n';
@@ -41,16 +42,16 @@ struct Execution
 
     ExitStatus operator()(const Watch& command) const
     {
-        return watchUntilSignal(command, broker, isTerminal, err);
+        return watchUntilSignal(command, broker, columns.has_value(), err);
     }
 };
 
 } // namespace
 
-ExitStatus execute(const Command& command, Broker& broker, bool isTerminal, std::ostream& out,
-                   std::ostream& err)
+ExitStatus execute(const Command& command, Broker& broker, std::optional<std::size_t> columns,
+                   std::ostream& out, std::ostream& err)
 {
-    return std::visit(Execution{broker, isTerminal, out, err}, command);
+    return std::visit(Execution{broker, columns, out, err}, command);
 }
 
 } // namespace cimhost::cli

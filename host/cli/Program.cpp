@@ -16,8 +16,8 @@ namespace cimhost::cli {
 
 namespace {
 
-ExitStatus follow(const Invocation& invocation, const Surroundings& surroundings, bool isTerminal,
-                  std::ostream& out, std::ostream& err)
+ExitStatus follow(const Invocation& invocation, const Surroundings& surroundings,
+                  std::optional<std::size_t> columns, std::ostream& out, std::ostream& err)
 {
     const Settings& settings = invocation.settings;
     const std::vector<std::string> files = findRegistrationFiles(settings, surroundings);
@@ -28,7 +28,7 @@ ExitStatus follow(const Invocation& invocation, const Surroundings& surroundings
         useInventory(*settings.inventory, defaults);
     Broker broker(std::move(registration), findProviderDirectories(settings, surroundings),
                   reportTo(err, settings.trace), settings.like ? findHabits(*settings.like) : nullptr);
-    return execute(command, broker, isTerminal, out, err);
+    return execute(command, broker, columns, out, err);
 }
 
 ExitStatus fail(const std::exception& error, ExitStatus status, std::ostream& err)
@@ -39,13 +39,13 @@ ExitStatus fail(const std::exception& error, ExitStatus status, std::ostream& er
 
 } // namespace
 
-ExitStatus run(const std::vector<std::string>& arguments, const Surroundings& surroundings, bool isTerminal,
-               std::ostream& out, std::ostream& err)
+ExitStatus run(const std::vector<std::string>& arguments, const Surroundings& surroundings,
+               std::optional<std::size_t> columns, std::ostream& out, std::ostream& err)
 {
     try {
         const std::variant<Invocation, Notice> parsed = parseArguments(arguments);
         if (const auto* invocation = std::get_if<Invocation>(&parsed))
-            return follow(*invocation, surroundings, isTerminal, out, err);
+            return follow(*invocation, surroundings, columns, out, err);
         out << std::get<Notice>(parsed).text;
         return exitAnswered;
     } catch (const UsageError& error) {

@@ -6,7 +6,9 @@
 #include "cli/Command.h"
 #include "cli/Installation.h"
 
+#include <cstddef>
 #include <iosfwd>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -14,9 +16,9 @@ namespace cimhost::cli {
 
 /// Does what the command line asks for and never throws: errors are lines on `err`.
 /// \param arguments   without the program's name
-/// \param isTerminal  whether a person looks at `out`
-ExitStatus run(const std::vector<std::string>& arguments, const Surroundings& surroundings, bool isTerminal,
-               std::ostream& out, std::ostream& err);
+/// \param columns    of the terminal that `out` is; nothing: it is none
+ExitStatus run(const std::vector<std::string>& arguments, const Surroundings& surroundings,
+               std::optional<std::size_t> columns, std::ostream& out, std::ostream& err);
 
 } // namespace cimhost::cli
 

@@ -40,7 +40,8 @@ protected:
         unsetenv("CIMHOST_REGISTRATION");
     }
 
-    /// Runs a line of the shell, in which $CIMHOST is the program. \return its exit status
+    /// Runs a line of the shell, in which $CIMHOST is the program.
+    /// \return its exit status
     [[nodiscard]] int shell(const std::string& line) const
     {
         const std::string out = (directory.path() / "out").string();

@@ -31,13 +31,19 @@ struct Outcome
     std::string err;
 };
 
-Outcome run(const std::vector<std::string>& arguments, bool isTerminal = false)
+Outcome runOn(std::optional<std::size_t> columns, const std::vector<std::string>& arguments)
 {
     const Surroundings surroundings{"/nowhere/bin", SAMPLE_PROVIDER_DIRECTORY, SAMPLE_REGISTRATION};
     std::ostringstream out;
     std::ostringstream err;
-    const int status = cimhost::cli::run(arguments, surroundings, isTerminal, out, err);
+    const int status = cimhost::cli::run(arguments, surroundings, columns, out, err);
     return {status, out.str(), err.str()};
+}
+
+/// \param isTerminal  whether the output is a wide one
+Outcome run(const std::vector<std::string>& arguments, bool isTerminal = false)
+{
+    return runOn(isTerminal ? std::optional<std::size_t>(200) : std::nullopt, arguments);
 }
 
 void expectAnswer(const Outcome& outcome, const std::string& out)
@@ -136,10 +142,22 @@ TEST(EnumerateInstances, printsATableOnATerminal)
 {
     expectAnswer(
         run({"ei", "CIMT_Lamp"}, true),
-        "DeviceID           Name      HealthState       OperationalStatus             AlarmState\n"
-        "-----------------  --------  ----------------  ----------------------------  -----------\n"
-        "Fan 1:/bay[0]      Fan 1     OK                OK, In Service                Off\n"
-        "Lüfter \"2\", a=b\\c  Lüfter 2  Degraded/Warning  Degraded, Predictive Failure  Alternating\n");
+        "Name      HealthState       OperationalStatus             AlarmState   DeviceID\n"
+        "--------  ----------------  ----------------------------  -----------  -----------------\n"
+        "Fan 1     OK                OK, In Service                Off          Fan 1:/bay[0]\n"
+        "Lüfter 2  Degraded/Warning  Degraded, Predictive Failure  Alternating  Lüfter \"2\", a=b\\c\n");
+}
+
+TEST(EnumerateInstances, fitsTheTerminalUnlessItIsAskedToBeWide)
+{
+    const std::string whole = run({"ei", "CIMT_Lamp"}, true).out;
+    EXPECT_EQ(runOn(60, {"ei", "CIMT_Lamp", "--wide"}).out, whole);
+    EXPECT_EQ(runOn(std::nullopt, {"ei", "CIMT_Lamp", "-f", "table"}).out, whole);
+    expectAnswer(runOn(60, {"ei", "CIMT_Lamp"}),
+                 "Name      HealthState       OperationalStatus    AlarmState\n"
+                 "--------  ----------------  -------------------  -----------\n"
+                 "Fan 1     OK                OK, In Service       Off\n"
+                 "Lüfter 2  Degraded/Warning  Degraded, Predicti…  Alternating\n");
 }
 
 TEST(EnumerateInstances, printsThePropertiesNamed)
@@ -264,7 +282,7 @@ TEST(Traversals, printWhatTheyBring)
                  "Name    EnabledState\n"
                  "------  ------------\n"
                  "rack-1  Enabled\n");
-    EXPECT_THAT(run({"ai", rackPath}, true).out, StartsWith("DeviceID           Name      HealthState"));
+    EXPECT_THAT(run({"ai", rackPath}, true).out, StartsWith("Name      HealthState"));
     const Outcome references = run({"ri", rackPath, "-arc", "CIMT_RackLamp"}, true);
     EXPECT_THAT(references.out, HasSubstr(std::string("\n  GroupComponent  ") + rackPath + '\n'));
     EXPECT_THAT(references.out, HasSubstr(std::string("\n  PartComponent   ") + secondPath + '\n'));
