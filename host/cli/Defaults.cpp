@@ -3,6 +3,7 @@
 #include "cim/RegularFile.h"
 #include "cim/Utf8.h"
 #include "cli/Arguments.h"
+#include "cli/CheckingProgram.h"
 
 #include <cstdlib>
 #include <filesystem>
@@ -50,7 +51,9 @@ Defaults parse(const std::string& text, const std::string& name)
 {
     Defaults defaults;
     const std::map<std::string_view, std::string*> entries{
-        {"watch", &defaults.watchedClass}, {"inventory-variable", &defaults.inventoryVariable}};
+        {"watch", &defaults.watchedClass},
+        {"inventory-variable", &defaults.inventoryVariable},
+        {"inventory-check", &defaults.inventoryCheck}};
     std::istringstream lines(text);
     int number = 0;
     for (std::string line; std::getline(lines, line);) {
@@ -63,9 +66,10 @@ Defaults parse(const std::string& text, const std::string& name)
         const std::string_view value =
             colon == std::string_view::npos ? std::string_view() : trimmed(content.substr(colon + 1));
         if (entry == entries.end() || value.empty())
-            throw UsageError(name + ':' + std::to_string(number) +
-                             ": expected \"watch: CLASS\" or \"inventory-variable: NAME\", found \"" +
-                             cim::excerpt(content) + '"');
+            throw UsageError(
+                name + ':' + std::to_string(number) +
+                ": expected watch, inventory-variable or inventory-check, a colon and a value, found \"" +
+                cim::excerpt(content) + '"');
         *entry->second = value;
     }
     return defaults;
@@ -80,7 +84,11 @@ Defaults readDefaults(const std::vector<std::string>& registrationFiles, const S
         return {};
     const std::string name = cim::printable(file->string());
     try {
-        return parse(cim::RegularFile(file->string()).read(mostBytes), name);
+        Defaults defaults = parse(cim::RegularFile(file->string()).read(mostBytes), name);
+        if (!defaults.inventoryCheck.empty())
+            defaults.inventoryCheck =
+                (file->parent_path() / defaults.inventoryCheck).lexically_normal().string();
+        return defaults;
     } catch (const cim::FileError& error) {
         throw UsageError("cannot read " + name + ": " + error.what());
     }
@@ -109,6 +117,10 @@ void useInventory(const std::string& file, const Defaults& defaults)
     } catch (const cim::FileError& error) {
         throw UsageError("cannot read the inventory " + cim::printable(file) + ": " + error.what());
     }
+    const std::string complaint =
+        defaults.inventoryCheck.empty() ? "" : complaintOf(defaults.inventoryCheck, file);
+    if (!complaint.empty())
+        throw UsageError("no inventory: " + cim::printable(file) + ": " + complaint);
     setenv(defaults.inventoryVariable.c_str(), file.c_str(), 1);
 }
 

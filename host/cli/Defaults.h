@@ -5,6 +5,7 @@
 ///     # a comment
 ///     watch: CIM_AlarmDevice
 ///     inventory-variable: EXAMPLE_INVENTORY
+///     inventory-check: ../libexec/example-check
 ///
 /// Each entry may be left out, and so may the file.
 #ifndef CIMHOST_CLI_DEFAULTS_H
@@ -22,6 +23,8 @@ struct Defaults
 {
     std::string watchedClass;      ///< `watch:` what the command watches without a class; empty: nothing
     std::string inventoryVariable; ///< `inventory-variable:` what --inventory sets; empty: nothing
+    /// `inventory-check:` a program that judges inventories, as complaintOf() calls it; empty: none
+    std::string inventoryCheck;
 };
 
 /// Reads the first such file: beside the registrations, in their order, then in the schema directory of the
@@ -34,8 +37,8 @@ Defaults readDefaults(const std::vector<std::string>& registrationFiles, const S
 Command complete(Command command, const Defaults& defaults);
 
 /// Sets the environment variable of the inventory for the providers that will be loaded.
-/// \throws UsageError  there is no such variable, or the file is no regular one or cannot be read; what it
-/// holds is the providers' concern
+/// \throws UsageError  there is no such variable, or the file cannot be read, is no regular one, or no
+/// inventory, as the installation's program judges; without one what it holds is the providers' concern
 void useInventory(const std::string& file, const Defaults& defaults);
 
 } // namespace cimhost::cli

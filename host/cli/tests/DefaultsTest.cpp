@@ -4,6 +4,7 @@
 #include "testing/TemporaryDirectory.h"
 
 #include <cstdlib>
+#include <filesystem>
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -17,7 +18,7 @@ using Testing::TemporaryDirectory;
 
 namespace {
 
-const Defaults inventoryDefaults{"", "CIMT_INVENTORY"};
+const Defaults inventoryDefaults{"", "CIMT_INVENTORY", ""};
 
 class DefaultsFile : public testing::Test
 {
@@ -69,7 +70,8 @@ TEST_F(DefaultsFile, liesBesideTheRegistrationOrInTheTree)
 
 TEST_F(DefaultsFile, hasNoOtherLines)
 {
-    const std::string expected = ": expected \"watch: CLASS\" or \"inventory-variable: NAME\", found ";
+    const std::string expected =
+        ": expected watch, inventory-variable or inventory-check, a colon and a value, found ";
     EXPECT_EQ(errorOf("watch: A\nlook: A\n"), ":2" + expected + "\"look: A\"");
     EXPECT_EQ(errorOf("watch:\n"), ":1" + expected + "\"watch:\"");
     EXPECT_EQ(errorOf("watch\x1b"), ":1" + expected + "\"watch\\x001B\"");
@@ -84,10 +86,10 @@ TEST_F(DefaultsFile, mustBeAFile)
 TEST(Defaults, completeACommandThatLeavesItsClassToThem)
 {
     const Watch watch{{"", "root/x", "", {}}, {}};
-    EXPECT_EQ(std::get<Watch>(complete(watch, {"CIM_A", ""})).target.className, "CIM_A");
-    EXPECT_EQ(std::get<Watch>(complete(watch, {"CIM_A", ""})).target.nameSpace, "root/x");
+    EXPECT_EQ(std::get<Watch>(complete(watch, {"CIM_A", "", ""})).target.className, "CIM_A");
+    EXPECT_EQ(std::get<Watch>(complete(watch, {"CIM_A", "", ""})).target.nameSpace, "root/x");
     const Watch own{{"", "root/x", "CIM_Own", {}}, {}};
-    EXPECT_EQ(std::get<Watch>(complete(own, {"CIM_A", ""})).target.className, "CIM_Own");
+    EXPECT_EQ(std::get<Watch>(complete(own, {"CIM_A", "", ""})).target.className, "CIM_Own");
     EXPECT_THROW(complete(watch, {}), UsageError);
     EXPECT_EQ(std::get<Watch>(complete(own, {})).target.className, "CIM_Own");
 }
@@ -139,6 +141,34 @@ TEST_F(DefaultsFile, anInventoryIsARegularFile)
     for (const std::string device : {"/dev/null", "/dev/zero"})
         EXPECT_EQ(errorOfInventory(device),
                   "cannot read the inventory " + device + ": expected a regular file, found a device");
+}
+
+TEST_F(DefaultsFile, aProgramMayJudgeTheInventory)
+{
+    const std::string program =
+        tree.file("libexec/check", "#!/bin/sh\n"
+                                   "grep -q good \"$1\" && exit 0\n"
+                                   "grep -q unclear \"$1\" && echo unclear && exit 3\n"
+                                   "printf 'line 1:\\033 bad\\nmore\\n'\n"
+                                   "exit 1\n");
+    std::filesystem::permissions(program, std::filesystem::perms::owner_all);
+    EXPECT_EQ(errorOf("inventory-variable: CIMT_INVENTORY\ninventory-check: ../libexec/check\n"), "no error");
+    const std::string file = tree.path("inventory");
+    const auto errorWith = [&](const std::string& content) {
+        const std::string written = tree.file("inventory", content);
+        try {
+            useInventory(written, read());
+            unsetenv("CIMT_INVENTORY");
+            return std::string("no error");
+        } catch (const UsageError& error) {
+            return std::string(error.what());
+        }
+    };
+    EXPECT_EQ(errorWith("bad"), "no inventory: " + file + ": line 1:\\x001B bad");
+    EXPECT_EQ(errorWith("good"), "no error");
+    EXPECT_EQ(errorWith("unclear"), "no error") << "it said nothing of the file";
+    std::filesystem::remove(program);
+    EXPECT_EQ(errorWith("bad"), "no error") << "there is nobody who could judge";
 }
 
 TEST_F(DefaultsFile, namesOfInventoriesAreShownPrintably)
