@@ -39,6 +39,9 @@ struct RegisteredClass
     std::vector<std::string> nameSpaces;
 };
 
+/// Whether the class is registered for that namespace; letter case is ignored.
+bool isRegisteredIn(const RegisteredClass& entry, const std::string& nameSpace);
+
 /// The classes in the order of the file.
 struct Registration
 {

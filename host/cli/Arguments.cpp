@@ -8,6 +8,7 @@
 #include <array>
 #include <chrono>
 #include <cmath>
+#include <cstdlib>
 #include <functional>
 #include <map>
 #include <sstream>
@@ -25,6 +26,7 @@ constexpr const char* footer = R"(Object paths are written as the commands print
 Quote them for the shell: 'CLASS.Key="value"'. Without a namespace, that of --namespace is meant.
 
 Examples:
+  cimhost classes                          what there is to ask
   cimhost ein CLASS                        the names of all instances
   cimhost ei CLASS Name HealthState        two properties of all instances
   cimhost gi 'CLASS.Key="value"'           one instance
@@ -152,7 +154,45 @@ cim::ObjectPath readTarget(const std::string& text, const std::string& nameSpace
     }
 }
 
-/// The check of an option's value. An empty one is a shell's variable that was not set, more often than not.
+/// As in "a, b or c".
+std::string joinedByOr(const std::vector<std::string>& words)
+{
+    std::string text;
+    for (std::size_t i = 0; i < words.size(); ++i)
+        text += (i == 0 ? "" : i + 1 < words.size() ? ", " : " or ") + words[i];
+    return text;
+}
+
+std::string expectedInstead(const std::string& expected, const std::string& found)
+{
+    return "expected " + expected + ", found \"" + cim::excerpt(found) + '"';
+}
+
+/// The checks of an option's value.
+CLI::Validator oneOf(std::vector<std::string> words)
+{
+    const auto check = [words = std::move(words)](const std::string& value) {
+        return std::find(words.begin(), words.end(), value) != words.end()
+                   ? std::string()
+                   : expectedInstead(joinedByOr(words), value);
+    };
+    return {check, ""};
+}
+
+/// \param expected  what the message says of the numbers
+CLI::Validator between(double least, double most, const char* expected)
+{
+    const auto check = [=](const std::string& value) {
+        char* end = nullptr;
+        const double number = std::strtod(value.c_str(), &end);
+        const bool isNumber =
+            !value.empty() && *end == '\0' && number >= least && number <= most; // nor is NaN one
+        return isNumber ? std::string() : expectedInstead(expected, value);
+    };
+    return {check, ""};
+}
+
+/// An empty one is a shell's variable that was not set, more often than not.
 CLI::Validator named(const char* what)
 {
     const auto check = [what](const std::string& value) {
@@ -182,12 +222,12 @@ void addCommonOptions(CLI::App& app, Arguments& arguments)
         ->check(named("file"));
     app.add_option("--like", settings.like, "Behave as a real broker does to providers and clients")
         ->type_name("BROKER")
-        ->check(CLI::IsMember(namesOfHabits()));
+        ->check(oneOf(namesOfHabits()));
     app.add_flag("--trace", settings.trace, "Show what providers trace and log, on standard error");
     app.add_option("-f,--format", arguments.format,
                    "How answers are shown; without it as text, and instances on a terminal as a table")
         ->type_name("FORMAT")
-        ->check(CLI::IsMember(formats()));
+        ->check(oneOf({"text", "table", "mof", "json"}));
 }
 
 void addFilters(CLI::App& command, Filters filters, Traversal& traversal)
@@ -251,7 +291,7 @@ void addServe(CLI::App& app, Serve& serve)
         ->capture_default_str();
     command.add_option("--port", serve.port, "Port to listen on; 0 for any that is free")
         ->type_name("PORT")
-        ->check(CLI::Range(0, 65535))
+        ->check(between(0, 65535, "a number from 0 to 65535"))
         ->capture_default_str();
 }
 
@@ -264,6 +304,7 @@ void addWatch(CLI::App& app, Arguments& arguments)
         ->type_name("");
     command.add_option("--interval", arguments.interval, "Seconds from one look to the next")
         ->type_name("SECONDS")
+        ->check(between(leastInterval, mostInterval, "0.1 to 86400 seconds"))
         ->capture_default_str();
     addWide(command, arguments.isWide);
 }
@@ -280,8 +321,6 @@ cim::ObjectPath readClass(const std::string& command, const std::string& text, c
 Watch watchOf(const Arguments& arguments)
 {
     constexpr double millisecondsASecond = 1000;
-    if (!(arguments.interval >= leastInterval && arguments.interval <= mostInterval)) // nor is NaN one
-        throw UsageError("--interval: expected 0.1 to 86400 seconds");
     return {arguments.watched.empty() ? cim::ObjectPath{"", arguments.nameSpace, "", {}}
                                       : readClass("watch", arguments.watched, arguments.nameSpace),
             std::chrono::milliseconds(std::llround(arguments.interval * millisecondsASecond)),
@@ -312,6 +351,7 @@ Command commandOf(const CLI::App& app, Arguments& arguments)
     if (entry != questionEntries.end())
         return questionOf(*entry, arguments);
     static const std::map<std::string, const char*> forms{
+        {"classes", "writes a table"},
         {"graph", "writes DOT"},
         {"serve", "writes XML"},
         {"watch", "shows a table, or a line for each change"}};
@@ -321,16 +361,39 @@ Command commandOf(const CLI::App& app, Arguments& arguments)
         return DrawGraph{arguments.nameSpace};
     if (name == "watch")
         return watchOf(arguments);
+    if (name == "classes")
+        return ListClasses{};
     return arguments.serve;
 }
 
 /// What is wrong, in one line.
 std::string describe(const CLI::App& app, const CLI::ParseError& error)
 {
-    if (!app.get_subcommands().empty())
-        return cim::printable(error.what());
-    const std::vector<std::string> unknown = app.remaining();
-    return unknown.empty() ? "a command is required" : "there is no command " + cim::excerpt(unknown.front());
+    const std::vector<std::string> unknown = app.remaining(true);
+    if (!unknown.empty() && unknown.front().front() == '-')
+        return "there is no option " + cim::excerpt(unknown.front());
+    if (app.get_subcommands().empty())
+        return unknown.empty() ? "a command is required"
+                               : "there is no command " + cim::excerpt(unknown.front());
+    if (!unknown.empty())
+        return expectedInstead("nothing more", unknown.front());
+    const std::string text = error.what();
+    if (dynamic_cast<const CLI::ArgumentMismatch*>(&error) != nullptr)
+        return cim::printable(text.substr(0, text.find(':'))) + ": expected a value, found nothing";
+    if (dynamic_cast<const CLI::ConversionError*>(&error) != nullptr) { // "Could not convert: OPTION = VALUE"
+        const std::size_t name = text.find(": ") + 2;
+        const std::size_t value = text.find(" = ", name);
+        return cim::printable(text.substr(name, value - name)) + ": " +
+               expectedInstead("a whole number", text.substr(value + 3));
+    }
+    return cim::printable(text);
+}
+
+/// Who says more.
+std::string helpOf(const CLI::App& app)
+{
+    const auto commands = app.get_subcommands();
+    return "cimhost " + (commands.empty() ? "" : commands.front()->get_name() + ' ') + "--help";
 }
 
 /// The help or version that was asked for, or the error.
@@ -339,7 +402,7 @@ Notice noticeOf(const CLI::App& app, const CLI::ParseError& error)
     std::ostringstream out;
     std::ostringstream err;
     if (app.exit(error, out, err) != 0)
-        throw UsageError(describe(app, error) + "\nTry: cimhost --help");
+        throw UsageError(describe(app, error) + "\nTry: " + helpOf(app));
     return {out.str()};
 }
 
@@ -356,6 +419,7 @@ std::variant<Invocation, Notice> parseArguments(std::vector<std::string> argumen
     addCommonOptions(app, result);
     for (const QuestionEntry& entry : questionEntries)
         addQuestion(app, entry, result);
+    addCommand(app, "classes", "List the classes that can be asked, with their namespaces and providers");
     addCommand(app, "graph", "Write a namespace's instances as a Graphviz graph");
     addServe(app, result.serve);
     addWatch(app, result);

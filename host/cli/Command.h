@@ -44,6 +44,10 @@ struct DrawGraph
     std::string nameSpace;
 };
 
+/// Lists what is registered.
+struct ListClasses
+{};
+
 /// Answers the clients of a network address until a signal ends it.
 struct Serve
 {
@@ -59,7 +63,7 @@ struct Watch
     bool isWide = false;                ///< the table is whole; the terminal shows its beginning
 };
 
-using Command = std::variant<Ask, DrawGraph, Serve, Watch>;
+using Command = std::variant<Ask, DrawGraph, ListClasses, Serve, Watch>;
 
 /// What the broker is to be started with.
 struct Settings

@@ -26,13 +26,10 @@ std::vector<RegisteredClass> instanceClasses(const Registration& registration, c
 {
     std::vector<RegisteredClass> classes;
     for (const RegisteredClass& entry : registration.classes) {
-        const bool inNameSpace =
-            std::any_of(entry.nameSpaces.begin(), entry.nameSpaces.end(),
-                        [&](const std::string& name) { return cim::sameName(name, nameSpace); });
         const bool isNew = std::none_of(classes.begin(), classes.end(), [&](const RegisteredClass& other) {
             return cim::sameName(other.className, entry.className);
         });
-        if (entry.instance && inNameSpace && isNew)
+        if (entry.instance && isRegisteredIn(entry, nameSpace) && isNew)
             classes.push_back(entry);
     }
     return classes;

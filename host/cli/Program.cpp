@@ -16,8 +16,8 @@ namespace cimhost::cli {
 
 namespace {
 
-ExitStatus follow(const Invocation& invocation, const Surroundings& surroundings,
-                  std::optional<std::size_t> columns, std::ostream& out, std::ostream& err)
+Ending follow(const Invocation& invocation, const Surroundings& surroundings,
+              std::optional<std::size_t> columns, std::ostream& out, std::ostream& err)
 {
     const Settings& settings = invocation.settings;
     const std::vector<std::string> files = findRegistrationFiles(settings, surroundings);
@@ -28,26 +28,26 @@ ExitStatus follow(const Invocation& invocation, const Surroundings& surroundings
         useInventory(*settings.inventory, defaults);
     Broker broker(std::move(registration), findProviderDirectories(settings, surroundings),
                   reportTo(err, settings.trace), settings.like ? findHabits(*settings.like) : nullptr);
-    return execute(command, broker, columns, out, err);
+    return {execute(command, broker, columns, out, err), std::holds_alternative<DrawGraph>(command)};
 }
 
-ExitStatus fail(const std::exception& error, ExitStatus status, std::ostream& err)
+Ending fail(const std::exception& error, ExitStatus status, std::ostream& err)
 {
     err << "cimhost: " << error.what() << '\n';
-    return status;
+    return {status};
 }
 
 } // namespace
 
-ExitStatus run(const std::vector<std::string>& arguments, const Surroundings& surroundings,
-               std::optional<std::size_t> columns, std::ostream& out, std::ostream& err)
+Ending run(const std::vector<std::string>& arguments, const Surroundings& surroundings,
+           std::optional<std::size_t> columns, std::ostream& out, std::ostream& err)
 {
     try {
         const std::variant<Invocation, Notice> parsed = parseArguments(arguments);
         if (const auto* invocation = std::get_if<Invocation>(&parsed))
             return follow(*invocation, surroundings, columns, out, err);
         out << std::get<Notice>(parsed).text;
-        return exitAnswered;
+        return {exitAnswered};
     } catch (const UsageError& error) {
         return fail(error, exitUsage, err);
     } catch (const RegistrationError& error) {

@@ -14,11 +14,17 @@
 
 namespace cimhost::cli {
 
+struct Ending
+{
+    ExitStatus status;
+    bool isOneDocument = false; ///< whether the output is of no use where only its beginning is read
+};
+
 /// Does what the command line asks for and never throws: errors are lines on `err`.
 /// \param arguments   without the program's name
 /// \param columns    of the terminal that `out` is; nothing: it is none
-ExitStatus run(const std::vector<std::string>& arguments, const Surroundings& surroundings,
-               std::optional<std::size_t> columns, std::ostream& out, std::ostream& err);
+Ending run(const std::vector<std::string>& arguments, const Surroundings& surroundings,
+           std::optional<std::size_t> columns, std::ostream& out, std::ostream& err);
 
 } // namespace cimhost::cli
 

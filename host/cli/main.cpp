@@ -36,13 +36,15 @@ int main(int argc, char* argv[])
     if (isatty(STDOUT_FILENO) != 0)
         columns = Terminal::size().columns;
     std::ostringstream out;
-    const ExitStatus status = run(std::vector<std::string>(argv + (argc > 0 ? 1 : 0), argv + argc),
-                                  readSurroundings(), columns, out, std::cerr);
+    const Ending ending = run(std::vector<std::string>(argv + (argc > 0 ? 1 : 0), argv + argc),
+                              readSurroundings(), columns, out, std::cerr);
     if (writeToStandardOutput(out.str()))
-        return status;
-    // A reader that has seen enough, such as head, needs no message.
-    if (const int reason = errno; reason != EPIPE)
+        return ending.status;
+    const int reason = errno;
+    if (reason != EPIPE)
         std::cerr << "cimhost: cannot write to standard output: " << std::generic_category().message(reason)
                   << '\n';
+    else if (ending.isOneDocument) // where a reader of lines, such as head, has seen enough
+        std::cerr << "cimhost: nobody read the graph to its end\n";
     return exitError;
 }

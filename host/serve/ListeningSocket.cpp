@@ -15,14 +15,15 @@ namespace cimhost::serve {
 
 namespace {
 
-[[noreturn]] void fail(const Endpoint& endpoint, const std::string& reason)
+[[noreturn]] void fail(const Endpoint& endpoint, const std::string& reason, bool isPortTaken = false)
 {
-    throw ListenError("cannot listen on " + cim::printable(textOf(endpoint)) + ": " + reason);
+    throw ListenError("cannot listen on " + cim::printable(textOf(endpoint)) + ": " + reason, isPortTaken);
 }
 
-std::string lastError()
+[[noreturn]] void failWithErrno(const Endpoint& endpoint)
 {
-    return std::generic_category().message(errno);
+    const int error = errno;
+    fail(endpoint, std::generic_category().message(error), error == EADDRINUSE);
 }
 
 std::uint16_t portOf(const sockaddr_storage& address)
@@ -54,7 +55,7 @@ ListeningSocket listenAt(const Endpoint& endpoint)
         bind(socket.number(), address->ai_addr, address->ai_addrlen) != 0 ||
         listen(socket.number(), SOMAXCONN) != 0 ||
         getsockname(socket.number(), reinterpret_cast<sockaddr*>(&bound), &length) != 0)
-        fail(endpoint, lastError());
+        failWithErrno(endpoint);
     return {socket.release(), {endpoint.address, portOf(bound)}};
 }
 

@@ -233,6 +233,11 @@ CMPIStatus cleanupAssociation(CMPIAssociationMI* /*mi*/, const CMPIContext* /*ct
     return ok;
 }
 
+bool refuses(const CMPIObjectPath* request)
+{
+    return textOf(request->ft->getNameSpace(request, nullptr)) == "root/refusing";
+}
+
 /// Shows what came of the options of the command line.
 void traceArguments(std::initializer_list<const char*> arguments, const char** properties)
 {
@@ -249,6 +254,8 @@ CMPIStatus associators(CMPIAssociationMI* /*mi*/, const CMPIContext* /*ctx*/, co
                        const char* role, const char* resultRole, const char** properties)
 {
     traceArguments({assocClass, resultClass, role, resultRole}, properties);
+    if (refuses(request))
+        return failure(CMPI_RC_ERR_FAILED, "which association?");
     if (hasClass(request, "CIMT_Lamp"))
         result->ft->returnInstance(result, rackInstance(request, properties));
     if (hasClass(request, "CIMT_RackSystem"))
@@ -262,6 +269,8 @@ CMPIStatus associatorNames(CMPIAssociationMI* /*mi*/, const CMPIContext* /*ctx*/
                            const char* role, const char* resultRole)
 {
     traceArguments({assocClass, resultClass, role, resultRole}, nullptr);
+    if (refuses(request))
+        return failure(CMPI_RC_ERR_FAILED, "which association?");
     if (hasClass(request, "CIMT_Lamp"))
         result->ft->returnObjectPath(result, rackPath(request));
     return ok;
@@ -272,6 +281,8 @@ CMPIStatus references(CMPIAssociationMI* /*mi*/, const CMPIContext* /*ctx*/, con
                       const char** properties)
 {
     traceArguments({resultClass, role}, properties);
+    if (refuses(request))
+        return failure(CMPI_RC_ERR_FAILED, "which association?");
     for (const Lamp& lamp : lamps())
         result->ft->returnInstance(result, linkInstance(request, lamp));
     return ok;
@@ -281,6 +292,8 @@ CMPIStatus referenceNames(CMPIAssociationMI* /*mi*/, const CMPIContext* /*ctx*/,
                           const CMPIObjectPath* request, const char* resultClass, const char* role)
 {
     traceArguments({resultClass, role}, nullptr);
+    if (refuses(request))
+        return failure(CMPI_RC_ERR_FAILED, "which association?");
     result->ft->returnObjectPath(result, linkPath(request, lamps().front()));
     return ok;
 }

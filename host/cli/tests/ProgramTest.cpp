@@ -36,7 +36,7 @@ Outcome runOn(std::optional<std::size_t> columns, const std::vector<std::string>
     const Surroundings surroundings{"/nowhere/bin", SAMPLE_PROVIDER_DIRECTORY, SAMPLE_REGISTRATION};
     std::ostringstream out;
     std::ostringstream err;
-    const int status = cimhost::cli::run(arguments, surroundings, columns, out, err);
+    const int status = cimhost::cli::run(arguments, surroundings, columns, out, err).status;
     return {status, out.str(), err.str()};
 }
 
@@ -243,7 +243,8 @@ TEST(GetInstance, showsThePropertiesNamed)
 
 TEST(GetInstance, isNotFoundIfNothingComesWithoutAnError)
 {
-    expectError(run({"gi", "CIMT_Lamp.DeviceID=\"none\""}), 1, "cimhost: CMPI_RC_ERR_NOT_FOUND (6)\n");
+    expectError(run({"gi", "CIMT_Lamp.DeviceID=\"none\""}), 1,
+                "cimhost: CMPI_RC_ERR_NOT_FOUND (6): there is no root/cimv2:CIMT_Lamp.DeviceID=\"none\"\n");
     const Outcome outcome = run({"gi", "CIMT_Lamp.DeviceID=\"none\"", "--format", "json"});
     EXPECT_EQ(outcome.status, 1);
     EXPECT_EQ(nlohmann::json::parse(outcome.out),
@@ -263,8 +264,8 @@ TEST(Traversals, handEveryArgumentOn)
         run({"ain", rackPath, "-ac", "CIMT_RackLamp", "-arc", "R", "-ar", "From", "-arr", "To", "--trace"})
             .err,
         "cimhost: trace INFO Sample: CIMT_RackLamp R From To\n");
-    EXPECT_EQ(run({"ri", rackPath, "-arc", "CIMT_RackLamp", "-ar", "From", "P", "--trace"}).err,
-              "cimhost: trace INFO Sample: CIMT_RackLamp From +P\n");
+    EXPECT_EQ(run({"ri", rackPath, "-arc", "CIMT_RackLamp", "-ar", "From", "PartComponent", "--trace"}).err,
+              "cimhost: trace INFO Sample: CIMT_RackLamp From +PartComponent\n");
     EXPECT_EQ(run({"rin", rackPath, "-arc", "CIMT_RackLamp", "-ar", "From", "--trace"}).err,
               "cimhost: trace INFO Sample: CIMT_RackLamp From\n");
 }
@@ -298,16 +299,51 @@ TEST(Traversals, printReferencesThatAreReadBack)
     EXPECT_EQ(run({"rin", path}).out, outcome.out);
 }
 
+TEST(Traversals, adviseAnAssociationClassAfterAnErrorWithoutOne)
+{
+    const std::string path = "root/refusing:CIMT_Lamp.DeviceID=\"x\"";
+    const std::string advice = "Every association was asked. For one of them add -ac CIMT_Refusing\n";
+    for (const char* const command : {"ai", "ain", "ri", "rin"}) {
+        const Outcome outcome = run({command, path});
+        EXPECT_EQ(outcome.status, 1);
+        EXPECT_EQ(outcome.err, "cimhost: CMPI_RC_ERR_FAILED (1): which association?\n" + advice) << command;
+        EXPECT_EQ(run({command, path, "-ac", "CIMT_Refusing"}).err,
+                  "cimhost: CMPI_RC_ERR_FAILED (1): which association?\n");
+    }
+}
+
+TEST(Classes, areListedWithWhatTheyAnswer)
+{
+    const std::string list = run({"classes"}).out;
+    EXPECT_THAT(list, StartsWith("Namespace "));
+    EXPECT_THAT(
+        list,
+        HasSubstr("\nroot/other     CIMT_RackLamp    all               Rack      libCimhostSample.so\n"));
+    EXPECT_THAT(list, HasSubstr("\nroot/cimv2     CIMT_RackSystem  ein, ei, gi       Rack "));
+}
+
+TEST(Properties, thatNoInstanceHasAreWarnedOf)
+{
+    const Outcome outcome = run({"ei", "CIMT_Lamp", "Nmae", "HealthState", "Bogus", "deviceid"});
+    EXPECT_EQ(outcome.status, 0);
+    EXPECT_EQ(outcome.err, "cimhost: no instance has the property Nmae; did you mean Name?\n"
+                           "cimhost: no instance has the property Bogus\n");
+    EXPECT_EQ(run({"gi", firstPath, "Name", "HealthState"}).err, "");
+    EXPECT_EQ(run({"ei", "root/careless:CIMT_Careless", "Name"}).err, "") << "there is no instance at all";
+}
+
 // Errors
 
 TEST(Errors, comeWithTheirCodeAndMessage)
 {
     expectError(run({"gi", "CIMT_Lamp"}), 1,
                 "cimhost: CMPI_RC_ERR_FAILED (1): At least one key should be passed\n");
-    expectError(
-        run({"ei", "CIMT_Lamp", "-n", "root/none"}), 1,
-        "cimhost: CMPI_RC_ERR_INVALID_NAMESPACE (3): no registration names the namespace root/none\n");
-    EXPECT_THAT(run({"ei", "CIMT_None"}).err, StartsWith("cimhost: CMPI_RC_ERR_INVALID_CLASS (5)"));
+    expectError(run({"ei", "CIMT_Lamp", "-n", "root/none"}), 1,
+                "cimhost: CMPI_RC_ERR_INVALID_NAMESPACE (3): no registration names the namespace root/none\n"
+                "Try: cimhost classes\n");
+    EXPECT_EQ(run({"ei", "CIMT_Lmap"}).err,
+              "cimhost: CMPI_RC_ERR_INVALID_CLASS (5): no provider is registered for the class CIMT_Lmap in "
+              "root/cimv2; did you mean CIMT_Lamp?\nTry: cimhost classes\n");
 }
 
 TEST(Errors, leaveOutWhatCameBeforeThemAndCannotDriveATerminal)
