@@ -41,7 +41,7 @@ std::string nearestName(const std::string& name, const std::vector<std::string>&
     if (name.size() > longest)
         return "";
     std::string nearest;
-    std::size_t least = std::max<std::size_t>(2, name.size() / 3) + 1;
+    std::size_t least = std::max<std::size_t>(2, name.size() / 4) + 1;
     for (const std::string& candidate : names)
         if (const std::size_t away = distance(name, candidate); away < least) {
             least = away;

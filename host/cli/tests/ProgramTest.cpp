@@ -437,14 +437,18 @@ TEST(Graph, showsObjectsByHealthAndAssociationsByName)
     EXPECT_EQ(outcome.out,
               R"(digraph "root/cimv2" {
     rankdir=LR;
-    node [fontname="sans-serif", style=filled];
-    edge [fontname="sans-serif", fontsize=9];
+    ranksep=2;
+    nodesep=0.1;
+    labelloc=t;
+    fontname="sans-serif";
+    label=<<font color="steelblue">CIMT_RackLamp: GroupComponent → PartComponent</font><br/>>;
+    node [fontname="sans-serif", style=filled, margin="0.1,0.03"];
     // CIMT_Broken: CMPI_RC_ERR_FAILED (1): broken on purpose\x001B[2J
     n0 [label="Rack <1> &amp; \"co\"\nCIMT_RackSystem", shape=box3d, fillcolor=white];
-    n1 [label="Fan 1\nCIMT_Lamp\nOK", shape=box, fillcolor=palegreen];
-    n2 [label="Lüfter 2\nCIMT_Lamp\nDegraded/Warning", shape=box, fillcolor=khaki];
-    n0 -> n1 [label="CIMT_RackLamp\nGroupComponent → PartComponent"];
-    n0 -> n2 [label="CIMT_RackLamp\nGroupComponent → PartComponent"];
+    n1 [label="Fan 1\nCIMT_Lamp\nOK, alarm Off", shape=box, fillcolor=palegreen];
+    n2 [label="Lüfter 2\nCIMT_Lamp\nDegraded/Warning, alarm Alternating", shape=box, fillcolor=khaki];
+    n0 -> n1 [color=steelblue];
+    n0 -> n2 [color=steelblue];
 }
 )");
 }
