@@ -138,8 +138,8 @@ INSTANTIATE_TEST_SUITE_P(
                     ",", ":", "/", "root/cimv2:CIM_A", "CIM_A", "CIM_A.", "CIM_A.K", "CIM_A.K=", "CIM_A.K=x",
                     "CIM_A.K=\"x", "CIM_A.K=\"x\" ", " CIM_A.K=\"x\"", "CIM_A.K=\"x\",", "CIM_A.K=1,K=2",
                     "CIM_A.K =1", "Fan.Number=1", "root/cimv2:Fan.Number=1", "_A.K=1", "A_.K=1", "1_A.K=1",
-                    "Bay 3: CIM_A.K=1", "\"quoted\"", "back\\slash", "ACME:Capabilities1", "TRUE",
-                    "42", "//", "//srv/", "http://srv/index.html", "mailto:CIM_A.K=1?", "CIM-A.K=1"));
+                    "Bay 3: CIM_A.K=1", "\"quoted\"", "back\\slash", "ACME:Capabilities1", "TRUE", "42", "//",
+                    "//srv/", "http://srv/index.html", "mailto:CIM_A.K=1?", "CIM-A.K=1"));
 
 TEST(ObjectPathReader, takesAnEscapedTextForAStringWhateverItLooksLike)
 {
