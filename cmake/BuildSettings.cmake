@@ -1,5 +1,15 @@
 # What every target of the project is built with: link against glimmark::settings.
 
+set(CMAKE_CXX_STANDARD 17)
+set(CMAKE_CXX_STANDARD_REQUIRED ON)
+set(CMAKE_CXX_EXTENSIONS OFF)
+set(CMAKE_POSITION_INDEPENDENT_CODE ON)
+set(CMAKE_EXPORT_COMPILE_COMMANDS ON)
+
+# One folder each for what a process loads and what a person runs, as in an installed tree.
+set(CMAKE_LIBRARY_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/lib)
+set(CMAKE_RUNTIME_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/bin)
+
 set(GLIMMARK_SANITIZE
     ""
     CACHE STRING "Sanitizers to build everything with, as in -fsanitize=, or nothing")

@@ -15,7 +15,8 @@ function(glimmark_add_cmpi_headers name directory)
     target_compile_definitions(glimmark_${name} INTERFACE CMPI_PLATFORM_LINUX_GENERIC_GNU __cdecl=)
 endfunction()
 
-glimmark_add_cmpi_headers(cmpi-own ${PROJECT_SOURCE_DIR}/cmpi)
+cmake_path(SET own_headers NORMALIZE ${CMAKE_CURRENT_LIST_DIR}/../cmpi)
+glimmark_add_cmpi_headers(cmpi-own ${own_headers})
 
 if(DEFINED GLIMMARK_CMPI_INCLUDE_DIR AND GLIMMARK_CMPI_INCLUDE_DIR)
     foreach(header IN ITEMS cmpidt.h cmpift.h)
@@ -37,11 +38,12 @@ endif()
 if(directory)
     glimmark_add_cmpi_headers(cmpi ${directory} SYSTEM)
 else()
-    set(directory ${PROJECT_SOURCE_DIR}/cmpi)
+    set(directory ${own_headers})
     glimmark_add_cmpi_headers(cmpi ${directory})
 endif()
 message(STATUS "CMPI headers: ${directory}")
 unset(directory)
+unset(own_headers)
 
 set(GLIMMARK_CMPI_INCLUDE_DIR
     ""

@@ -124,6 +124,7 @@ set(CPACK_RPM_SUPPORT-DEVELOPMENT_PACKAGE_REQUIRES
 )
 # Folders of the distribution's.
 set(CPACK_RPM_EXCLUDE_FROM_AUTO_FILELIST_ADDITION
+    /usr/libexec
     /usr/sbin
     /usr/share/locale
     /usr/lib64/cmake

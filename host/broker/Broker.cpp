@@ -194,13 +194,17 @@ cim::Answer Broker::enumerateInstances(const cim::ObjectPath& classPath, const c
 
 cim::Answer Broker::getInstance(const cim::ObjectPath& path, const cim::PropertyList& properties)
 {
-    return askInstanceProvider(implementation_->core, implementation_->router, "getInstance",
-                               {Operation::getInstance, path, {}, properties},
-                               [](CMPIInstanceMI& mi, Request& request, const OperationRequest& asked,
-                                  const CMPIObjectPath* instPath) {
-                                   return mi.ft->getInstance(&mi, request.context(), request.result(),
-                                                             instPath, NameArray(asked.properties).get());
-                               });
+    cim::Answer answer =
+        askInstanceProvider(implementation_->core, implementation_->router, "getInstance",
+                            {Operation::getInstance, path, {}, properties},
+                            [](CMPIInstanceMI& mi, Request& request, const OperationRequest& asked,
+                               const CMPIObjectPath* instPath) {
+                                return mi.ft->getInstance(&mi, request.context(), request.result(), instPath,
+                                                          NameArray(asked.properties).get());
+                            });
+    if (answer.status.code == CMPI_RC_OK && answer.instances.empty())
+        answer.status.code = CMPI_RC_ERR_NOT_FOUND;
+    return answer;
 }
 
 cim::Answer Broker::createInstance(const cim::ObjectPath& classPath, const cim::Instance& instance)

@@ -79,6 +79,7 @@ public:
     cim::Answer enumerateInstanceNames(const cim::ObjectPath& classPath);
     cim::Answer enumerateInstances(const cim::ObjectPath& classPath,
                                    const cim::PropertyList& properties = {});
+    /// An answer without an instance and without an error is CMPI_RC_ERR_NOT_FOUND, as real brokers have it.
     cim::Answer getInstance(const cim::ObjectPath& path, const cim::PropertyList& properties = {});
     cim::Answer createInstance(const cim::ObjectPath& classPath, const cim::Instance& instance);
     cim::Answer modifyInstance(const cim::ObjectPath& path, const cim::Instance& instance,
@@ -130,7 +131,8 @@ public:
     CMPIInstance* instance(const cim::Instance& instance);
 
     /// What the provider has returned through `result()` so far, with the provider's own status read
-    /// into it. \param status  what the operation returned; its message is read while the request lives
+    /// into it.
+    /// \param status  what the operation returned; its message is read while the request lives
     [[nodiscard]] cim::Answer answer(const CMPIStatus& status) const;
     /// How often the provider has called returnDone.
     [[nodiscard]] int doneCount() const;

@@ -58,7 +58,8 @@ CMPIEnumeration* enumerate(Call& call, const cim::Status& status, std::vector<Co
     return call.make<EnumerationObject>(type, std::move(elements));
 }
 
-/// Runs an up-call that brings paths. \param ask  makes the request of the broker
+/// Runs an up-call that brings paths.
+/// \param ask  makes the request of the broker
 template <class Ask>
 CMPIEnumeration* enumeratePaths(const char* service, const CMPIBroker* broker, const CMPIContext* context,
                                 const CMPIObjectPath* path, CMPIStatus* rc, const Ask& ask)
@@ -82,16 +83,10 @@ CMPIEnumeration* enumerateObjects(const char* service, const CMPIBroker* broker,
     });
 }
 
-/// The one instance of an answer; null and the status CMPI_RC_ERR_NOT_FOUND when it has none.
+/// The one instance of an answer; null when the answer is an error.
 const cim::Instance* single(Call& call, const cim::Answer& answer)
 {
-    if (!passStatus(call, answer.status))
-        return nullptr;
-    if (answer.instances.empty()) {
-        call.answerWith(CMPI_RC_ERR_NOT_FOUND);
-        return nullptr;
-    }
-    return &answer.instances.front();
+    return passStatus(call, answer.status) ? &answer.instances.front() : nullptr;
 }
 
 // Threads of a provider's own. The objects that such a thread makes between attachThread and

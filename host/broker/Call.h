@@ -33,11 +33,13 @@ public:
     Call(const Call&) = delete;
     Call& operator=(const Call&) = delete;
 
-    /// The broker that the call is made to. \throws Refusal  and reports when there is none
+    /// The broker that the call is made to.
+    /// \throws Refusal  and reports when there is none
     Core& broker(const CMPIBroker* broker);
 
-    /// The content of an object that the provider passed. \param role  what it is in this call, for the
-    /// report. \throws Refusal  and reports when it is null, foreign, dead or of another kind
+    /// The content of an object that the provider passed.
+    /// \param role  what it is in this call, for the report
+    /// \throws Refusal  and reports when it is null, foreign, dead or of another kind
     template <class Object>
     Object& use(const EnvelopeOf<Object>* object, const char* role)
     {
@@ -48,15 +50,18 @@ public:
     Handle& resolve(const void* object, const char* role);
     Handle& resolve(const void* object, const char* role, Kind kind);
 
-    /// A text that must be there. \throws Refusal  and reports when it is null
+    /// A text that must be there.
+    /// \throws Refusal  and reports when it is null
     const char* text(const char* text, const char* role);
 
-    /// Reports a misuse. \throws Refusal  always
+    /// Reports a misuse.
+    /// \throws Refusal  always
     [[noreturn]] void refuse(CMPIrc code, const std::string& why);
 
     /// Sets the code that the call answers with, without any misuse.
     void answerWith(CMPIrc code) { status_ = {code, nullptr}; }
-    /// The same, and leaves the service. \throws Refusal  always
+    /// The same, and leaves the service.
+    /// \throws Refusal  always
     [[noreturn]] static void leave(CMPIrc code) { throw Refusal{code}; }
     void answerWith(const CMPIStatus& status) { status_ = status; }
     [[nodiscard]] const CMPIStatus& status() const { return status_; }

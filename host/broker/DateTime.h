@@ -17,7 +17,8 @@ bool isDateTime(std::string_view text);
 bool isInterval(std::string_view text);
 
 /// Microseconds since 1970-01-01 00:00:00 UTC, or of the interval; digits not given count as the
-/// smallest that may stand there. A point in time before 1970 is 0. \param text  for which isDateTime() holds
+/// smallest that may stand there. A point in time before 1970 is 0.
+/// \param text  for which isDateTime() holds
 std::uint64_t toMicroseconds(std::string_view text);
 
 /// The point in time, in UTC, or the interval; one beyond what the text can hold is the last that it can.

@@ -24,7 +24,8 @@ using HabitInTables = void (*)(FunctionTables& tables, CMPIBroker& broker);
 /// \throws RoutingError  the provider is not asked
 using HabitInQuestion = void (*)(OperationRequest& question, const RegisteredClass& served);
 
-/// Changes what came back. \param question  as the provider was asked it
+/// Changes what came back.
+/// \param question  as the provider was asked it
 using HabitInAnswer = void (*)(cim::Answer& answer, const OperationRequest& question);
 
 struct Habit
@@ -67,7 +68,8 @@ void haveNoMemoryServices(FunctionTables& tables, CMPIBroker& broker);
 /// Data with another state.
 CMPIData withState(CMPIData data, unsigned int state);
 
-/// Writes a code without a message. \param rc  may be null
+/// Writes a code without a message.
+/// \param rc  may be null
 void writeCode(CMPIStatus* rc, CMPIrc code);
 
 } // namespace cimhost

@@ -28,7 +28,8 @@ public:
     HandleSpace(const HandleSpace&) = delete;
     HandleSpace& operator=(const HandleSpace&) = delete;
 
-    /// The first of `blockSize` handles, none of them live. \throws std::bad_alloc
+    /// The first of `blockSize` handles, none of them live.
+    /// \throws std::bad_alloc
     Handle* takeBlock();
     /// \param block  from takeBlock, with no live handle in it
     void giveBack(Handle* block) noexcept;

@@ -28,7 +28,8 @@ void* allocate(Core& core, std::size_t size)
     return block;
 }
 
-/// The handle of a block of this thread's scopes, or of a lasting one. \throws Refusal  and reports
+/// The handle of a block of this thread's scopes, or of a lasting one.
+/// \throws Refusal  and reports
 /// for any other pointer
 Handle& findMemory(Call& call, Core& core, void* block)
 {

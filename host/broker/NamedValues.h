@@ -39,7 +39,8 @@ CMPIData getNamed(Call& call, const std::vector<Named>& list, const char* name, 
     return giveValue(call.core(), present->value, state);
 }
 
-/// The data at a place. \param name  receives the name unless it is null
+/// The data at a place.
+/// \param name  receives the name unless it is null
 template <class Named>
 CMPIData getNamedAt(Call& call, const std::vector<Named>& list, CMPICount index, CMPIString** name,
                     CMPIrc missing, CMPIValueState state = CMPI_goodValue)

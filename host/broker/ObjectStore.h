@@ -25,7 +25,8 @@ public:
     ObjectStore(const ObjectStore&) = delete;
     ObjectStore& operator=(const ObjectStore&) = delete;
 
-    /// A new object with that content. \throws std::bad_alloc  when memory or handles are used up
+    /// A new object with that content.
+    /// \throws std::bad_alloc  when memory or handles are used up
     template <class Object>
     Handle& add(std::unique_ptr<Object> content);
 

@@ -10,7 +10,8 @@
 namespace cimhost {
 
 /// A path as clients write it, an instance in MOF, a string or datetime as it is; of other objects the
-/// name of their type. \param handle  of a live object
+/// name of their type.
+/// \param handle  of a live object
 std::string objectText(const Handle& handle);
 
 } // namespace cimhost

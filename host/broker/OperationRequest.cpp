@@ -2,18 +2,6 @@
 
 namespace cimhost {
 
-namespace {
-
-cim::Answer getInstance(const OperationRequest& request, Broker& broker)
-{
-    cim::Answer answer = broker.getInstance(request.target, request.properties);
-    if (answer.status.code == CMPI_RC_OK && answer.instances.empty())
-        answer.status.code = CMPI_RC_ERR_NOT_FOUND;
-    return answer;
-}
-
-} // namespace
-
 bool answersPaths(Operation operation)
 {
     switch (operation) {
@@ -46,7 +34,7 @@ cim::Answer perform(const OperationRequest& request, Broker& broker)
     case Operation::enumerateInstances:
         return broker.enumerateInstances(request.target, request.properties);
     case Operation::getInstance:
-        return getInstance(request, broker);
+        return broker.getInstance(request.target, request.properties);
     case Operation::createInstance:
         return broker.createInstance(request.target, request.instance);
     case Operation::modifyInstance:

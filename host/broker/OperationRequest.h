@@ -46,8 +46,7 @@ bool answersPaths(Operation operation);
 bool isTraversal(Operation operation);
 bool isReferenceTraversal(Operation operation);
 
-/// Asks the broker. GetInstance that brings no instance without an error is CMPI_RC_ERR_NOT_FOUND, as
-/// real brokers have it.
+/// Asks the broker.
 cim::Answer perform(const OperationRequest& request, Broker& broker);
 
 } // namespace cimhost

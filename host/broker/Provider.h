@@ -75,7 +75,8 @@ public:
     /// \param surroundings  must outlive the provider
     Provider(ProviderSurroundings& surroundings, std::string name, std::string location);
 
-    /// Its management interfaces. \throws ProviderError  when it has none, the same every time
+    /// Its management interfaces.
+    /// \throws ProviderError  when it has none, the same every time
     CMPIInstanceMI& instanceMI(const std::string& nameSpace);
     CMPIAssociationMI& associationMI(const std::string& nameSpace);
 

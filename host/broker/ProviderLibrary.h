@@ -27,7 +27,8 @@ public:
     ProviderLibrary(const ProviderLibrary&) = delete;
     ProviderLibrary& operator=(const ProviderLibrary&) = delete;
 
-    /// The function of that name. \throws ProviderError  when there is none
+    /// The function of that name.
+    /// \throws ProviderError  when there is none
     template <class Function>
     [[nodiscard]] Function* function(const std::string& name) const
     {

@@ -213,6 +213,12 @@ private:
 
 } // namespace
 
+bool isRegisteredIn(const RegisteredClass& entry, const std::string& nameSpace)
+{
+    return std::any_of(entry.nameSpaces.begin(), entry.nameSpaces.end(),
+                       [&](const std::string& name) { return cim::sameName(name, nameSpace); });
+}
+
 Registration parseRegistration(const std::string& text, const std::string& name)
 {
     return Parser(name).parse(text);

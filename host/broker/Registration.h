@@ -2,7 +2,7 @@
 /// The registration of providers, in the format of the small-footprint CIM broker:
 ///
 ///     # a comment
-///     [TAVRO_Example]
+///     [CIM_Example]
 ///        provider: ExampleProvider
 ///        location: ExampleLibrary
 ///        type: instance association
@@ -39,13 +39,17 @@ struct RegisteredClass
     std::vector<std::string> nameSpaces;
 };
 
+/// Whether the class is registered for that namespace; letter case is ignored.
+bool isRegisteredIn(const RegisteredClass& entry, const std::string& nameSpace);
+
 /// The classes in the order of the file.
 struct Registration
 {
     std::vector<RegisteredClass> classes;
 };
 
-/// Reads registration text. \param name  what to call it in error messages
+/// Reads registration text.
+/// \param name  what to call it in error messages
 /// \throws RegistrationError  on anything that the format does not have: a line outside a section, an
 /// unknown or repeated entry, a missing one, an unknown type, the same class and provider twice
 Registration parseRegistration(const std::string& text, const std::string& name);
@@ -53,8 +57,8 @@ Registration parseRegistration(const std::string& text, const std::string& name)
 /// The longest file read, in bytes.
 constexpr std::size_t maxRegistrationLength = 1048576;
 
-/// Reads a registration file. \throws RegistrationError  also when the file cannot be read, is no
-/// regular file or too long
+/// Reads a registration file.
+/// \throws RegistrationError  also when the file cannot be read, is no regular file or too long
 Registration readRegistrationFile(const std::string& fileName);
 
 } // namespace cimhost

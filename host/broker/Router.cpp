@@ -1,20 +1,11 @@
 #include "broker/Router.h"
 
+#include "cim/Nearest.h"
 #include "cim/Values.h"
 
 #include <algorithm>
 
 namespace cimhost {
-
-namespace {
-
-bool isIn(const RegisteredClass& entry, const std::string& nameSpace)
-{
-    return std::any_of(entry.nameSpaces.begin(), entry.nameSpaces.end(),
-                       [&](const std::string& name) { return cim::sameName(name, nameSpace); });
-}
-
-} // namespace
 
 Router::Router(Core& core, Registration registration, std::vector<std::string> directories)
     : registration_(std::move(registration)),
@@ -43,7 +34,7 @@ std::vector<const RegisteredClass*> Router::associationClasses(const std::string
     requireNameSpace(nameSpace);
     std::vector<const RegisteredClass*> found;
     for (const RegisteredClass& entry : registration_.classes)
-        if (entry.association && isIn(entry, nameSpace))
+        if (entry.association && isRegisteredIn(entry, nameSpace))
             found.push_back(&entry);
     return found;
 }
@@ -59,8 +50,12 @@ const RegisteredClass& Router::find(const std::string& className, const std::str
 {
     requireNameSpace(nameSpace);
     bool known = false;
+    std::vector<std::string> names;
     for (const RegisteredClass& entry : registration_.classes) {
-        if (!cim::sameName(entry.className, className) || !isIn(entry, nameSpace))
+        if (!isRegisteredIn(entry, nameSpace))
+            continue;
+        names.push_back(entry.className);
+        if (!cim::sameName(entry.className, className))
             continue;
         if (entry.*serves)
             return entry;
@@ -69,15 +64,15 @@ const RegisteredClass& Router::find(const std::string& className, const std::str
     if (known)
         throw RoutingError(CMPI_RC_ERR_NOT_SUPPORTED,
                            "no " + std::string(type) + " provider is registered for the class " + className);
-    throw RoutingError(CMPI_RC_ERR_INVALID_CLASS,
-                       "no provider is registered for the class " + className + " in " + nameSpace);
+    throw RoutingError(CMPI_RC_ERR_INVALID_CLASS, "no provider is registered for the class " + className +
+                                                      " in " + nameSpace + cim::didYouMean(className, names));
 }
 
 void Router::requireNameSpace(const std::string& nameSpace) const
 {
     const auto& classes = registration_.classes;
     if (std::none_of(classes.begin(), classes.end(),
-                     [&](const RegisteredClass& entry) { return isIn(entry, nameSpace); }))
+                     [&](const RegisteredClass& entry) { return isRegisteredIn(entry, nameSpace); }))
         throw RoutingError(CMPI_RC_ERR_INVALID_NAMESPACE,
                            nameSpace.empty() ? "the path names no namespace"
                                              : "no registration names the namespace " + nameSpace);

@@ -36,13 +36,16 @@ public:
 
     [[nodiscard]] const Registration& registration() const { return registration_; }
 
-    /// What serves the instances of a class in a namespace. \throws RoutingError
+    /// What serves the instances of a class in a namespace.
+    /// \throws RoutingError
     [[nodiscard]] const RegisteredClass& instanceClass(const std::string& className,
                                                        const std::string& nameSpace) const;
-    /// What serves the traversals of an association class in a namespace. \throws RoutingError
+    /// What serves the traversals of an association class in a namespace.
+    /// \throws RoutingError
     [[nodiscard]] const RegisteredClass& associationClass(const std::string& className,
                                                           const std::string& nameSpace) const;
-    /// All that serves traversals in a namespace. \throws RoutingError
+    /// All that serves traversals in a namespace.
+    /// \throws RoutingError
     [[nodiscard]] std::vector<const RegisteredClass*> associationClasses(const std::string& nameSpace) const;
 
     /// Who serves one of these.

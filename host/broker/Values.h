@@ -29,7 +29,8 @@ cim::Value takeValue(Call& call, const CMPIValue* value, CMPIType type, const ch
 cim::Value::Scalar takeScalar(Call& call, const CMPIValue* value, CMPIType type, const char* role);
 
 /// What a provider gets to see; text, references, arrays and the like as new objects of this thread's
-/// request. \param state  flags to be set besides CMPI_nullValue
+/// request.
+/// \param state  flags to be set besides CMPI_nullValue
 CMPIData giveValue(Core& core, const cim::Value& value, CMPIValueState state = CMPI_goodValue);
 
 /// The same for one element.

@@ -1,8 +1,8 @@
 /// \file
 /// Object paths as text, in the form that the clients of the field write:
 ///
-///     root/cimv2:TAVRO_Example.Name="a \"b\"",Number=42,Flag=TRUE
-///     //host/root/cimv2:TAVRO_Link.Left="root/cimv2:TAVRO_Example.Name=\"a\""
+///     root/cimv2:CIM_Example.Name="a \"b\"",Number=42,Flag=TRUE
+///     //host/root/cimv2:CIM_Link.Left="root/cimv2:CIM_Example.Name=\"a\""
 ///
 /// Before the class may stand a host (`//host/`, `http://host:port/`) and a namespace; without keys
 /// it is the path of a class. Numbers are decimal. Texts are quoted, with the escapes of MOF:

@@ -40,19 +40,9 @@ void checkType(int descriptor)
 RegularFile::RegularFile(const std::string& name)
     : descriptor_(open(name.c_str(), O_RDONLY | O_CLOEXEC | O_NOCTTY | O_NONBLOCK))
 {
-    if (descriptor_ < 0)
+    if (!descriptor_.isOpen())
         failWithErrno();
-    try {
-        checkType(descriptor_);
-    } catch (const FileError&) {
-        close(descriptor_);
-        throw;
-    }
-}
-
-RegularFile::~RegularFile()
-{
-    close(descriptor_);
+    checkType(descriptor_.number());
 }
 
 std::string RegularFile::read(std::size_t mostBytes) const
@@ -60,7 +50,7 @@ std::string RegularFile::read(std::size_t mostBytes) const
     std::string content;
     std::array<char, 65536> part{};
     while (true) {
-        const ssize_t count = ::read(descriptor_, part.data(), part.size());
+        const ssize_t count = ::read(descriptor_.number(), part.data(), part.size());
         if (count < 0 && errno != EINTR)
             failWithErrno();
         if (count == 0)

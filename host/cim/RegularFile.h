@@ -2,6 +2,8 @@
 #ifndef CIMHOST_CIM_REGULARFILE_H
 #define CIMHOST_CIM_REGULARFILE_H
 
+#include "cim/Descriptor.h"
+
 #include <cstddef>
 #include <stdexcept>
 #include <string>
@@ -22,16 +24,14 @@ class RegularFile
 public:
     /// \throws FileError
     explicit RegularFile(const std::string& name);
-    ~RegularFile();
-    RegularFile(const RegularFile&) = delete;
-    RegularFile& operator=(const RegularFile&) = delete;
 
-    /// What is left to read. \param mostBytes  more is refused
+    /// What is left to read.
+    /// \param mostBytes  more is refused
     /// \throws FileError
     [[nodiscard]] std::string read(std::size_t mostBytes) const;
 
 private:
-    int descriptor_;
+    Descriptor descriptor_;
 };
 
 } // namespace cimhost::cim

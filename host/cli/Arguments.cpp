@@ -8,6 +8,7 @@
 #include <array>
 #include <chrono>
 #include <cmath>
+#include <cstdlib>
 #include <functional>
 #include <map>
 #include <sstream>
@@ -25,13 +26,14 @@ constexpr const char* footer = R"(Object paths are written as the commands print
 Quote them for the shell: 'CLASS.Key="value"'. Without a namespace, that of --namespace is meant.
 
 Examples:
+  cimhost classes                          what there is to ask
   cimhost ein CLASS                        the names of all instances
   cimhost ei CLASS Name HealthState        two properties of all instances
   cimhost gi 'CLASS.Key="value"'           one instance
   cimhost ai -ac ASSOC 'CLASS.Key="value"' what an association ties to it
   cimhost graph | dot -Tsvg > graph.svg    the whole picture
   cimhost serve                            for CIM clients on this machine
-  cimhost watch                            this server's indicators, live
+  cimhost watch                            what the installation is for, live
 
 Environment:
   CIMHOST_PROVIDER_DIR   directories of provider libraries, separated by colons
@@ -71,8 +73,9 @@ struct Arguments
     std::string format;
     OperationRequest request;
     Serve serve{"127.0.0.1", standardPort};
-    std::string watched = "TAVRO_Glimmark";
+    std::string watched; ///< empty: what the installation says
     double interval = 2; ///< seconds
+    bool isWide = false;
     Settings settings;
 };
 
@@ -151,7 +154,45 @@ cim::ObjectPath readTarget(const std::string& text, const std::string& nameSpace
     }
 }
 
-/// The check of an option's value. An empty one is a shell's variable that was not set, more often than not.
+/// As in "a, b or c".
+std::string joinedByOr(const std::vector<std::string>& words)
+{
+    std::string text;
+    for (std::size_t i = 0; i < words.size(); ++i)
+        text += (i == 0 ? "" : i + 1 < words.size() ? ", " : " or ") + words[i];
+    return text;
+}
+
+std::string expectedInstead(const std::string& expected, const std::string& found)
+{
+    return "expected " + expected + ", found \"" + cim::excerpt(found) + '"';
+}
+
+/// The checks of an option's value.
+CLI::Validator oneOf(std::vector<std::string> words)
+{
+    const auto check = [words = std::move(words)](const std::string& value) {
+        return std::find(words.begin(), words.end(), value) != words.end()
+                   ? std::string()
+                   : expectedInstead(joinedByOr(words), value);
+    };
+    return {check, ""};
+}
+
+/// \param expected  what the message says of the numbers
+CLI::Validator between(double least, double most, const char* expected)
+{
+    const auto check = [=](const std::string& value) {
+        char* end = nullptr;
+        const double number = std::strtod(value.c_str(), &end);
+        const bool isNumber =
+            !value.empty() && *end == '\0' && number >= least && number <= most; // nor is NaN one
+        return isNumber ? std::string() : expectedInstead(expected, value);
+    };
+    return {check, ""};
+}
+
+/// An empty one is a shell's variable that was not set, more often than not.
 CLI::Validator named(const char* what)
 {
     const auto check = [what](const std::string& value) {
@@ -176,17 +217,17 @@ void addCommonOptions(CLI::App& app, Arguments& arguments)
         ->type_name("FILE")
         ->check(named("file"))
         ->allow_extra_args(false);
-    app.add_option("--inventory", settings.inventory, "Hardware inventory for the providers, TAVRO_INVENTORY")
+    app.add_option("--inventory", settings.inventory, "Hardware inventory for the providers")
         ->type_name("FILE")
         ->check(named("file"));
     app.add_option("--like", settings.like, "Behave as a real broker does to providers and clients")
         ->type_name("BROKER")
-        ->check(CLI::IsMember(namesOfHabits()));
+        ->check(oneOf(namesOfHabits()));
     app.add_flag("--trace", settings.trace, "Show what providers trace and log, on standard error");
     app.add_option("-f,--format", arguments.format,
                    "How answers are shown; without it as text, and instances on a terminal as a table")
         ->type_name("FORMAT")
-        ->check(CLI::IsMember(formats()));
+        ->check(oneOf({"text", "table", "mof", "json"}));
 }
 
 void addFilters(CLI::App& command, Filters filters, Traversal& traversal)
@@ -206,6 +247,11 @@ void addFilters(CLI::App& command, Filters filters, Traversal& traversal)
         ->type_name("CLASS");
     command.add_option("--result-role", traversal.resultRole, "Role of the objects found, -arr")
         ->type_name("ROLE");
+}
+
+void addWide(CLI::App& command, bool& isWide)
+{
+    command.add_flag("--wide", isWide, "Show tables whole on a terminal too, however wide they are");
 }
 
 /// A command, with what all of them have.
@@ -232,6 +278,7 @@ void addQuestion(CLI::App& app, const QuestionEntry& entry, Arguments& arguments
         command.add_option("PROPERTY", arguments.properties, "Properties wanted; without any, all")
             ->type_name("");
     addFilters(command, entry.filters, arguments.request.traversal);
+    addWide(command, arguments.isWide);
 }
 
 void addServe(CLI::App& app, Serve& serve)
@@ -244,19 +291,22 @@ void addServe(CLI::App& app, Serve& serve)
         ->capture_default_str();
     command.add_option("--port", serve.port, "Port to listen on; 0 for any that is free")
         ->type_name("PORT")
-        ->check(CLI::Range(0, 65535))
+        ->check(between(0, 65535, "a number from 0 to 65535"))
         ->capture_default_str();
 }
 
 void addWatch(CLI::App& app, Arguments& arguments)
 {
     CLI::App& command = addCommand(app, "watch", "Show a class's instances live, and what changes");
-    command.add_option("CLASS", arguments.watched, "The class, such as root/cimv2:CLASS")
-        ->type_name("")
-        ->capture_default_str();
+    command
+        .add_option("CLASS", arguments.watched,
+                    "The class, such as root/cimv2:CLASS; without it that of the installation")
+        ->type_name("");
     command.add_option("--interval", arguments.interval, "Seconds from one look to the next")
         ->type_name("SECONDS")
+        ->check(between(leastInterval, mostInterval, "0.1 to 86400 seconds"))
         ->capture_default_str();
+    addWide(command, arguments.isWide);
 }
 
 /// The class that a command takes.
@@ -271,10 +321,10 @@ cim::ObjectPath readClass(const std::string& command, const std::string& text, c
 Watch watchOf(const Arguments& arguments)
 {
     constexpr double millisecondsASecond = 1000;
-    if (!(arguments.interval >= leastInterval && arguments.interval <= mostInterval)) // nor is NaN one
-        throw UsageError("--interval: expected 0.1 to 86400 seconds");
-    return {readClass("watch", arguments.watched, arguments.nameSpace),
-            std::chrono::milliseconds(std::llround(arguments.interval * millisecondsASecond))};
+    return {arguments.watched.empty() ? cim::ObjectPath{"", arguments.nameSpace, "", {}}
+                                      : readClass("watch", arguments.watched, arguments.nameSpace),
+            std::chrono::milliseconds(std::llround(arguments.interval * millisecondsASecond)),
+            arguments.isWide};
 }
 
 Ask questionOf(const QuestionEntry& entry, Arguments& arguments)
@@ -286,7 +336,7 @@ Ask questionOf(const QuestionEntry& entry, Arguments& arguments)
                          : readTarget(arguments.target, arguments.nameSpace);
     if (!arguments.properties.empty())
         request.properties = arguments.properties;
-    Ask ask{request, {}};
+    Ask ask{request, {}, arguments.isWide};
     if (!arguments.format.empty())
         ask.format = formats().at(arguments.format);
     return ask;
@@ -301,6 +351,7 @@ Command commandOf(const CLI::App& app, Arguments& arguments)
     if (entry != questionEntries.end())
         return questionOf(*entry, arguments);
     static const std::map<std::string, const char*> forms{
+        {"classes", "writes a table"},
         {"graph", "writes DOT"},
         {"serve", "writes XML"},
         {"watch", "shows a table, or a line for each change"}};
@@ -310,16 +361,39 @@ Command commandOf(const CLI::App& app, Arguments& arguments)
         return DrawGraph{arguments.nameSpace};
     if (name == "watch")
         return watchOf(arguments);
+    if (name == "classes")
+        return ListClasses{};
     return arguments.serve;
 }
 
 /// What is wrong, in one line.
 std::string describe(const CLI::App& app, const CLI::ParseError& error)
 {
-    if (!app.get_subcommands().empty())
-        return cim::printable(error.what());
-    const std::vector<std::string> unknown = app.remaining();
-    return unknown.empty() ? "a command is required" : "there is no command " + cim::excerpt(unknown.front());
+    const std::vector<std::string> unknown = app.remaining(true);
+    if (!unknown.empty() && unknown.front().front() == '-')
+        return "there is no option " + cim::excerpt(unknown.front());
+    if (app.get_subcommands().empty())
+        return unknown.empty() ? "a command is required"
+                               : "there is no command " + cim::excerpt(unknown.front());
+    if (!unknown.empty())
+        return expectedInstead("nothing more", unknown.front());
+    const std::string text = error.what();
+    if (dynamic_cast<const CLI::ArgumentMismatch*>(&error) != nullptr)
+        return cim::printable(text.substr(0, text.find(':'))) + ": expected a value, found nothing";
+    if (dynamic_cast<const CLI::ConversionError*>(&error) != nullptr) { // "Could not convert: OPTION = VALUE"
+        const std::size_t name = text.find(": ") + 2;
+        const std::size_t value = text.find(" = ", name);
+        return cim::printable(text.substr(name, value - name)) + ": " +
+               expectedInstead("a whole number", text.substr(value + 3));
+    }
+    return cim::printable(text);
+}
+
+/// Who says more.
+std::string helpOf(const CLI::App& app)
+{
+    const auto commands = app.get_subcommands();
+    return "cimhost " + (commands.empty() ? "" : commands.front()->get_name() + ' ') + "--help";
 }
 
 /// The help or version that was asked for, or the error.
@@ -328,7 +402,7 @@ Notice noticeOf(const CLI::App& app, const CLI::ParseError& error)
     std::ostringstream out;
     std::ostringstream err;
     if (app.exit(error, out, err) != 0)
-        throw UsageError(describe(app, error) + "\nTry: cimhost --help");
+        throw UsageError(describe(app, error) + "\nTry: " + helpOf(app));
     return {out.str()};
 }
 
@@ -345,6 +419,7 @@ std::variant<Invocation, Notice> parseArguments(std::vector<std::string> argumen
     addCommonOptions(app, result);
     for (const QuestionEntry& entry : questionEntries)
         addQuestion(app, entry, result);
+    addCommand(app, "classes", "List the classes that can be asked, with their namespaces and providers");
     addCommand(app, "graph", "Write a namespace's instances as a Graphviz graph");
     addServe(app, result.serve);
     addWatch(app, result);

@@ -35,6 +35,7 @@ struct Ask
 {
     OperationRequest request;
     std::optional<Format> format; ///< nothing: the one that suits the operation and the output
+    bool isWide = false;          ///< tables are whole, however wide the terminal is
 };
 
 /// Draws the instances of a namespace.
@@ -42,6 +43,10 @@ struct DrawGraph
 {
     std::string nameSpace;
 };
+
+/// Lists what is registered.
+struct ListClasses
+{};
 
 /// Answers the clients of a network address until a signal ends it.
 struct Serve
@@ -53,18 +58,19 @@ struct Serve
 /// Shows the instances of a class live until a signal ends it.
 struct Watch
 {
-    cim::ObjectPath target;             ///< the class, with a namespace
+    cim::ObjectPath target;             ///< the class, with a namespace; unnamed: that of the installation
     std::chrono::milliseconds interval; ///< from one answer to the next question
+    bool isWide = false;                ///< the table is whole; the terminal shows its beginning
 };
 
-using Command = std::variant<Ask, DrawGraph, Serve, Watch>;
+using Command = std::variant<Ask, DrawGraph, ListClasses, Serve, Watch>;
 
 /// What the broker is to be started with.
 struct Settings
 {
     std::vector<std::string> providerDirectories; ///< none: the default ones
     std::vector<std::string> registrationFiles;   ///< none: the default ones
-    std::optional<std::string> inventory;         ///< file for TAVRO_INVENTORY; nothing: as it is
+    std::optional<std::string> inventory;         ///< file for the providers; nothing: theirs
     bool trace = false;
     std::optional<std::string> like; ///< the broker whose habits to have; nothing: none
 };

@@ -6,16 +6,18 @@
 #include "broker/Broker.h"
 #include "cli/Command.h"
 
+#include <cstddef>
 #include <iosfwd>
+#include <optional>
 
 namespace cimhost::cli {
 
 /// Asks, draws, serves or watches.
-/// \param isTerminal  whether a person looks at `out`
+/// \param columns  of the terminal that `out` is; nothing: it is none
 /// \return exitAnswered, or exitError after an answer with an error status, which goes to `err`;
 /// what such an answer brought is not shown, as brokers do not send it
-ExitStatus execute(const Command& command, Broker& broker, bool isTerminal, std::ostream& out,
-                   std::ostream& err);
+ExitStatus execute(const Command& command, Broker& broker, std::optional<std::size_t> columns,
+                   std::ostream& out, std::ostream& err);
 
 } // namespace cimhost::cli
 

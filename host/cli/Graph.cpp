@@ -7,6 +7,8 @@
 #include "cli/ValueWords.h"
 
 #include <algorithm>
+#include <array>
+#include <map>
 #include <optional>
 #include <ostream>
 #include <string_view>
@@ -26,13 +28,10 @@ std::vector<RegisteredClass> instanceClasses(const Registration& registration, c
 {
     std::vector<RegisteredClass> classes;
     for (const RegisteredClass& entry : registration.classes) {
-        const bool inNameSpace =
-            std::any_of(entry.nameSpaces.begin(), entry.nameSpaces.end(),
-                        [&](const std::string& name) { return cim::sameName(name, nameSpace); });
         const bool isNew = std::none_of(classes.begin(), classes.end(), [&](const RegisteredClass& other) {
             return cim::sameName(other.className, entry.className);
         });
-        if (entry.instance && inNameSpace && isNew)
+        if (entry.instance && isRegisteredIn(entry, nameSpace) && isNew)
             classes.push_back(entry);
     }
     return classes;
@@ -204,23 +203,74 @@ std::string nodeLine(std::size_t index, const std::vector<std::string>& lines, c
     return "    n" + std::to_string(index) + " [label=" + label(lines) + ", " + attributes + "];\n";
 }
 
-std::string nodeLine(std::size_t index, const cim::Instance& instance)
+std::optional<std::string_view> wordOf(const cim::Instance& instance, std::string_view property)
 {
-    const auto health = propertyOf<std::uint64_t>(instance, "HealthState");
-    const auto word = health ? valueWord("HealthState", *health) : std::nullopt;
-    std::vector<std::string> lines{nameOf(instance), instance.path.className};
-    if (word)
-        lines.emplace_back(*word);
-    return nodeLine(index, lines,
-                    "shape=" + std::string(shapeOf(instance.path.className)) +
-                        ", fillcolor=" + std::string(colourOf(health)));
+    const auto number = propertyOf<std::uint64_t>(instance, property);
+    return number ? valueWord(property, *number) : std::nullopt;
 }
 
-std::string edgeLine(const Edge& edge, Nodes& nodes)
+/// Health and alarm state in a line; empty: it has neither.
+std::string statesOf(const cim::Instance& instance)
+{
+    const auto health = wordOf(instance, "HealthState");
+    const auto alarm = wordOf(instance, "AlarmState");
+    const std::string alarmText = alarm ? "alarm " + std::string(*alarm) : "";
+    if (!health)
+        return alarmText;
+    return std::string(*health) + (alarm ? ", " : "") + alarmText;
+}
+
+std::string nodeLine(std::size_t index, const cim::Instance& instance)
+{
+    std::vector<std::string> lines{nameOf(instance), instance.path.className};
+    if (std::string states = statesOf(instance); !states.empty())
+        lines.push_back(std::move(states));
+    return nodeLine(index, lines,
+                    "shape=" + std::string(shapeOf(instance.path.className)) + ", fillcolor=" +
+                        std::string(colourOf(propertyOf<std::uint64_t>(instance, "HealthState"))));
+}
+
+/// Text for a label in Graphviz's HTML.
+std::string htmlText(std::string_view text)
+{
+    std::string result;
+    for (const char byte : cim::printable(text))
+        result += byte == '<' ? "&lt;" : byte == '>' ? "&gt;" : byte == '&' ? "&amp;" : std::string(1, byte);
+    return result;
+}
+
+/// Says once for all edges of an association what they are, in their colour.
+class Legend
+{
+public:
+    const char* colourOf(const Edge& edge)
+    {
+        constexpr std::array colours{"steelblue", "darkorange", "seagreen", "purple", "brown", "deeppink"};
+        const auto [entry, isNew] =
+            colours_.try_emplace(edge.className + ": " + edge.from.role + " \u2192 " + edge.to.role,
+                                 colours[colours_.size() % colours.size()]);
+        if (isNew)
+            text_ += "<font color=\"" + std::string(entry->second) + "\">" + htmlText(entry->first) +
+                     "</font><br/>";
+        return entry->second;
+    }
+
+    /// As attributes of the graph; empty: there was no edge.
+    [[nodiscard]] std::string attributes() const
+    {
+        return text_.empty() ? ""
+                             : "    labelloc=t;\n    fontname=\"sans-serif\";\n    label=<" + text_ + ">;\n";
+    }
+
+private:
+    std::map<std::string, const char*> colours_; ///< by what is said
+    std::string text_;
+};
+
+std::string edgeLine(const Edge& edge, Nodes& nodes, Legend& legend)
 {
     return "    n" + std::to_string(nodes.indexOf(edge.from.path)) + " -> n" +
-           std::to_string(nodes.indexOf(edge.to.path)) +
-           " [label=" + label({edge.className, edge.from.role + " \u2192 " + edge.to.role}) + "];\n";
+           std::to_string(nodes.indexOf(edge.to.path)) + " [color=" + legend.colourOf(edge) + "];\n";
 }
 
 } // namespace
@@ -240,15 +290,18 @@ void addInstance(const cim::Instance& instance, bool isAssociation, Picture& pic
 std::string dot(const std::string& nameSpace, const Picture& picture)
 {
     Nodes nodes(picture.nodes);
+    Legend legend;
     std::string edges;
     for (const Edge& edge : picture.edges)
-        edges += edgeLine(edge, nodes);
+        edges += edgeLine(edge, nodes, legend);
 
     std::string text = "digraph " + label({nameSpace}) +
                        " {\n"
                        "    rankdir=LR;\n"
-                       "    node [fontname=\"sans-serif\", style=filled];\n"
-                       "    edge [fontname=\"sans-serif\", fontsize=9];\n";
+                       "    ranksep=2;\n"
+                       "    nodesep=0.1;\n" +
+                       legend.attributes() +
+                       "    node [fontname=\"sans-serif\", style=filled, margin=\"0.1,0.03\"];\n";
     for (const std::string& remark : picture.remarks)
         text += "    // " + cim::printable(remark) + '\n';
     std::size_t index = 0;

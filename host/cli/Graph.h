@@ -38,8 +38,8 @@ struct Picture
 /// path; else as a node, or with a remark if its class is an association.
 void addInstance(const cim::Instance& instance, bool isAssociation, Picture& picture);
 
-/// The picture in Graphviz's language: nodes coloured by their HealthState, edges with the name of
-/// their class and the roles. A reference to an object that is no node gives a dashed node.
+/// The picture in Graphviz's language: nodes coloured by their HealthState, edges by their class
+/// and roles, which a legend names once. A reference to an object that is no node gives a dashed node.
 std::string dot(const std::string& nameSpace, const Picture& picture);
 
 /// Writes the graph of what the providers registered for the namespace have. A class that answers an

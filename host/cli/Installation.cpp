@@ -1,6 +1,5 @@
 #include "cli/Installation.h"
 
-#include "cim/RegularFile.h"
 #include "cim/Utf8.h"
 #include "cim/Values.h"
 #include "cli/Arguments.h"
@@ -92,14 +91,18 @@ std::vector<std::string> findProviderDirectories(const Settings& settings, const
     return directory ? std::vector<std::string>{directory->string()} : std::vector<std::string>{};
 }
 
+std::optional<std::filesystem::path> findSchemaDirectory(const Surroundings& surroundings)
+{
+    return findDirectory(surroundings.programDirectory, {CIMHOST_SCHEMADIR_FROM_BIN, "../schema"});
+}
+
 std::vector<std::string> findRegistrationFiles(const Settings& settings, const Surroundings& surroundings)
 {
     if (!settings.registrationFiles.empty())
         return settings.registrationFiles;
     if (surroundings.registrationFiles)
         return splitAtColons(*surroundings.registrationFiles);
-    const std::optional<fs::path> directory =
-        findDirectory(surroundings.programDirectory, {CIMHOST_SCHEMADIR_FROM_BIN, "../schema"});
+    const std::optional<fs::path> directory = findSchemaDirectory(surroundings);
     std::vector<std::string> files = directory ? registrationFilesIn(*directory) : std::vector<std::string>{};
     if (files.empty())
         throw UsageError("no registration of providers is installed beside the program; name a file with "
@@ -117,16 +120,6 @@ Registration readRegistrations(const std::vector<std::string>& files)
         append(added, file, all);
     }
     return all;
-}
-
-void useInventory(const std::string& file)
-{
-    try {
-        const cim::RegularFile readable(file);
-    } catch (const cim::FileError& error) {
-        throw UsageError("cannot read the inventory " + cim::printable(file) + ": " + error.what());
-    }
-    setenv("TAVRO_INVENTORY", file.c_str(), 1);
 }
 
 } // namespace cimhost::cli

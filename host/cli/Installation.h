@@ -29,8 +29,12 @@ Surroundings readSurroundings();
 /// directory of the build tree. None, if there is none of these.
 std::vector<std::string> findProviderDirectories(const Settings& settings, const Surroundings& surroundings);
 
+/// The directory of registrations in the tree that the executable stands in, installed or built, if there is
+/// one.
+std::optional<std::filesystem::path> findSchemaDirectory(const Surroundings& surroundings);
+
 /// The files of the command line; without any, those of the environment; without these, every .reg
-/// file, by name, in the schema directory of the tree that the executable stands in, installed or built.
+/// file, by name, in the schema directory.
 /// \throws UsageError  there is none
 std::vector<std::string> findRegistrationFiles(const Settings& settings, const Surroundings& surroundings);
 
@@ -38,10 +42,6 @@ std::vector<std::string> findRegistrationFiles(const Settings& settings, const S
 /// \throws RegistrationError  also for a file without any class, and for a class that two files register
 /// with the same provider
 Registration readRegistrations(const std::vector<std::string>& files);
-
-/// Sets TAVRO_INVENTORY for the providers that will be loaded.
-/// \throws UsageError  it is no regular file, or cannot be read; what it holds is the providers' concern
-void useInventory(const std::string& file);
 
 } // namespace cimhost::cli
 

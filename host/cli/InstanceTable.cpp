@@ -2,14 +2,15 @@
 
 #include "cim/Literal.h"
 #include "cim/ObjectPathText.h"
-#include "cim/Table.h"
 #include "cim/Utf8.h"
 #include "cim/Values.h"
+#include "cli/FittedTable.h"
 #include "cli/ValueWords.h"
 
 #include <algorithm>
 #include <functional>
 #include <iterator>
+#include <set>
 #include <string_view>
 
 namespace cimhost::cli {
@@ -101,30 +102,102 @@ std::vector<std::string> tellingKeyNames(const std::vector<cim::ObjectPath>& pat
     return telling.empty() ? all : telling;
 }
 
-std::string columnsTable(const std::vector<std::string>& columns, const std::vector<cim::Instance>& instances)
+Column::Kind kindOf(const std::string& name, const std::vector<std::string>& identifiers,
+                    const std::vector<cim::Instance>& instances)
+{
+    if (contains(identifiers, name))
+        return Column::identifier;
+    const bool isList = std::any_of(instances.begin(), instances.end(), [&](const cim::Instance& instance) {
+        const cim::Value* const value = findValue(instance, name);
+        return value != nullptr && cim::isArray(*value);
+    });
+    return isList ? Column::list : Column::plain;
+}
+
+/// A column for each of the names.
+std::vector<Column> columnsOf(const std::vector<std::string>& names,
+                              const std::vector<cim::Instance>& instances)
+{
+    const std::vector<std::string> identifiers = tellingKeyNames(pathsOf(instances));
+    std::vector<Column> columns;
+    for (const std::string& name : names)
+        columns.push_back({name, kindOf(name, identifiers, instances)});
+    return columns;
+}
+
+std::string columnsTable(const std::vector<Column>& columns, const std::vector<cim::Instance>& instances,
+                         std::size_t width)
 {
     std::vector<cim::Row> rows;
     for (const cim::Instance& instance : instances) {
         cim::Row& row = rows.emplace_back();
-        for (const std::string& column : columns) {
-            const cim::Value* value = findValue(instance, column);
-            row.push_back(value != nullptr ? cellText(column, *value, wordOnly) : "");
+        for (const Column& column : columns) {
+            const cim::Value* value = findValue(instance, column.name);
+            row.push_back(value != nullptr ? cellText(column.name, *value, wordOnly) : "");
         }
     }
-    return cim::table(columns, rows);
+    return fittedTable(columns, rows, width);
 }
 
-const std::vector<std::string>& deviceColumns()
+/// Of CIM_ManagedSystemElement and CIM_AlarmDevice: what people look at first.
+const std::vector<std::string>& stateNames()
 {
-    static const std::vector<std::string> columns{"DeviceID", "Name", "HealthState", "OperationalStatus",
-                                                  "AlarmState"};
-    return columns;
+    static const std::vector<std::string> names{"HealthState", "OperationalStatus", "AlarmState"};
+    return names;
 }
 
-bool isAlarmDevice(const cim::Instance& instance)
+bool hasAllStates(const cim::Instance& instance)
 {
-    return std::all_of(deviceColumns().begin(), deviceColumns().end(),
-                       [&](const std::string& column) { return findValue(instance, column) != nullptr; });
+    return std::all_of(stateNames().begin(), stateNames().end(),
+                       [&](const std::string& name) { return findValue(instance, name) != nullptr; });
+}
+
+/// Of CIM_ManagedElement and its kinds: what people call an instance.
+const std::vector<std::string>& nameNames()
+{
+    static const std::vector<std::string> names{"Name", "ElementName"};
+    return names;
+}
+
+/// Whether the property has another value in each of the instances.
+bool tellsApart(const std::string& property, const std::vector<cim::Instance>& instances)
+{
+    std::set<std::string> values;
+    for (const cim::Instance& instance : instances)
+        if (const cim::Value* const value = cim::findProperty(instance, property))
+            values.insert(valueText(property, *value));
+    values.erase("");
+    return values.size() == instances.size();
+}
+
+bool isAnywhere(const std::string& property, const std::vector<cim::Instance>& instances)
+{
+    return std::any_of(instances.begin(), instances.end(), [&](const cim::Instance& instance) {
+        return cim::findProperty(instance, property) != nullptr;
+    });
+}
+
+/// Name, states, then the keys if there is room; where no name tells the instances apart, keys, states, then
+/// the name.
+std::string summaryTable(const std::vector<cim::Instance>& instances, const std::vector<std::string>& states,
+                         std::size_t width)
+{
+    const std::vector<std::string> keys = tellingKeyNames(pathsOf(instances));
+    const auto telling = std::find_if(nameNames().begin(), nameNames().end(),
+                                      [&](const std::string& name) { return tellsApart(name, instances); });
+    const auto present = std::find_if(nameNames().begin(), nameNames().end(),
+                                      [&](const std::string& name) { return isAnywhere(name, instances); });
+    const std::vector<std::string> name(present, present == nameNames().end() ? present : std::next(present));
+    const bool hasTelling = telling != nameNames().end();
+    std::vector<std::string> names = hasTelling ? std::vector<std::string>{*telling} : keys;
+    const std::size_t leading = names.size();
+    for (const std::vector<std::string>& more : {states, hasTelling ? keys : name})
+        for (const std::string& added : more)
+            addOnce(names, added);
+    std::vector<Column> columns = columnsOf(names, instances);
+    for (std::size_t i = leading; i < columns.size(); ++i)
+        columns[i].mayGo = !contains(states, columns[i].name);
+    return columnsTable(columns, instances, width);
 }
 
 bool hasWord(const cim::Property& property)
@@ -168,7 +241,7 @@ std::string block(const cim::Instance& instance)
 
 } // namespace
 
-std::string nameTable(const std::vector<cim::ObjectPath>& paths)
+std::string nameTable(const std::vector<cim::ObjectPath>& paths, std::size_t width)
 {
     if (paths.empty())
         return "No names.\n";
@@ -176,42 +249,48 @@ std::string nameTable(const std::vector<cim::ObjectPath>& paths)
         return cim::sameName(path.className, paths.front().className);
     });
     const std::vector<std::string> keys = keyNames(paths);
-    cim::Row heading = keys;
-    if (!oneClass || keys.empty())
-        heading.insert(heading.begin(), "Class");
+    const bool hasClass = !oneClass || keys.empty();
+    std::vector<Column> columns;
+    if (hasClass)
+        columns.push_back({"Class", Column::plain});
+    for (const std::string& key : keys)
+        columns.push_back({key, Column::identifier});
 
     std::vector<cim::Row> rows;
     for (const cim::ObjectPath& path : paths) {
         cim::Row& row = rows.emplace_back();
-        if (heading.size() > keys.size())
+        if (hasClass)
             row.push_back(path.className);
         for (const std::string& key : keys) {
             const cim::Value* value = cim::findKey(path, key);
             row.push_back(value != nullptr ? cellText(key, *value, wordOnly) : "");
         }
     }
-    return cim::table(heading, rows);
+    return fittedTable(columns, rows, width);
 }
 
-std::string instanceTable(const std::vector<cim::Instance>& instances, const cim::PropertyList& properties)
+std::string instanceTable(const std::vector<cim::Instance>& instances, const cim::PropertyList& properties,
+                          std::size_t width)
 {
     if (instances.empty())
         return "No instances.\n";
     if (properties) {
-        std::vector<std::string> columns = tellingKeyNames(pathsOf(instances));
+        std::vector<std::string> names = tellingKeyNames(pathsOf(instances));
         for (const std::string& property : *properties)
-            addOnce(columns, property);
-        return columnsTable(columns, instances);
+            addOnce(names, property);
+        return columnsTable(columnsOf(names, instances), instances, width);
     }
-    if (std::all_of(instances.begin(), instances.end(), isAlarmDevice))
-        return columnsTable(deviceColumns(), instances);
+    if (std::all_of(instances.begin(), instances.end(), hasAllStates))
+        return summaryTable(instances, stateNames(), width);
     return instanceBlocks(instances);
 }
 
-std::string stateTable(const std::vector<cim::Instance>& instances)
+std::string stateTable(const std::vector<cim::Instance>& instances, std::size_t width)
 {
-    const bool areAlarmDevices = std::all_of(instances.begin(), instances.end(), isAlarmDevice);
-    return instanceTable(instances, areAlarmDevices ? cim::PropertyList() : wordedProperties(instances));
+    if (instances.empty())
+        return "No instances.\n";
+    const bool haveAllStates = std::all_of(instances.begin(), instances.end(), hasAllStates);
+    return summaryTable(instances, haveAllStates ? stateNames() : wordedProperties(instances), width);
 }
 
 std::string shortName(const cim::ObjectPath& path)

@@ -4,6 +4,7 @@
 #define CIMHOST_CLI_INSTANCETABLE_H
 
 #include "cim/Model.h"
+#include "cli/FittedTable.h"
 
 #include <string>
 #include <string_view>
@@ -12,16 +13,19 @@
 namespace cimhost::cli {
 
 /// One row for each path, one column for each key; the class in front where there are several.
-std::string nameTable(const std::vector<cim::ObjectPath>& paths);
+/// \param width  of the terminal; no line is wider
+std::string nameTable(const std::vector<cim::ObjectPath>& paths, std::size_t width = anyWidth);
 
-/// One row for each instance: where properties are named, the keys that tell the instances apart and
-/// those properties; for devices that all have a health and an alarm state, these; for anything else
-/// a block for each instance, as instanceBlocks().
-std::string instanceTable(const std::vector<cim::Instance>& instances, const cim::PropertyList& properties);
+/// One row for each instance. Where properties are named: the keys that tell the instances apart and those
+/// properties. For what has a health, an operational status and an alarm state: the name, these, and the
+/// keys. For anything else a block for each instance, as instanceBlocks(). "No instances." for none.
+/// \param width  of the terminal; no row is wider: keys are shortened or left out first, then lists
+std::string instanceTable(const std::vector<cim::Instance>& instances, const cim::PropertyList& properties,
+                          std::size_t width = anyWidth);
 
-/// One row for each instance, whatever its class: as instanceTable() for alarm devices, for anything else the
-/// keys that tell the instances apart and the properties whose numbers have words. "No instances." for none.
-std::string stateTable(const std::vector<cim::Instance>& instances);
+/// One row for each instance, whatever its class: as instanceTable() where it has such a row for them, for
+/// anything else with all properties whose numbers have words.
+std::string stateTable(const std::vector<cim::Instance>& instances, std::size_t width = anyWidth);
 
 /// What tells the instance from others of its class: the values of such keys.
 std::string shortName(const cim::ObjectPath& path);

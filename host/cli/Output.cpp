@@ -44,17 +44,17 @@ cim::Json jsonList(const std::vector<Object>& objects)
     return list;
 }
 
-std::string pathsText(const std::vector<cim::ObjectPath>& paths, Format format)
+std::string pathsText(const std::vector<cim::ObjectPath>& paths, Format format, std::size_t width)
 {
     if (format == Format::table)
-        return nameTable(paths);
+        return nameTable(paths, width);
     if (format == Format::mof)
         return joined(paths, "\n", [](const cim::ObjectPath& path) { return cim::mof(path); });
     return joined(paths, "", [](const cim::ObjectPath& path) { return text(path); });
 }
 
 std::string instancesText(const std::vector<cim::Instance>& instances, const OperationRequest& request,
-                          Format format)
+                          Format format, std::size_t width)
 {
     if (format == Format::mof)
         return joined(instances, "\n", [](const cim::Instance& instance) { return cim::mof(instance); });
@@ -63,19 +63,21 @@ std::string instancesText(const std::vector<cim::Instance>& instances, const Ope
     // Who asks for one instance wants to see all of it.
     if (request.operation == Operation::getInstance)
         return instanceBlocks(instances);
-    return instanceTable(instances, request.properties);
+    return instanceTable(instances, request.properties, width);
 }
 
 } // namespace
 
-std::string answerText(const cim::Answer& answer, const OperationRequest& request, Format format)
+std::string answerText(const cim::Answer& answer, const OperationRequest& request, Format format,
+                       std::size_t width)
 {
     const bool paths = answersPaths(request.operation);
     if (format == Format::json)
         return cim::toText(cim::Json{
             {"status", cim::toJson(answer.status)},
             {paths ? "paths" : "instances", paths ? jsonList(answer.paths) : jsonList(answer.instances)}});
-    return paths ? pathsText(answer.paths, format) : instancesText(answer.instances, request, format);
+    return paths ? pathsText(answer.paths, format, width)
+                 : instancesText(answer.instances, request, format, width);
 }
 
 std::string errorText(const cim::Status& status, Format format)

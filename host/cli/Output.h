@@ -5,6 +5,7 @@
 
 #include "cim/Model.h"
 #include "cli/Command.h"
+#include "cli/FittedTable.h"
 
 #include <string>
 
@@ -12,7 +13,9 @@ namespace cimhost::cli {
 
 /// What an answer brought. In JSON it comes with the status: `{ "status": ..., "paths": [...] }` or
 /// `{ "status": ..., "instances": [...] }`.
-std::string answerText(const cim::Answer& answer, const OperationRequest& request, Format format);
+/// \param width  of the terminal, for tables
+std::string answerText(const cim::Answer& answer, const OperationRequest& request, Format format,
+                       std::size_t width = anyWidth);
 
 /// An answer with an error status as standard output has it: in JSON `{ "status": ... }`, else nothing.
 std::string errorText(const cim::Status& status, Format format);

@@ -3,6 +3,7 @@
 #include "broker/Broker.h"
 #include "broker/Habits.h"
 #include "cli/Arguments.h"
+#include "cli/Defaults.h"
 #include "cli/Execute.h"
 #include "cli/Reports.h"
 
@@ -15,35 +16,38 @@ namespace cimhost::cli {
 
 namespace {
 
-ExitStatus follow(const Invocation& invocation, const Surroundings& surroundings, bool isTerminal,
-                  std::ostream& out, std::ostream& err)
+Ending follow(const Invocation& invocation, const Surroundings& surroundings,
+              std::optional<std::size_t> columns, std::ostream& out, std::ostream& err)
 {
     const Settings& settings = invocation.settings;
-    Registration registration = readRegistrations(findRegistrationFiles(settings, surroundings));
+    const std::vector<std::string> files = findRegistrationFiles(settings, surroundings);
+    Registration registration = readRegistrations(files);
+    const Defaults defaults = readDefaults(files, surroundings);
+    const Command command = complete(invocation.command, defaults);
     if (settings.inventory)
-        useInventory(*settings.inventory);
+        useInventory(*settings.inventory, defaults);
     Broker broker(std::move(registration), findProviderDirectories(settings, surroundings),
                   reportTo(err, settings.trace), settings.like ? findHabits(*settings.like) : nullptr);
-    return execute(invocation.command, broker, isTerminal, out, err);
+    return {execute(command, broker, columns, out, err), std::holds_alternative<DrawGraph>(command)};
 }
 
-ExitStatus fail(const std::exception& error, ExitStatus status, std::ostream& err)
+Ending fail(const std::exception& error, ExitStatus status, std::ostream& err)
 {
     err << "cimhost: " << error.what() << '\n';
-    return status;
+    return {status};
 }
 
 } // namespace
 
-ExitStatus run(const std::vector<std::string>& arguments, const Surroundings& surroundings, bool isTerminal,
-               std::ostream& out, std::ostream& err)
+Ending run(const std::vector<std::string>& arguments, const Surroundings& surroundings,
+           std::optional<std::size_t> columns, std::ostream& out, std::ostream& err)
 {
     try {
         const std::variant<Invocation, Notice> parsed = parseArguments(arguments);
         if (const auto* invocation = std::get_if<Invocation>(&parsed))
-            return follow(*invocation, surroundings, isTerminal, out, err);
+            return follow(*invocation, surroundings, columns, out, err);
         out << std::get<Notice>(parsed).text;
-        return exitAnswered;
+        return {exitAnswered};
     } catch (const UsageError& error) {
         return fail(error, exitUsage, err);
     } catch (const RegistrationError& error) {

@@ -6,6 +6,7 @@
 
 #include <array>
 #include <csignal>
+#include <optional>
 #include <ostream>
 #include <string>
 
@@ -27,8 +28,16 @@ ExitStatus serveUntilSignal(const Serve& command, Broker& broker, std::ostream& 
 {
     const HeldSignals signals{SIGINT, SIGTERM};
     const serve::CimBinding binding(broker, hostName());
-    const serve::HttpServer server({command.address, command.port}, binding);
-    err << "cimhost: listening on http://" << textOf(server.endpoint())
+    std::optional<serve::HttpServer> server;
+    try {
+        server.emplace(serve::Endpoint{command.address, command.port}, binding);
+    } catch (const serve::ListenError& error) {
+        if (!error.isPortTaken())
+            throw;
+        err << "cimhost: " << error.what() << "; --port chooses another port\n";
+        return exitError;
+    }
+    err << "cimhost: listening on http://" << textOf(server->endpoint())
         << ", for development only: no authentication, no encryption" << std::endl;
     signals.wait();
     err << "cimhost: ending" << std::endl;

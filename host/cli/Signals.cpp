@@ -1,16 +1,41 @@
 #include "cli/Signals.h"
 
 #include <algorithm>
+#include <array>
 #include <cerrno>
 #include <ctime>
 
+#include <poll.h>
+#include <sys/signalfd.h>
+
 namespace cimhost::cli {
 
-HeldSignals::HeldSignals(std::initializer_list<int> signals)
+namespace {
+
+sigset_t setOf(std::initializer_list<int> signals)
 {
-    sigemptyset(&signals_);
+    sigset_t set{};
+    sigemptyset(&set);
     for (const int signal : signals)
-        sigaddset(&signals_, signal);
+        sigaddset(&set, signal);
+    return set;
+}
+
+/// As poll() takes it: rounded up, so that the time has come when it ends.
+int millisecondsUntil(std::chrono::steady_clock::time_point end)
+{
+    using std::chrono::milliseconds;
+    constexpr milliseconds most = std::chrono::hours(24);
+    const auto left = std::chrono::ceil<milliseconds>(end - std::chrono::steady_clock::now());
+    return static_cast<int>(std::clamp(left, milliseconds(0), most).count());
+}
+
+} // namespace
+
+HeldSignals::HeldSignals(std::initializer_list<int> signals)
+    : signals_(setOf(signals)),
+      arrivals_(signalfd(-1, &signals_, SFD_CLOEXEC | SFD_NONBLOCK))
+{
     pthread_sigmask(SIG_BLOCK, &signals_, &before_);
 }
 
@@ -26,18 +51,15 @@ int HeldSignals::wait() const
     return signal;
 }
 
-int HeldSignals::waitUntil(std::chrono::steady_clock::time_point end) const
+HeldSignals::Wakeup HeldSignals::waitUntil(std::chrono::steady_clock::time_point end, int descriptor,
+                                           bool mayRead) const
 {
-    using std::chrono::nanoseconds;
-    constexpr nanoseconds::rep second = 1000000000;
-    int signal = 0;
-    do {
-        const nanoseconds left =
-            std::max<nanoseconds>(end - std::chrono::steady_clock::now(), nanoseconds(0));
-        const timespec time{left.count() / second, left.count() % second};
-        signal = sigtimedwait(&signals_, nullptr, &time);
-    } while (signal < 0 && errno == EINTR);
-    return std::max(signal, 0);
+    const short wanted = mayRead ? POLLIN : 0;
+    std::array<pollfd, 2> watched{pollfd{arrivals_.number(), POLLIN, 0}, pollfd{descriptor, wanted, 0}};
+    while (poll(watched.data(), watched.size(), millisecondsUntil(end)) < 0 && errno == EINTR)
+        continue;
+    const timespec now{};
+    return {std::max(sigtimedwait(&signals_, nullptr, &now), 0), watched[1].revents != 0};
 }
 
 } // namespace cimhost::cli

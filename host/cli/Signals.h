@@ -3,6 +3,8 @@
 #ifndef CIMHOST_CLI_SIGNALS_H
 #define CIMHOST_CLI_SIGNALS_H
 
+#include "cim/Descriptor.h"
+
 #include <chrono>
 #include <csignal>
 #include <initializer_list>
@@ -21,12 +23,22 @@ public:
     /// \return the signal that came
     int wait() const; // NOLINT(modernize-use-nodiscard): often it does not matter which
 
-    /// \return the signal that came, or 0 if none came by then
-    [[nodiscard]] int waitUntil(std::chrono::steady_clock::time_point end) const;
+    /// What a wait ended with; with neither, at its time.
+    struct Wakeup
+    {
+        int signal = 0;       ///< that came
+        bool isReady = false; ///< the descriptor can be read, or nobody is at its other end any more
+    };
+
+    /// \param descriptor  to wait for too; -1: none
+    /// \param mayRead     whether it is waited for something to read
+    [[nodiscard]] Wakeup waitUntil(std::chrono::steady_clock::time_point end, int descriptor,
+                                   bool mayRead) const;
 
 private:
     sigset_t signals_{};
     sigset_t before_{};
+    cim::Descriptor arrivals_; ///< can be read once one came
 };
 
 } // namespace cimhost::cli

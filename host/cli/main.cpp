@@ -1,11 +1,13 @@
 // cimhost: asks CIM providers, loaded into this process, what a CIM client asks.
 
 #include "cli/Program.h"
+#include "cli/watch/Terminal.h"
 
 #include <cerrno>
 #include <csignal>
 #include <cstdio>
 #include <iostream>
+#include <optional>
 #include <sstream>
 #include <string>
 #include <system_error>
@@ -30,14 +32,19 @@ int main(int argc, char* argv[])
     // Writing to a pipe that nobody reads any more ends in an exit status, not in a signal.
     std::signal(SIGPIPE, SIG_IGN);
 
+    std::optional<std::size_t> columns;
+    if (isatty(STDOUT_FILENO) != 0)
+        columns = Terminal::size().columns;
     std::ostringstream out;
-    const ExitStatus status = run(std::vector<std::string>(argv + (argc > 0 ? 1 : 0), argv + argc),
-                                  readSurroundings(), isatty(STDOUT_FILENO) != 0, out, std::cerr);
+    const Ending ending = run(std::vector<std::string>(argv + (argc > 0 ? 1 : 0), argv + argc),
+                              readSurroundings(), columns, out, std::cerr);
     if (writeToStandardOutput(out.str()))
-        return status;
-    // A reader that has seen enough, such as head, needs no message.
-    if (const int reason = errno; reason != EPIPE)
+        return ending.status;
+    const int reason = errno;
+    if (reason != EPIPE)
         std::cerr << "cimhost: cannot write to standard output: " << std::generic_category().message(reason)
                   << '\n';
+    else if (ending.isOneDocument) // where a reader of lines, such as head, has seen enough
+        std::cerr << "cimhost: nobody read the graph to its end\n";
     return exitError;
 }

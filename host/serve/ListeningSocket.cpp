@@ -1,29 +1,29 @@
 #include "serve/ListeningSocket.h"
 
+#include "cim/Descriptor.h"
 #include "cim/Utf8.h"
 
 #include <cerrno>
 #include <memory>
 #include <system_error>
-#include <utility>
 
 #include <netdb.h>
 #include <netinet/in.h>
 #include <sys/socket.h>
-#include <unistd.h>
 
 namespace cimhost::serve {
 
 namespace {
 
-[[noreturn]] void fail(const Endpoint& endpoint, const std::string& reason)
+[[noreturn]] void fail(const Endpoint& endpoint, const std::string& reason, bool isPortTaken = false)
 {
-    throw ListenError("cannot listen on " + cim::printable(textOf(endpoint)) + ": " + reason);
+    throw ListenError("cannot listen on " + cim::printable(textOf(endpoint)) + ": " + reason, isPortTaken);
 }
 
-std::string lastError()
+[[noreturn]] void failWithErrno(const Endpoint& endpoint)
 {
-    return std::generic_category().message(errno);
+    const int error = errno;
+    fail(endpoint, std::generic_category().message(error), error == EADDRINUSE);
 }
 
 std::uint16_t portOf(const sockaddr_storage& address)
@@ -31,26 +31,6 @@ std::uint16_t portOf(const sockaddr_storage& address)
     return ntohs(address.ss_family == AF_INET6 ? reinterpret_cast<const sockaddr_in6&>(address).sin6_port
                                                : reinterpret_cast<const sockaddr_in&>(address).sin_port);
 }
-
-/// Closes the socket unless it is handed on.
-class Descriptor
-{
-public:
-    explicit Descriptor(int descriptor) : descriptor_(descriptor) {}
-    ~Descriptor()
-    {
-        if (descriptor_ >= 0)
-            close(descriptor_);
-    }
-    Descriptor(const Descriptor&) = delete;
-    Descriptor& operator=(const Descriptor&) = delete;
-
-    [[nodiscard]] int get() const { return descriptor_; }
-    int release() { return std::exchange(descriptor_, -1); }
-
-private:
-    int descriptor_;
-};
 
 } // namespace
 
@@ -66,16 +46,16 @@ ListeningSocket listenAt(const Endpoint& endpoint)
         fail(endpoint, "expected an IPv4 or IPv6 address");
     const std::unique_ptr<addrinfo, decltype(&freeaddrinfo)> address(found, &freeaddrinfo);
 
-    Descriptor socket(::socket(address->ai_family, SOCK_STREAM | SOCK_CLOEXEC, 0));
+    cim::Descriptor socket(::socket(address->ai_family, SOCK_STREAM | SOCK_CLOEXEC, 0));
     // A server that was started again need not wait until the connections of the last one are forgotten.
     const int on = 1;
     sockaddr_storage bound{};
     socklen_t length = sizeof bound;
-    if (socket.get() < 0 || setsockopt(socket.get(), SOL_SOCKET, SO_REUSEADDR, &on, sizeof on) != 0 ||
-        bind(socket.get(), address->ai_addr, address->ai_addrlen) != 0 ||
-        listen(socket.get(), SOMAXCONN) != 0 ||
-        getsockname(socket.get(), reinterpret_cast<sockaddr*>(&bound), &length) != 0)
-        fail(endpoint, lastError());
+    if (!socket.isOpen() || setsockopt(socket.number(), SOL_SOCKET, SO_REUSEADDR, &on, sizeof on) != 0 ||
+        bind(socket.number(), address->ai_addr, address->ai_addrlen) != 0 ||
+        listen(socket.number(), SOMAXCONN) != 0 ||
+        getsockname(socket.number(), reinterpret_cast<sockaddr*>(&bound), &length) != 0)
+        failWithErrno(endpoint);
     return {socket.release(), {endpoint.address, portOf(bound)}};
 }
 

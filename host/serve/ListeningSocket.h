@@ -19,7 +19,16 @@ struct Endpoint
 class ListenError : public std::runtime_error
 {
 public:
-    using std::runtime_error::runtime_error;
+    explicit ListenError(const std::string& what, bool isPortTaken = false)
+        : std::runtime_error(what),
+          isPortTaken_(isPortTaken)
+    {}
+
+    /// Whether somebody else listens there, so that another port would do.
+    [[nodiscard]] bool isPortTaken() const { return isPortTaken_; }
+
+private:
+    bool isPortTaken_;
 };
 
 /// A socket that waits for connections, and where it does.

@@ -67,6 +67,13 @@ TEST_F(RoutingTest, HandsOnTheProvidersStatusAndMessage)
     EXPECT_THAT(answer.instances, IsEmpty());
 }
 
+TEST_F(RoutingTest, TakesNoInstanceWithoutAnErrorForNotFound)
+{
+    const cim::Answer answer = broker_.getInstance(thingPath("nothing"));
+    EXPECT_EQ(answer.status.code, CMPI_RC_ERR_NOT_FOUND);
+    EXPECT_EQ(answer.status.message, std::nullopt);
+}
+
 TEST_F(RoutingTest, ServesWritingAsTheProviderDoes)
 {
     const cim::Instance instance{thingPath("new"), {{"Size", cim::unsignedValue(3, CMPI_uint32)}}};

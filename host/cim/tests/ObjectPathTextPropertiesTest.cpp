@@ -38,7 +38,7 @@ rc::Gen<std::string> names()
 
 rc::Gen<std::string> classNames()
 {
-    return rc::gen::element<std::string>("CIM_A", "TAVRO_Long_Name", "A_B1");
+    return rc::gen::element<std::string>("CIM_A", "ACME_Long_Name", "A_B1");
 }
 
 rc::Gen<std::string> nameSpaces()

@@ -104,12 +104,12 @@ TEST(ObjectPathReader, keepsTextInUtf8)
 
 TEST(ObjectPathReader, readsReferences)
 {
-    const ObjectPath fan{"", "root/cimv2", "TAVRO_Fan", {{"Name", textValue("a \"b\"")}}};
-    EXPECT_EQ(keyOf(R"("root/cimv2:TAVRO_Fan.Name=\"a \\\"b\\\"\"")"), referenceValue(fan));
-    const ObjectPath bare{"", "", "TAVRO_Fan", {{"Number", unsignedValue(1)}}};
-    EXPECT_EQ(keyOf(R"("TAVRO_Fan.Number=1")"), referenceValue(bare));
-    const ObjectPath remote{"srv", "root/cimv2", "TAVRO_Fan", {{"Number", unsignedValue(1)}}};
-    EXPECT_EQ(keyOf(R"("//srv/root/cimv2:TAVRO_Fan.Number=1")"), referenceValue(remote));
+    const ObjectPath fan{"", "root/cimv2", "ACME_Fan", {{"Name", textValue("a \"b\"")}}};
+    EXPECT_EQ(keyOf(R"("root/cimv2:ACME_Fan.Name=\"a \\\"b\\\"\"")"), referenceValue(fan));
+    const ObjectPath bare{"", "", "ACME_Fan", {{"Number", unsignedValue(1)}}};
+    EXPECT_EQ(keyOf(R"("ACME_Fan.Number=1")"), referenceValue(bare));
+    const ObjectPath remote{"srv", "root/cimv2", "ACME_Fan", {{"Number", unsignedValue(1)}}};
+    EXPECT_EQ(keyOf(R"("//srv/root/cimv2:ACME_Fan.Number=1")"), referenceValue(remote));
 }
 
 TEST(ObjectPathReader, readsReferencesInsideReferences)
@@ -138,8 +138,8 @@ INSTANTIATE_TEST_SUITE_P(
                     ",", ":", "/", "root/cimv2:CIM_A", "CIM_A", "CIM_A.", "CIM_A.K", "CIM_A.K=", "CIM_A.K=x",
                     "CIM_A.K=\"x", "CIM_A.K=\"x\" ", " CIM_A.K=\"x\"", "CIM_A.K=\"x\",", "CIM_A.K=1,K=2",
                     "CIM_A.K =1", "Fan.Number=1", "root/cimv2:Fan.Number=1", "_A.K=1", "A_.K=1", "1_A.K=1",
-                    "Bay 3: CIM_A.K=1", "\"quoted\"", "back\\slash", "TAVRO:GlimmarkCapabilities1", "TRUE",
-                    "42", "//", "//srv/", "http://srv/index.html", "mailto:CIM_A.K=1?", "CIM-A.K=1"));
+                    "Bay 3: CIM_A.K=1", "\"quoted\"", "back\\slash", "ACME:Capabilities1", "TRUE", "42", "//",
+                    "//srv/", "http://srv/index.html", "mailto:CIM_A.K=1?", "CIM-A.K=1"));
 
 TEST(ObjectPathReader, takesAnEscapedTextForAStringWhateverItLooksLike)
 {

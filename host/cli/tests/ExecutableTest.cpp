@@ -40,7 +40,8 @@ protected:
         unsetenv("CIMHOST_REGISTRATION");
     }
 
-    /// Runs a line of the shell, in which $CIMHOST is the program. \return its exit status
+    /// Runs a line of the shell, in which $CIMHOST is the program.
+    /// \return its exit status
     [[nodiscard]] int shell(const std::string& line) const
     {
         const std::string out = (directory.path() / "out").string();
@@ -91,6 +92,27 @@ TEST_F(Executable, endsQuietlyIfNobodyReadsItsOutput)
         shell("mkfifo " + pipe + "; exec 3<>" + pipe + " 4>" + pipe + " 3<&-; $CIMHOST ein CIMT_Lamp >&4"),
         1);
     EXPECT_EQ(err(), "") << "a reader that has seen enough needs no message";
+}
+
+TEST_F(Executable, saysIfNobodyReadsTheGraphToItsEnd)
+{
+    const std::string pipe = (directory.path() / "pipe").string();
+    EXPECT_EQ(shell("mkfifo " + pipe + "; exec 3<>" + pipe + " 4>" + pipe +
+                    " 3<&-; $CIMHOST graph -n root/other >&4"),
+              1);
+    EXPECT_EQ(err(), "cimhost: nobody read the graph to its end\n");
+}
+
+TEST_F(Executable, saysWhatToDoIfItsPortIsTaken)
+{
+    EXPECT_EQ(shell("$CIMHOST serve --port 0 2>" + directory.path("first") +
+                    " & server=$!; "
+                    "until port=$(sed -n 's/.*:\\([0-9]*\\),.*/\\1/p' " +
+                    directory.path("first") +
+                    ") && [ -n \"$port\" ]; do sleep 0.05; done; "
+                    "$CIMHOST serve --port \"$port\"; status=$?; kill $server; exit $status"),
+              1);
+    EXPECT_THAT(err(), HasSubstr("Address already in use; --port chooses another port\n"));
 }
 
 TEST_F(Executable, saysIfItsOutputDoesNotFit)

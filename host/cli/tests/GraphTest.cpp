@@ -130,6 +130,29 @@ TEST(Dot, callsNodesByTheirFirstNameThatIsNotEmpty)
                 HasSubstr(R"(label="root/cimv2:CIM_A.DeviceID=\"a\"\nCIM_A")"));
 }
 
+TEST(Dot, showsTheAlarmStateBesideTheHealth)
+{
+    cim::Instance lamp = led("a", 10);
+    lamp.properties.push_back({"AlarmState", cim::unsignedValue(3, CMPI_uint16)});
+    EXPECT_THAT(graphOf({lamp}), HasSubstr(R"(\nCIM_Led\nDegraded/Warning, alarm Alternating")"));
+    lamp.properties.erase(lamp.properties.begin() + 1);
+    EXPECT_THAT(graphOf({lamp}), HasSubstr(R"(\nCIM_Led\nalarm Alternating")"));
+}
+
+TEST(Dot, saysOnceWhatTheEdgesAre)
+{
+    const cim::Value a = cim::referenceValue(pathOf("CIM_Led", "a"));
+    cim::Instance other = link(a, a);
+    other.properties[0].name = "<Other>";
+    const std::string graph = graphOf({led("a", 5), link(a, a), link(a, a), other});
+    EXPECT_THAT(graph,
+                HasSubstr("    label=<<font color=\"steelblue\">CIM_Link: Left \u2192 Right</font><br/>"
+                          "<font color=\"darkorange\">CIM_Link: &lt;Other&gt; \u2192 Right</font><br/>>;\n"));
+    EXPECT_THAT(graph, HasSubstr("\n    n0 -> n0 [color=steelblue];\n    n0 -> n0 [color=steelblue];\n"
+                                 "    n0 -> n0 [color=darkorange];\n}"));
+    EXPECT_THAT(graphOf({led("a", 5)}), Not(HasSubstr("label=<")));
+}
+
 TEST(Dot, escapesLabels)
 {
     EXPECT_THAT(graphOf({{pathOf("CIM_A", "a"), {{"Name", cim::textValue("\"\\N\n\x1b &lt; \xff")}}}}),
@@ -143,7 +166,7 @@ TEST(Dot, findsNodesWhateverTheHostAndTheLetterCaseOfTheClass)
     const std::string graph =
         graphOf({led("b", 5), led("a", 5),
                  link(cim::referenceValue(left), cim::referenceValue(pathOf("CIM_Led", "b")))});
-    EXPECT_THAT(graph, HasSubstr("\n    n1 -> n0 [label=\"CIM_Link\\nLeft \u2192 Right\"];\n"));
+    EXPECT_THAT(graph, HasSubstr("\n    n1 -> n0 [color=steelblue];\n"));
     EXPECT_THAT(graph, Not(HasSubstr("dashed")));
 }
 

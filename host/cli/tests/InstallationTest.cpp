@@ -3,11 +3,8 @@
 #include "cli/Arguments.h"
 #include "testing/TemporaryDirectory.h"
 
-#include <cstdlib>
-
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
-#include <sys/stat.h>
 
 using namespace cimhost;
 using namespace cimhost::cli;
@@ -157,54 +154,8 @@ TEST_F(Installation, aRegistrationHasAClass)
               "no class is registered in " + tree.path().string() + "/b\\x001B.reg");
 }
 
-TEST_F(Installation, anInventoryIsHandedOnInTheEnvironment)
-{
-    const std::string file = tree.file("inventory.json", "{}");
-    useInventory(file);
-    EXPECT_EQ(std::getenv("TAVRO_INVENTORY"), file);
-    useInventory(tree.file("empty.json", "")); // whose content is the providers' concern
-    unsetenv("TAVRO_INVENTORY");
-}
-
-TEST_F(Installation, anInventoryMustBeReadable)
-{
-    for (const std::string& file : {tree.path().string() + "/missing.json", tree.folder("directory")}) {
-        try {
-            useInventory(file);
-            FAIL() << file;
-        } catch (const UsageError& error) {
-            EXPECT_THAT(error.what(), HasSubstr("cannot read the inventory " + file + ": ")) << file;
-        }
-        EXPECT_EQ(std::getenv("TAVRO_INVENTORY"), nullptr);
-    }
-}
-
-std::string errorOfInventory(const std::string& file)
-{
-    try {
-        useInventory(file);
-        unsetenv("TAVRO_INVENTORY");
-        return "no error";
-    } catch (const UsageError& error) {
-        return error.what();
-    }
-}
-
-TEST_F(Installation, anInventoryIsARegularFile)
-{
-    const std::string pipe = tree.path() / "pipe";
-    ASSERT_EQ(mkfifo(pipe.c_str(), 0600), 0);
-    EXPECT_EQ(errorOfInventory(pipe),
-              "cannot read the inventory " + pipe + ": expected a regular file, found a pipe");
-    for (const std::string device : {"/dev/null", "/dev/zero"})
-        EXPECT_EQ(errorOfInventory(device),
-                  "cannot read the inventory " + device + ": expected a regular file, found a device");
-}
-
 TEST_F(Installation, namesOfFilesAreShownPrintably)
 {
-    EXPECT_THAT(errorOfInventory("/nowhere/\x1b[2J"),
-                HasSubstr("the inventory /nowhere/\\x001B[2J: No such file"));
     const std::string first = tree.file("a.reg", section("CIM_A", "P"));
     const std::string second = tree.file("\x1b.reg", section("CIM_A", "P"));
     EXPECT_THAT(errorOfRegistrations({first, second}), HasSubstr("/\\x001B.reg: [CIM_A]"));

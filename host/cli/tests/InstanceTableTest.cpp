@@ -1,7 +1,11 @@
 #include "cli/InstanceTable.h"
 
+#include "cim/Utf8.h"
 #include "cim/Values.h"
 
+#include <sstream>
+
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 using namespace cimhost;
@@ -35,10 +39,51 @@ const std::vector<cim::Instance>& devices()
 TEST(InstanceTable, showsAlarmDevicesInWords)
 {
     EXPECT_EQ(instanceTable(devices(), std::nullopt),
-              "DeviceID  Name   HealthState  OperationalStatus  AlarmState\n"
-              "--------  -----  -----------  -----------------  ----------\n"
-              "a         Led a  OK           OK, In Service     Off\n"
-              "b         Led b  99           Degraded           Off\n");
+              "Name   HealthState  OperationalStatus  AlarmState  DeviceID\n"
+              "-----  -----------  -----------------  ----------  --------\n"
+              "Led a  OK           OK, In Service     Off         a\n"
+              "Led b  99           Degraded           Off         b\n");
+}
+
+TEST(InstanceTable, showsTheKeysFirstWhereNoNameTellsTheInstancesApart)
+{
+    std::vector<cim::Instance> instances = devices();
+    instances[1].properties[1].value = instances[0].properties[1].value;
+    EXPECT_EQ(instanceTable(instances, std::nullopt),
+              "DeviceID  HealthState  OperationalStatus  AlarmState  Name\n"
+              "--------  -----------  -----------------  ----------  -----\n"
+              "a         OK           OK, In Service     Off         Led a\n"
+              "b         99           Degraded           Off         Led a\n");
+}
+
+TEST(InstanceTable, fitsTheTerminal)
+{
+    const std::vector<cim::Instance> instances{device("chassis-1/system-board-1/a", 5, {std::uint64_t{2}}),
+                                               device("chassis-1/system-board-1/b", 10, {std::uint64_t{3}})};
+    const auto heading = [&](std::size_t width) {
+        const std::string table = instanceTable(instances, std::nullopt, width);
+        return table.substr(0, table.find('\n'));
+    };
+    EXPECT_EQ(heading(200),
+              "Name                            HealthState       OperationalStatus  AlarmState  DeviceID");
+    EXPECT_THAT(instanceTable(instances, std::nullopt, 105),
+                testing::HasSubstr("  chassis-1/s…em-board-1/b\n"));
+    EXPECT_EQ(heading(90), "Name                            HealthState       OperationalStatus  AlarmState");
+    EXPECT_THAT(instanceTable(instances, std::nullopt, 70),
+                testing::HasSubstr("\nLed chassis-1/system-boar…  Degraded/Warning"));
+    EXPECT_THAT(instanceTable(instances, {{"HealthState"}}, 40),
+                testing::HasSubstr("\nchassis-1/…m-board-1/b  Degraded/Warning\n"));
+}
+
+TEST(InstanceTable, neverWraps)
+{
+    for (std::size_t width = 0; width < 120; ++width)
+        for (const cim::PropertyList& properties :
+             {cim::PropertyList(), cim::PropertyList({"Name", "OperationalStatus"})}) {
+            std::istringstream lines(instanceTable(devices(), properties, width));
+            for (std::string line; std::getline(lines, line);)
+                EXPECT_LE(cim::displayWidth(line), width) << line;
+        }
 }
 
 TEST(InstanceTable, showsTheTellingKeysAndThePropertiesNamed)

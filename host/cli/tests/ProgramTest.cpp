@@ -31,13 +31,19 @@ struct Outcome
     std::string err;
 };
 
-Outcome run(const std::vector<std::string>& arguments, bool isTerminal = false)
+Outcome runOn(std::optional<std::size_t> columns, const std::vector<std::string>& arguments)
 {
     const Surroundings surroundings{"/nowhere/bin", SAMPLE_PROVIDER_DIRECTORY, SAMPLE_REGISTRATION};
     std::ostringstream out;
     std::ostringstream err;
-    const int status = cimhost::cli::run(arguments, surroundings, isTerminal, out, err);
+    const int status = cimhost::cli::run(arguments, surroundings, columns, out, err).status;
     return {status, out.str(), err.str()};
+}
+
+/// \param isTerminal  whether the output is a wide one
+Outcome run(const std::vector<std::string>& arguments, bool isTerminal = false)
+{
+    return runOn(isTerminal ? std::optional<std::size_t>(200) : std::nullopt, arguments);
 }
 
 void expectAnswer(const Outcome& outcome, const std::string& out)
@@ -136,10 +142,22 @@ TEST(EnumerateInstances, printsATableOnATerminal)
 {
     expectAnswer(
         run({"ei", "CIMT_Lamp"}, true),
-        "DeviceID           Name      HealthState       OperationalStatus             AlarmState\n"
-        "-----------------  --------  ----------------  ----------------------------  -----------\n"
-        "Fan 1:/bay[0]      Fan 1     OK                OK, In Service                Off\n"
-        "Lüfter \"2\", a=b\\c  Lüfter 2  Degraded/Warning  Degraded, Predictive Failure  Alternating\n");
+        "Name      HealthState       OperationalStatus             AlarmState   DeviceID\n"
+        "--------  ----------------  ----------------------------  -----------  -----------------\n"
+        "Fan 1     OK                OK, In Service                Off          Fan 1:/bay[0]\n"
+        "Lüfter 2  Degraded/Warning  Degraded, Predictive Failure  Alternating  Lüfter \"2\", a=b\\c\n");
+}
+
+TEST(EnumerateInstances, fitsTheTerminalUnlessItIsAskedToBeWide)
+{
+    const std::string whole = run({"ei", "CIMT_Lamp"}, true).out;
+    EXPECT_EQ(runOn(60, {"ei", "CIMT_Lamp", "--wide"}).out, whole);
+    EXPECT_EQ(runOn(std::nullopt, {"ei", "CIMT_Lamp", "-f", "table"}).out, whole);
+    expectAnswer(runOn(60, {"ei", "CIMT_Lamp"}),
+                 "Name      HealthState       OperationalStatus    AlarmState\n"
+                 "--------  ----------------  -------------------  -----------\n"
+                 "Fan 1     OK                OK, In Service       Off\n"
+                 "Lüfter 2  Degraded/Warning  Degraded, Predicti…  Alternating\n");
 }
 
 TEST(EnumerateInstances, printsThePropertiesNamed)
@@ -225,7 +243,8 @@ TEST(GetInstance, showsThePropertiesNamed)
 
 TEST(GetInstance, isNotFoundIfNothingComesWithoutAnError)
 {
-    expectError(run({"gi", "CIMT_Lamp.DeviceID=\"none\""}), 1, "cimhost: CMPI_RC_ERR_NOT_FOUND (6)\n");
+    expectError(run({"gi", "CIMT_Lamp.DeviceID=\"none\""}), 1,
+                "cimhost: CMPI_RC_ERR_NOT_FOUND (6): there is no root/cimv2:CIMT_Lamp.DeviceID=\"none\"\n");
     const Outcome outcome = run({"gi", "CIMT_Lamp.DeviceID=\"none\"", "--format", "json"});
     EXPECT_EQ(outcome.status, 1);
     EXPECT_EQ(nlohmann::json::parse(outcome.out),
@@ -240,21 +259,21 @@ TEST(Traversals, handEveryArgumentOn)
     EXPECT_EQ(run({"ai", rackPath, "-ac", "CIMT_RackLamp", "-arc", "R", "-ar", "From", "-arr", "To", "Name",
                    "AlarmState", "--trace"})
                   .err,
-              "cimhost: trace INFO SampleProvider: CIMT_RackLamp R From To +Name +AlarmState\n");
+              "cimhost: trace INFO Sample: CIMT_RackLamp R From To +Name +AlarmState\n");
     EXPECT_EQ(
         run({"ain", rackPath, "-ac", "CIMT_RackLamp", "-arc", "R", "-ar", "From", "-arr", "To", "--trace"})
             .err,
-        "cimhost: trace INFO SampleProvider: CIMT_RackLamp R From To\n");
-    EXPECT_EQ(run({"ri", rackPath, "-arc", "CIMT_RackLamp", "-ar", "From", "P", "--trace"}).err,
-              "cimhost: trace INFO SampleProvider: CIMT_RackLamp From +P\n");
+        "cimhost: trace INFO Sample: CIMT_RackLamp R From To\n");
+    EXPECT_EQ(run({"ri", rackPath, "-arc", "CIMT_RackLamp", "-ar", "From", "PartComponent", "--trace"}).err,
+              "cimhost: trace INFO Sample: CIMT_RackLamp From +PartComponent\n");
     EXPECT_EQ(run({"rin", rackPath, "-arc", "CIMT_RackLamp", "-ar", "From", "--trace"}).err,
-              "cimhost: trace INFO SampleProvider: CIMT_RackLamp From\n");
+              "cimhost: trace INFO Sample: CIMT_RackLamp From\n");
 }
 
 TEST(Traversals, askEveryAssociationWithoutAClass)
 {
-    EXPECT_EQ(run({"ai", rackPath, "--trace"}).err, "cimhost: trace INFO SampleProvider: - - - -\n");
-    EXPECT_EQ(run({"rin", rackPath, "--trace"}).err, "cimhost: trace INFO SampleProvider: - -\n");
+    EXPECT_EQ(run({"ai", rackPath, "--trace"}).err, "cimhost: trace INFO Sample: - - - -\n");
+    EXPECT_EQ(run({"rin", rackPath, "--trace"}).err, "cimhost: trace INFO Sample: - -\n");
 }
 
 TEST(Traversals, printWhatTheyBring)
@@ -264,7 +283,7 @@ TEST(Traversals, printWhatTheyBring)
                  "Name    EnabledState\n"
                  "------  ------------\n"
                  "rack-1  Enabled\n");
-    EXPECT_THAT(run({"ai", rackPath}, true).out, StartsWith("DeviceID           Name      HealthState"));
+    EXPECT_THAT(run({"ai", rackPath}, true).out, StartsWith("Name      HealthState"));
     const Outcome references = run({"ri", rackPath, "-arc", "CIMT_RackLamp"}, true);
     EXPECT_THAT(references.out, HasSubstr(std::string("\n  GroupComponent  ") + rackPath + '\n'));
     EXPECT_THAT(references.out, HasSubstr(std::string("\n  PartComponent   ") + secondPath + '\n'));
@@ -280,16 +299,51 @@ TEST(Traversals, printReferencesThatAreReadBack)
     EXPECT_EQ(run({"rin", path}).out, outcome.out);
 }
 
+TEST(Traversals, adviseAnAssociationClassAfterAnErrorWithoutOne)
+{
+    const std::string path = "root/refusing:CIMT_Lamp.DeviceID=\"x\"";
+    const std::string advice = "Every association was asked. For one of them add -ac CIMT_Refusing\n";
+    for (const char* const command : {"ai", "ain", "ri", "rin"}) {
+        const Outcome outcome = run({command, path});
+        EXPECT_EQ(outcome.status, 1);
+        EXPECT_EQ(outcome.err, "cimhost: CMPI_RC_ERR_FAILED (1): which association?\n" + advice) << command;
+        EXPECT_EQ(run({command, path, "-ac", "CIMT_Refusing"}).err,
+                  "cimhost: CMPI_RC_ERR_FAILED (1): which association?\n");
+    }
+}
+
+TEST(Classes, areListedWithWhatTheyAnswer)
+{
+    const std::string list = run({"classes"}).out;
+    EXPECT_THAT(list, StartsWith("Namespace "));
+    EXPECT_THAT(
+        list,
+        HasSubstr("\nroot/other     CIMT_RackLamp    all               Rack      libCimhostSample.so\n"));
+    EXPECT_THAT(list, HasSubstr("\nroot/cimv2     CIMT_RackSystem  ein, ei, gi       Rack "));
+}
+
+TEST(Properties, thatNoInstanceHasAreWarnedOf)
+{
+    const Outcome outcome = run({"ei", "CIMT_Lamp", "Nmae", "HealthState", "Bogus", "deviceid"});
+    EXPECT_EQ(outcome.status, 0);
+    EXPECT_EQ(outcome.err, "cimhost: no instance has the property Nmae; did you mean Name?\n"
+                           "cimhost: no instance has the property Bogus\n");
+    EXPECT_EQ(run({"gi", firstPath, "Name", "HealthState"}).err, "");
+    EXPECT_EQ(run({"ei", "root/careless:CIMT_Careless", "Name"}).err, "") << "there is no instance at all";
+}
+
 // Errors
 
 TEST(Errors, comeWithTheirCodeAndMessage)
 {
     expectError(run({"gi", "CIMT_Lamp"}), 1,
                 "cimhost: CMPI_RC_ERR_FAILED (1): At least one key should be passed\n");
-    expectError(
-        run({"ei", "CIMT_Lamp", "-n", "root/none"}), 1,
-        "cimhost: CMPI_RC_ERR_INVALID_NAMESPACE (3): no registration names the namespace root/none\n");
-    EXPECT_THAT(run({"ei", "CIMT_None"}).err, StartsWith("cimhost: CMPI_RC_ERR_INVALID_CLASS (5)"));
+    expectError(run({"ei", "CIMT_Lamp", "-n", "root/none"}), 1,
+                "cimhost: CMPI_RC_ERR_INVALID_NAMESPACE (3): no registration names the namespace root/none\n"
+                "Try: cimhost classes\n");
+    EXPECT_EQ(run({"ei", "CIMT_Lmap"}).err,
+              "cimhost: CMPI_RC_ERR_INVALID_CLASS (5): no provider is registered for the class CIMT_Lmap in "
+              "root/cimv2; did you mean CIMT_Lamp?\nTry: cimhost classes\n");
 }
 
 TEST(Errors, leaveOutWhatCameBeforeThemAndCannotDriveATerminal)
@@ -343,7 +397,7 @@ TEST(Errors, ofAMissingProviderAreTheAnswers)
     const Outcome outcome = run({"ei", "CIMT_Lamp", "--provider-dir", directory.path().string()});
     EXPECT_EQ(outcome.status, 1);
     EXPECT_THAT(outcome.err, StartsWith("cimhost: CMPI_RC_ERR_FAILED (1): "));
-    EXPECT_THAT(outcome.err, HasSubstr("libCimhostCliSample.so"));
+    EXPECT_THAT(outcome.err, HasSubstr("libCimhostSample.so"));
 }
 
 // Surroundings of the providers
@@ -352,11 +406,12 @@ TEST(Inventory, isSetBeforeTheProvidersAreLoaded)
 {
     const TemporaryDirectory directory;
     const std::string file = directory.file("inventory.json", "{}");
-    EXPECT_EQ(run({"ei", "CIMT_RackSystem", "--inventory", file, "--trace"}).err,
-              "cimhost: trace VERBOSE SampleProvider: inventory " + file + '\n');
-    unsetenv("TAVRO_INVENTORY");
-    EXPECT_EQ(run({"ei", "CIMT_RackSystem", "--trace"}).err,
-              "cimhost: trace VERBOSE SampleProvider: inventory unset\n");
+    const auto traced = [](const std::string& inventory) {
+        return StartsWith("cimhost: trace VERBOSE Sample: inventory " + inventory + '\n');
+    };
+    EXPECT_THAT(run({"ei", "CIMT_RackSystem", "--inventory", file, "--trace"}).err, traced(file));
+    unsetenv("CIMT_INVENTORY");
+    EXPECT_THAT(run({"ei", "CIMT_RackSystem", "--trace"}).err, traced("unset"));
 }
 
 TEST(Inventory, mustExist)
@@ -382,14 +437,18 @@ TEST(Graph, showsObjectsByHealthAndAssociationsByName)
     EXPECT_EQ(outcome.out,
               R"(digraph "root/cimv2" {
     rankdir=LR;
-    node [fontname="sans-serif", style=filled];
-    edge [fontname="sans-serif", fontsize=9];
+    ranksep=2;
+    nodesep=0.1;
+    labelloc=t;
+    fontname="sans-serif";
+    label=<<font color="steelblue">CIMT_RackLamp: GroupComponent → PartComponent</font><br/>>;
+    node [fontname="sans-serif", style=filled, margin="0.1,0.03"];
     // CIMT_Broken: CMPI_RC_ERR_FAILED (1): broken on purpose\x001B[2J
     n0 [label="Rack <1> &amp; \"co\"\nCIMT_RackSystem", shape=box3d, fillcolor=white];
-    n1 [label="Fan 1\nCIMT_Lamp\nOK", shape=box, fillcolor=palegreen];
-    n2 [label="Lüfter 2\nCIMT_Lamp\nDegraded/Warning", shape=box, fillcolor=khaki];
-    n0 -> n1 [label="CIMT_RackLamp\nGroupComponent → PartComponent"];
-    n0 -> n2 [label="CIMT_RackLamp\nGroupComponent → PartComponent"];
+    n1 [label="Fan 1\nCIMT_Lamp\nOK, alarm Off", shape=box, fillcolor=palegreen];
+    n2 [label="Lüfter 2\nCIMT_Lamp\nDegraded/Warning, alarm Alternating", shape=box, fillcolor=khaki];
+    n0 -> n1 [color=steelblue];
+    n0 -> n2 [color=steelblue];
 }
 )");
 }

@@ -98,9 +98,14 @@ std::vector<Change> changesBetween(const std::vector<cim::Instance>& before,
     return changes;
 }
 
-std::string changeText(const Change& change)
+std::string changeText(const Change& change, std::size_t width)
 {
-    return cim::printable(shortName(change.instance.path) + eventText(change));
+    constexpr std::size_t leastName = 20;
+    const std::string name = cim::printable(shortName(change.instance.path));
+    const std::string event = cim::printable(eventText(change));
+    const std::size_t eventWidth = cim::displayWidth(event);
+    const std::size_t left = width > eventWidth ? width - eventWidth : 0;
+    return shortenedAtEnd(shortenedInMiddle(name, std::max(left, leastName)) + event, width);
 }
 
 } // namespace cimhost::cli

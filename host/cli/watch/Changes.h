@@ -4,6 +4,7 @@
 #define CIMHOST_CLI_WATCH_CHANGES_H
 
 #include "cim/Model.h"
+#include "cli/FittedTable.h"
 
 #include <string>
 #include <vector>
@@ -33,9 +34,10 @@ struct Change
 std::vector<Change> changesBetween(const std::vector<cim::Instance>& before,
                                    const std::vector<cim::Instance>& now);
 
-/// The change in one line: the keys that tell the instance, and what happened. States are in
-/// words, and the line may go to a terminal.
-std::string changeText(const Change& change);
+/// The change in one line that may go to a terminal: the keys that tell the instance, and what happened.
+/// States are in words.
+/// \param width  of the terminal; the keys are shortened first
+std::string changeText(const Change& change, std::size_t width = anyWidth);
 
 } // namespace cimhost::cli
 

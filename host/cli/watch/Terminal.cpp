@@ -1,7 +1,9 @@
 #include "cli/watch/Terminal.h"
 
+#include <array>
 #include <cerrno>
 #include <cstddef>
+#include <string_view>
 #include <system_error>
 
 #include <sys/ioctl.h>
@@ -61,6 +63,19 @@ void Terminal::show(const std::vector<std::string>& lines) const
     for (std::size_t i = 0; i < lines.size(); ++i)
         text += (i == 0 ? "" : "\r\n") + lines[i] + clearLine;
     writeNow(text + clearBelow);
+}
+
+int Terminal::keyboard() const
+{
+    return before_ ? STDIN_FILENO : -1;
+}
+
+bool Terminal::isEndAsked() const
+{
+    std::array<char, 64> keys{};
+    const ssize_t count = ::read(keyboard(), keys.data(), keys.size());
+    return count <= 0 ||
+           std::string_view(keys.data(), static_cast<std::size_t>(count)).find('q') != std::string_view::npos;
 }
 
 TerminalSize Terminal::size()

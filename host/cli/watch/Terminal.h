@@ -13,7 +13,8 @@
 
 namespace cimhost::cli {
 
-/// Writes the whole text to standard output. \throws std::system_error
+/// Writes the whole text to standard output.
+/// \throws std::system_error
 void writeNow(const std::string& text);
 
 /// While the object lives, the terminal of standard output shows its screens in place of what it showed
@@ -30,6 +31,12 @@ public:
     /// \throws std::system_error
     void show(const std::vector<std::string>& lines) const;
     [[nodiscard]] static TerminalSize size();
+
+    /// Where keys come from; -1: nowhere.
+    [[nodiscard]] int keyboard() const;
+    /// Takes the keys that were pressed.
+    /// \return whether one of them asks for the end, or the keyboard is gone
+    [[nodiscard]] bool isEndAsked() const;
 
 private:
     std::optional<termios> before_;

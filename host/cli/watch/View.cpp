@@ -15,7 +15,8 @@ namespace cimhost::cli {
 namespace {
 
 constexpr int markedFor = 5;          ///< answers
-constexpr std::size_t mostRecent = 5; ///< changes
+constexpr std::size_t mostRecent = 5; ///< changes, and messages
+constexpr std::size_t signColumns = 2;
 constexpr const char* plain = "\x1B[0m";
 
 /// Values of HealthState in the CIM schema.
@@ -43,24 +44,6 @@ const char* colourOf(const cim::Instance& instance)
     return health == ok ? "\x1B[32m" : ""; // green
 }
 
-/// The beginning of a printable text that is no wider.
-std::string cropped(std::string_view text, std::size_t columns)
-{
-    std::string result;
-    std::size_t width = 0;
-    while (!text.empty()) {
-        std::string_view rest = text;
-        cim::takeCharacter(rest);
-        const std::string_view character = text.substr(0, text.size() - rest.size());
-        width += cim::displayWidth(character);
-        if (width > columns)
-            break;
-        result += character;
-        text = rest;
-    }
-    return result;
-}
-
 std::vector<std::string> linesOf(const std::string& text)
 {
     std::istringstream stream(text);
@@ -68,6 +51,13 @@ std::vector<std::string> linesOf(const std::string& text)
     for (std::string line; std::getline(stream, line);)
         lines.push_back(line);
     return lines;
+}
+
+template <class Item>
+void keepLast(std::vector<Item>& items)
+{
+    if (items.size() > mostRecent)
+        items.erase(items.begin(), items.end() - static_cast<std::ptrdiff_t>(mostRecent));
 }
 
 std::string coloured(const std::string& text, const std::string& colour, bool isColoured)
@@ -96,11 +86,17 @@ std::vector<std::string> Watched::take(const cim::Answer& answer, const std::str
     instances_ = answer.instances;
     if (!std::exchange(isFirst_, false)) {
         mark(changes);
-        recent_.insert(recent_.end(), news.begin(), news.end());
-        if (recent_.size() > mostRecent)
-            recent_.erase(recent_.begin(), recent_.end() - static_cast<std::ptrdiff_t>(mostRecent));
+        for (const Change& change : changes)
+            recent_.push_back({time, change});
+        keepLast(recent_);
     }
     return news;
+}
+
+void Watched::tell(const std::vector<std::string>& messages)
+{
+    messages_.insert(messages_.end(), messages.begin(), messages.end());
+    keepLast(messages_);
 }
 
 void Watched::mark(const std::vector<Change>& changes)
@@ -119,21 +115,53 @@ char Watched::signOf(const cim::Instance& instance) const
     return found == marks_.end() ? ' ' : found->second.sign;
 }
 
+/// What was answered, and when.
+std::string Watched::stateLine() const
+{
+    const std::string count =
+        std::to_string(instances_.size()) + (instances_.size() == 1 ? " instance" : " instances");
+    return error_.empty() ? count + " at " + time_ : "no answer at " + time_ + "; before: " + count;
+}
+
+/// What stands below the table: changes and messages, the last of them where the terminal is low; how to end.
+std::vector<std::string> Watched::linesBelow(TerminalSize size) const
+{
+    const std::size_t most = std::clamp<std::size_t>(size.rows / 8, 1, mostRecent);
+    std::vector<std::string> lines;
+    if (!recent_.empty())
+        lines.emplace_back();
+    for (std::size_t i = recent_.size() - std::min(most, recent_.size()); i < recent_.size(); ++i) {
+        const std::string time = recent_[i].time + ' ';
+        const std::size_t left = size.columns > time.size() ? size.columns - time.size() : 0;
+        lines.push_back(time + changeText(recent_[i].change, left));
+    }
+    if (!messages_.empty())
+        lines.emplace_back();
+    for (std::size_t i = messages_.size() - std::min(most, messages_.size()); i < messages_.size(); ++i)
+        lines.push_back(shortenedAtEnd(cim::printable(messages_[i]), size.columns));
+    lines.emplace_back();
+    lines.emplace_back("q ends");
+    for (std::string& line : lines)
+        line = cropped(line, size.columns);
+    return lines;
+}
+
 std::vector<std::string> Watched::frame(const std::string& title, TerminalSize size, bool isColoured) const
 {
-    std::vector<std::string> lines{
-        cropped(title + ", " + std::to_string(instances_.size()) + " at " + time_, size.columns)};
+    std::vector<std::string> lines{shortenedAtEnd(title + ": " + stateLine(), size.columns)};
     if (!error_.empty())
-        lines.push_back(coloured(cropped(error_, size.columns), "\x1B[31m", isColoured));
+        lines.push_back(coloured(shortenedAtEnd(error_, size.columns), "\x1B[31m", isColoured));
     lines.emplace_back();
 
-    const std::vector<std::string> table = linesOf(stateTable(instances_));
-    const std::size_t headings = std::min<std::size_t>(table.size(), instances_.empty() ? 1 : 2);
+    const std::size_t besideSign = size.columns > signColumns ? size.columns - signColumns : 0;
+    const std::vector<std::string> table = linesOf(stateTable(instances_, isWide_ ? anyWidth : besideSign));
+    // After an error an empty table would look like an empty answer.
+    const std::size_t headings = !instances_.empty() ? 2 : error_.empty() ? 1 : 0;
     for (std::size_t i = 0; i < headings; ++i)
         lines.push_back(cropped("  " + table[i], size.columns));
 
-    const std::size_t below = recent_.empty() ? 0 : recent_.size() + 1;
-    const std::size_t used = lines.size() + below;
+    const std::vector<std::string> below = linesBelow(size);
+    const std::size_t used = lines.size() + below.size();
     const std::size_t room = size.rows > used ? size.rows - used : 0;
     std::vector<std::size_t> order(instances_.size());
     std::iota(order.begin(), order.end(), 0);
@@ -154,11 +182,7 @@ std::vector<std::string> Watched::frame(const std::string& title, TerminalSize s
     if (!isWhole && room > 0)
         lines.push_back(cropped("  ... and " + std::to_string(order.size() - shown) + " more", size.columns));
 
-    if (!recent_.empty()) {
-        lines.emplace_back();
-        for (const std::string& line : recent_)
-            lines.push_back(cropped(line, size.columns));
-    }
+    lines.insert(lines.end(), below.begin(), below.end());
     lines.resize(std::min(lines.size(), size.rows));
     return lines;
 }

@@ -24,9 +24,16 @@ struct TerminalSize
 class Watched
 {
 public:
-    /// Takes the next answer in. \param time  of the answer, for people  \return the changes, as lines with
-    /// the time
+    /// \param isWide  the table goes beyond the terminal's edge instead of fitting it
+    explicit Watched(bool isWide = false) : isWide_(isWide) {}
+
+    /// Takes the next answer in.
+    /// \param time  of the answer, for people
+    /// \return the changes, as lines with the time
     std::vector<std::string> take(const cim::Answer& answer, const std::string& time);
+
+    /// Takes in what came on standard error meanwhile.
+    void tell(const std::vector<std::string>& messages);
 
     /// The terminal's lines, as many as fit, none wider than it is; with escape sequences for colours if
     /// wanted. `*` marks an instance that altered, `+` one that appeared within the last few answers. Where
@@ -44,12 +51,24 @@ private:
     void mark(const std::vector<Change>& changes);
     [[nodiscard]] char signOf(const cim::Instance& instance) const;
 
+    /// A change, and when it was seen.
+    struct Seen
+    {
+        std::string time;
+        Change change;
+    };
+
+    [[nodiscard]] std::string stateLine() const;
+    [[nodiscard]] std::vector<std::string> linesBelow(TerminalSize size) const;
+
     bool isFirst_ = true;
+    bool isWide_;
     std::string time_;
     std::string error_; ///< of the last answer; empty: it had none
     std::vector<cim::Instance> instances_;
     std::map<std::string, Mark> marks_; ///< by the look-up text of the path
-    std::vector<std::string> recent_;   ///< the last changes, newest last
+    std::vector<Seen> recent_;          ///< the last changes, newest last
+    std::vector<std::string> messages_; ///< the last ones, newest last
 };
 
 } // namespace cimhost::cli

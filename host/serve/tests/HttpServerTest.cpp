@@ -2,6 +2,7 @@
 
 #include "serve/HttpServer.h"
 
+#include "cim/Descriptor.h"
 #include "serve/tests/Messages.h"
 
 #include <memory>
@@ -16,7 +17,6 @@
 #include <arpa/inet.h>
 #include <netinet/in.h>
 #include <sys/socket.h>
-#include <unistd.h>
 
 using namespace cimhost;
 using namespace cimhost::serve;
@@ -36,18 +36,16 @@ public:
         address.sin_family = AF_INET;
         address.sin_port = htons(endpoint.port);
         inet_pton(AF_INET, endpoint.address.c_str(), &address.sin_addr);
-        if (connect(socket_, reinterpret_cast<const sockaddr*>(&address), sizeof address) != 0)
+        if (connect(socket_.number(), reinterpret_cast<const sockaddr*>(&address), sizeof address) != 0)
             throw std::system_error(errno, std::generic_category(), "connect");
     }
-    ~Connection() { close(socket_); }
-    Connection(const Connection&) = delete;
-    Connection& operator=(const Connection&) = delete;
 
     /// Once the server has closed the connection nothing is sent any more.
     void send(const std::string& bytes) const
     {
         for (std::size_t sent = 0; sent < bytes.size();) {
-            const ssize_t now = ::send(socket_, bytes.data() + sent, bytes.size() - sent, MSG_NOSIGNAL);
+            const ssize_t now =
+                ::send(socket_.number(), bytes.data() + sent, bytes.size() - sent, MSG_NOSIGNAL);
             if (now <= 0)
                 return;
             sent += static_cast<std::size_t>(now);
@@ -83,13 +81,13 @@ private:
     bool receiveMore()
     {
         char bytes[4096];
-        const ssize_t count = recv(socket_, bytes, sizeof bytes, 0);
+        const ssize_t count = recv(socket_.number(), bytes, sizeof bytes, 0);
         if (count > 0)
             received_.append(bytes, static_cast<std::size_t>(count));
         return count > 0;
     }
 
-    int socket_;
+    cimhost::cim::Descriptor socket_;
     std::string received_;
 };
 

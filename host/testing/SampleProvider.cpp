@@ -2,38 +2,21 @@
 /// Providers for the tests of the broker, each a class TEST_… of its own: one that behaves, and some
 /// that break the interface in one way each. The first word of an entry point's name is the provider's.
 
+#include "testing/ProviderParts.h"
+
 #include <cstring>
 #include <stdexcept>
 #include <string>
 
 #include <cmpift.h>
 
+using namespace sample;
+
 namespace {
-
-constexpr CMPIStatus ok{CMPI_RC_OK, nullptr};
-
-const CMPIBroker* broker = nullptr;
-
-CMPIStatus failure(CMPIrc code, const char* message)
-{
-    return {code, broker->eft->newString(broker, message, nullptr)};
-}
-
-const char* nameSpaceOf(const CMPIObjectPath* path)
-{
-    CMPIString* const nameSpace = path->ft->getNameSpace(path, nullptr);
-    return nameSpace->ft->getCharPtr(nameSpace, nullptr);
-}
-
-const CMPIValue* chars(const char* text)
-{
-    return reinterpret_cast<const CMPIValue*>(text);
-}
 
 CMPIObjectPath* thingPath(const CMPIObjectPath* request, const char* name)
 {
-    CMPIObjectPath* const path =
-        broker->eft->newObjectPath(broker, nameSpaceOf(request), "TEST_Thing", nullptr);
+    CMPIObjectPath* const path = newPath(request, "TEST_Thing");
     path->ft->addKey(path, "Name", chars(name), CMPI_chars);
     return path;
 }
@@ -50,69 +33,9 @@ CMPIInstance* thing(const CMPIObjectPath* request, const char* name, const char*
     return instance;
 }
 
-/// Tells the tests what a call came with.
-void say(const std::string& text)
-{
-    broker->eft->trace(broker, CMPI_LEV_INFO, "Sample", text.c_str(), nullptr);
-}
-
 std::string shown(const char* text)
 {
     return text == nullptr ? "null" : text;
-}
-
-/// All operations answer code 7; a provider replaces those that it has.
-struct NotSupported
-{
-    static CMPIStatus cleanup(CMPIInstanceMI* /*mi*/, const CMPIContext* /*context*/, CMPIBoolean terminating)
-    {
-        say(std::string("cleanup ") + (terminating != 0 ? "terminating" : "going on"));
-        return ok;
-    }
-    static CMPIStatus onClass(CMPIInstanceMI* /*mi*/, const CMPIContext* /*context*/,
-                              const CMPIResult* /*result*/, const CMPIObjectPath* /*path*/)
-    {
-        return {CMPI_RC_ERR_NOT_SUPPORTED, nullptr};
-    }
-    static CMPIStatus withProperties(CMPIInstanceMI* /*mi*/, const CMPIContext* /*context*/,
-                                     const CMPIResult* /*result*/, const CMPIObjectPath* /*path*/,
-                                     const char** /*properties*/)
-    {
-        return {CMPI_RC_ERR_NOT_SUPPORTED, nullptr};
-    }
-    static CMPIStatus create(CMPIInstanceMI* /*mi*/, const CMPIContext* /*context*/,
-                             const CMPIResult* /*result*/, const CMPIObjectPath* /*path*/,
-                             const CMPIInstance* /*instance*/)
-    {
-        return {CMPI_RC_ERR_NOT_SUPPORTED, nullptr};
-    }
-    static CMPIStatus modify(CMPIInstanceMI* /*mi*/, const CMPIContext* /*context*/,
-                             const CMPIResult* /*result*/, const CMPIObjectPath* /*path*/,
-                             const CMPIInstance* /*instance*/, const char** /*properties*/)
-    {
-        return {CMPI_RC_ERR_NOT_SUPPORTED, nullptr};
-    }
-    static CMPIStatus query(CMPIInstanceMI* /*mi*/, const CMPIContext* /*context*/,
-                            const CMPIResult* /*result*/, const CMPIObjectPath* /*path*/,
-                            const char* /*query*/, const char* /*language*/)
-    {
-        return {CMPI_RC_ERR_NOT_SUPPORTED, nullptr};
-    }
-};
-
-CMPIInstanceMIFT notSupported(const char* name)
-{
-    return {200,
-            200,
-            name,
-            NotSupported::cleanup,
-            NotSupported::onClass,
-            NotSupported::withProperties,
-            NotSupported::withProperties,
-            NotSupported::create,
-            NotSupported::modify,
-            NotSupported::onClass,
-            NotSupported::query};
 }
 
 // TEST_Thing: two things, "one" and "three", of the sizes of their names.
@@ -236,9 +159,8 @@ CMPIStatus enumerateNames(CMPIInstanceMI* /*mi*/, const CMPIContext* context, co
                           const CMPIObjectPath* path)
 {
     CMPIStatus status = ok;
-    CMPIObjectPath* const things =
-        broker->eft->newObjectPath(broker, nameSpaceOf(path), "TEST_Thing", nullptr);
-    CMPIEnumeration* const found = broker->bft->enumerateInstanceNames(broker, context, things, &status);
+    CMPIEnumeration* const found =
+        broker->bft->enumerateInstanceNames(broker, context, newPath(path, "TEST_Thing"), &status);
     while (found != nullptr && found->ft->hasNext(found, nullptr) != 0)
         result->ft->returnObjectPath(result, found->ft->getNext(found, nullptr).value.ref);
     return status;

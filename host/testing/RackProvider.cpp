@@ -1,77 +1,88 @@
-// A provider for the tests of the command line: a rack with two lamps and the association between
-// them, a class that always fails and one that breaks the interface. It serves fixed instances.
+/// \file
+/// A provider for the tests of the command line: a rack with two lamps and the association between them, a
+/// class that always fails and one that breaks the interface. A file named by CIMT_INVENTORY has other lamps,
+/// for tests that change them: lines of `lamp ID HEALTH ALARMSTATE`; `error TEXT`, which is then the answer;
+/// and `print TEXT`, which goes to standard error.
 
-#include <cmpidt.h>
-#include <cmpift.h>
+#include "testing/ProviderParts.h"
 
 #include <array>
 #include <cstdlib>
+#include <fstream>
 #include <initializer_list>
+#include <iostream>
+#include <sstream>
 #include <string>
 #include <vector>
 
 #include <strings.h>
 
-namespace {
+using namespace sample;
 
-const CMPIBroker* broker = nullptr;
+namespace {
 
 struct Lamp
 {
-    const char* deviceId;
-    const char* name;
+    std::string deviceId;
+    std::string name;
     CMPIUint16 health;
     std::vector<CMPIUint16> operationalStatus;
     CMPIUint16 alarmState;
 };
 
-const std::vector<Lamp>& lamps()
+struct Inventory
 {
-    static const std::vector<Lamp> list{
-        {"Fan 1:/bay[0]", "Fan 1", 5, {2, 11}, 1},
-        {"L\u00fcfter \"2\", a=b\\c", "L\u00fcfter 2", 10, {3, 5}, 3},
-    };
-    return list;
+    std::vector<Lamp> lamps;
+    std::string error;
+};
+
+Lamp lampOf(std::istream& words)
+{
+    Lamp lamp{};
+    words >> lamp.deviceId >> lamp.health >> lamp.alarmState;
+    lamp.name = lamp.deviceId.substr(0, lamp.deviceId.find(':'));
+    lamp.operationalStatus = lamp.health == 5 ? std::vector<CMPIUint16>{2, 11} : std::vector<CMPIUint16>{3};
+    return lamp;
+}
+
+Inventory read(std::istream& file)
+{
+    Inventory inventory;
+    for (std::string line; std::getline(file, line);) {
+        std::istringstream words(line);
+        std::string kind;
+        words >> kind;
+        if (kind == "lamp")
+            inventory.lamps.push_back(lampOf(words));
+        else if (kind == "error")
+            inventory.error = line.substr(kind.size() + 1);
+        else if (kind == "print")
+            std::cerr << line.substr(kind.size() + 1) << std::endl;
+    }
+    return inventory;
+}
+
+Inventory inventory()
+{
+    if (const char* const file = std::getenv("CIMT_INVENTORY")) {
+        std::ifstream stream(file);
+        return read(stream);
+    }
+    return {{{"Fan 1:/bay[0]", "Fan 1", 5, {2, 11}, 1},
+             {"L\u00fcfter \"2\", a=b\\c", "L\u00fcfter 2", 10, {3, 5}, 3}},
+            ""};
+}
+
+std::vector<Lamp> lamps()
+{
+    return inventory().lamps;
 }
 
 constexpr const char* rackName = "rack-1";
 
-CMPIStatus good()
-{
-    return {CMPI_RC_OK, nullptr};
-}
-
-CMPIStatus failed(const char* message)
-{
-    return {CMPI_RC_ERR_FAILED, broker->eft->newString(broker, message, nullptr)};
-}
-
-std::string read(CMPIString* string)
-{
-    const char* text = string == nullptr ? nullptr : string->ft->getCharPtr(string, nullptr);
-    return text == nullptr ? "" : text;
-}
-
 bool hasClass(const CMPIObjectPath* path, const char* className)
 {
-    return strcasecmp(read(path->ft->getClassName(path, nullptr)).c_str(), className) == 0;
-}
-
-void trace(CMPILevel level, const std::string& text)
-{
-    broker->eft->trace(broker, level, "SampleProvider", text.c_str(), nullptr);
-}
-
-/// Text goes to a broker as the character pointer itself, in the place of the value's.
-const CMPIValue* chars(const char* text)
-{
-    return reinterpret_cast<const CMPIValue*>(text);
-}
-
-CMPIObjectPath* newPath(const CMPIObjectPath* request, const char* className)
-{
-    const std::string nameSpace = read(request->ft->getNameSpace(request, nullptr));
-    return broker->eft->newObjectPath(broker, nameSpace.c_str(), className, nullptr);
+    return strcasecmp(textOf(path->ft->getClassName(path, nullptr)).c_str(), className) == 0;
 }
 
 CMPIObjectPath* rackPath(const CMPIObjectPath* request)
@@ -85,7 +96,7 @@ CMPIObjectPath* lampPath(const CMPIObjectPath* request, const Lamp& lamp)
 {
     CMPIObjectPath* path = newPath(request, "CIMT_Lamp");
     path->ft->addKey(path, "CreationClassName", chars("CIMT_Lamp"), CMPI_chars);
-    path->ft->addKey(path, "DeviceID", chars(lamp.deviceId), CMPI_chars);
+    path->ft->addKey(path, "DeviceID", chars(lamp.deviceId.c_str()), CMPI_chars);
     return path;
 }
 
@@ -115,8 +126,8 @@ CMPIInstance* lampInstance(const CMPIObjectPath* request, const char** propertie
     CMPIInstance* instance = broker->eft->newInstance(broker, lampPath(request, lamp), nullptr);
     instance->ft->setPropertyFilter(instance, properties, keys.data());
     instance->ft->setProperty(instance, "CreationClassName", chars("CIMT_Lamp"), CMPI_chars);
-    instance->ft->setProperty(instance, "DeviceID", chars(lamp.deviceId), CMPI_chars);
-    instance->ft->setProperty(instance, "Name", chars(lamp.name), CMPI_chars);
+    instance->ft->setProperty(instance, "DeviceID", chars(lamp.deviceId.c_str()), CMPI_chars);
+    instance->ft->setProperty(instance, "Name", chars(lamp.name.c_str()), CMPI_chars);
     setNumber(instance, "HealthState", lamp.health);
 
     CMPIValue states{};
@@ -158,16 +169,11 @@ CMPIInstance* linkInstance(const CMPIObjectPath* request, const Lamp& lamp)
     return instance;
 }
 
-CMPIStatus cleanup(CMPIInstanceMI* /*mi*/, const CMPIContext* /*ctx*/, CMPIBoolean /*terminating*/)
-{
-    return good();
-}
-
 CMPIStatus enumerateInstanceNames(CMPIInstanceMI* /*mi*/, const CMPIContext* /*ctx*/,
                                   const CMPIResult* result, const CMPIObjectPath* request)
 {
     if (hasClass(request, "CIMT_Broken"))
-        return failed("broken on purpose\x1b[2J");
+        return failure(CMPI_RC_ERR_FAILED, "broken on purpose\x1b[2J");
     if (hasClass(request, "CIMT_Careless"))
         result->ft->returnObjectPath(result, nullptr);
     if (hasClass(request, "CIMT_RackSystem"))
@@ -179,7 +185,7 @@ CMPIStatus enumerateInstanceNames(CMPIInstanceMI* /*mi*/, const CMPIContext* /*c
             result->ft->returnObjectPath(result, linkPath(request, lamp));
     }
     result->ft->returnDone(result);
-    return good();
+    return ok;
 }
 
 CMPIStatus enumerateInstances(CMPIInstanceMI* /*mi*/, const CMPIContext* /*ctx*/, const CMPIResult* result,
@@ -187,71 +193,49 @@ CMPIStatus enumerateInstances(CMPIInstanceMI* /*mi*/, const CMPIContext* /*ctx*/
 {
     if (hasClass(request, "CIMT_Broken")) {
         result->ft->returnInstance(result, rackInstance(request, properties));
-        return failed("broken on purpose\x1b[2J");
+        return failure(CMPI_RC_ERR_FAILED, "broken on purpose\x1b[2J");
     }
-    const char* inventory = std::getenv("TAVRO_INVENTORY");
-    trace(CMPI_LEV_VERBOSE, std::string("inventory ") + (inventory == nullptr ? "unset" : inventory));
+    const char* const file = std::getenv("CIMT_INVENTORY");
+    say(std::string("inventory ") + (file == nullptr ? "unset" : file), CMPI_LEV_VERBOSE);
+    const Inventory found = inventory();
+    if (!found.error.empty())
+        return failure(CMPI_RC_ERR_FAILED, found.error.c_str());
     if (hasClass(request, "CIMT_RackSystem"))
         result->ft->returnInstance(result, rackInstance(request, properties));
-    for (const Lamp& lamp : lamps()) {
+    for (const Lamp& lamp : found.lamps) {
         if (hasClass(request, "CIMT_Lamp"))
             result->ft->returnInstance(result, lampInstance(request, properties, lamp));
         if (hasClass(request, "CIMT_RackLamp"))
             result->ft->returnInstance(result, linkInstance(request, lamp));
     }
     result->ft->returnDone(result);
-    return good();
+    return ok;
 }
 
 CMPIStatus getInstance(CMPIInstanceMI* /*mi*/, const CMPIContext* /*ctx*/, const CMPIResult* result,
                        const CMPIObjectPath* request, const char** properties)
 {
     if (request->ft->getKeyCount(request, nullptr) == 0)
-        return failed("At least one key should be passed");
+        return failure(CMPI_RC_ERR_FAILED, "At least one key should be passed");
     CMPIStatus status{};
     const CMPIData key = request->ft->getKey(request, "DeviceID", &status);
-    const std::string wanted = status.rc == CMPI_RC_OK ? read(key.value.string) : "";
+    const std::string wanted = status.rc == CMPI_RC_OK ? textOf(key.value.string) : "";
     for (const Lamp& lamp : lamps())
         if (wanted == lamp.deviceId)
             result->ft->returnInstance(result, lampInstance(request, properties, lamp));
     result->ft->returnDone(result);
-    return good();
-}
-
-CMPIStatus notSupported()
-{
-    return {CMPI_RC_ERR_NOT_SUPPORTED, nullptr};
-}
-
-CMPIStatus createInstance(CMPIInstanceMI* /*mi*/, const CMPIContext* /*ctx*/, const CMPIResult* /*result*/,
-                          const CMPIObjectPath* /*path*/, const CMPIInstance* /*instance*/)
-{
-    return notSupported();
-}
-
-CMPIStatus modifyInstance(CMPIInstanceMI* /*mi*/, const CMPIContext* /*ctx*/, const CMPIResult* /*result*/,
-                          const CMPIObjectPath* /*path*/, const CMPIInstance* /*instance*/,
-                          const char** /*properties*/)
-{
-    return notSupported();
-}
-
-CMPIStatus deleteInstance(CMPIInstanceMI* /*mi*/, const CMPIContext* /*ctx*/, const CMPIResult* /*result*/,
-                          const CMPIObjectPath* /*path*/)
-{
-    return notSupported();
-}
-
-CMPIStatus execQuery(CMPIInstanceMI* /*mi*/, const CMPIContext* /*ctx*/, const CMPIResult* /*result*/,
-                     const CMPIObjectPath* /*path*/, const char* /*query*/, const char* /*language*/)
-{
-    return notSupported();
+    return ok;
 }
 
 CMPIStatus cleanupAssociation(CMPIAssociationMI* /*mi*/, const CMPIContext* /*ctx*/,
                               CMPIBoolean /*terminating*/)
 {
-    return good();
+    return ok;
+}
+
+bool refuses(const CMPIObjectPath* request)
+{
+    return textOf(request->ft->getNameSpace(request, nullptr)) == "root/refusing";
 }
 
 /// Shows what came of the options of the command line.
@@ -262,7 +246,7 @@ void traceArguments(std::initializer_list<const char*> arguments, const char** p
         text += (text.empty() ? "" : " ") + std::string(argument == nullptr ? "-" : argument);
     for (; properties != nullptr && *properties != nullptr; ++properties)
         text += std::string(" +") + *properties;
-    trace(CMPI_LEV_INFO, text);
+    say(text);
 }
 
 CMPIStatus associators(CMPIAssociationMI* /*mi*/, const CMPIContext* /*ctx*/, const CMPIResult* result,
@@ -270,12 +254,14 @@ CMPIStatus associators(CMPIAssociationMI* /*mi*/, const CMPIContext* /*ctx*/, co
                        const char* role, const char* resultRole, const char** properties)
 {
     traceArguments({assocClass, resultClass, role, resultRole}, properties);
+    if (refuses(request))
+        return failure(CMPI_RC_ERR_FAILED, "which association?");
     if (hasClass(request, "CIMT_Lamp"))
         result->ft->returnInstance(result, rackInstance(request, properties));
     if (hasClass(request, "CIMT_RackSystem"))
         for (const Lamp& lamp : lamps())
             result->ft->returnInstance(result, lampInstance(request, properties, lamp));
-    return good();
+    return ok;
 }
 
 CMPIStatus associatorNames(CMPIAssociationMI* /*mi*/, const CMPIContext* /*ctx*/, const CMPIResult* result,
@@ -283,9 +269,11 @@ CMPIStatus associatorNames(CMPIAssociationMI* /*mi*/, const CMPIContext* /*ctx*/
                            const char* role, const char* resultRole)
 {
     traceArguments({assocClass, resultClass, role, resultRole}, nullptr);
+    if (refuses(request))
+        return failure(CMPI_RC_ERR_FAILED, "which association?");
     if (hasClass(request, "CIMT_Lamp"))
         result->ft->returnObjectPath(result, rackPath(request));
-    return good();
+    return ok;
 }
 
 CMPIStatus references(CMPIAssociationMI* /*mi*/, const CMPIContext* /*ctx*/, const CMPIResult* result,
@@ -293,46 +281,42 @@ CMPIStatus references(CMPIAssociationMI* /*mi*/, const CMPIContext* /*ctx*/, con
                       const char** properties)
 {
     traceArguments({resultClass, role}, properties);
+    if (refuses(request))
+        return failure(CMPI_RC_ERR_FAILED, "which association?");
     for (const Lamp& lamp : lamps())
         result->ft->returnInstance(result, linkInstance(request, lamp));
-    return good();
+    return ok;
 }
 
 CMPIStatus referenceNames(CMPIAssociationMI* /*mi*/, const CMPIContext* /*ctx*/, const CMPIResult* result,
                           const CMPIObjectPath* request, const char* resultClass, const char* role)
 {
     traceArguments({resultClass, role}, nullptr);
+    if (refuses(request))
+        return failure(CMPI_RC_ERR_FAILED, "which association?");
     result->ft->returnObjectPath(result, linkPath(request, lamps().front()));
-    return good();
+    return ok;
 }
 
 } // namespace
 
-extern "C" CMPIInstanceMI* SampleProvider_Create_InstanceMI(const CMPIBroker* mb, const CMPIContext* /*ctx*/,
-                                                            CMPIStatus* /*rc*/)
+extern "C" CMPIInstanceMI* Rack_Create_InstanceMI(const CMPIBroker* mb, const CMPIContext* /*ctx*/,
+                                                  CMPIStatus* /*rc*/)
 {
-    static CMPIInstanceMIFT table{200,
-                                  200,
-                                  "SampleProvider",
-                                  cleanup,
-                                  enumerateInstanceNames,
-                                  enumerateInstances,
-                                  getInstance,
-                                  createInstance,
-                                  modifyInstance,
-                                  deleteInstance,
-                                  execQuery};
+    static CMPIInstanceMIFT table = notSupported("Rack");
+    table.enumerateInstanceNames = enumerateInstanceNames;
+    table.enumerateInstances = enumerateInstances;
+    table.getInstance = getInstance;
     static CMPIInstanceMI mi{nullptr, &table};
     broker = mb;
     return &mi;
 }
 
-extern "C" CMPIAssociationMI*
-SampleProvider_Create_AssociationMI(const CMPIBroker* mb, const CMPIContext* /*ctx*/, CMPIStatus* /*rc*/)
+extern "C" CMPIAssociationMI* Rack_Create_AssociationMI(const CMPIBroker* mb, const CMPIContext* /*ctx*/,
+                                                        CMPIStatus* /*rc*/)
 {
     static CMPIAssociationMIFT table{
-        200,        200,           "SampleProvider", cleanupAssociation, associators, associatorNames,
-        references, referenceNames};
+        200, 200, "Rack", cleanupAssociation, associators, associatorNames, references, referenceNames};
     static CMPIAssociationMI mi{nullptr, &table};
     broker = mb;
     return &mi;
