@@ -1,15 +1,17 @@
 /// \file
 /// Class declarations as a whole: who derives from whom, what a class inherits.
-#ifndef SCHEMA_CLASSES_H
-#define SCHEMA_CLASSES_H
+#ifndef CIMHOST_SCHEMA_CLASSES_H
+#define CIMHOST_SCHEMA_CLASSES_H
 
-#include "MofReader.h"
+#include "schema/MofReader.h"
 
+#include <cstddef>
+#include <map>
 #include <string>
 #include <string_view>
 #include <vector>
 
-namespace schema {
+namespace cimhost::schema {
 
 /// Null where there is none of that name, ignoring letter case.
 const Qualifier* findQualifier(const std::vector<Qualifier>& qualifiers, std::string_view name);
@@ -25,7 +27,9 @@ std::string typeText(const Property& property);
 class Classes
 {
 public:
-    /// \throws MofError  where two classes have one name or a class derives from itself
+    Classes() = default;
+    /// \throws MofError  where two classes have one name, or a class derives from itself or from more than
+    /// 64 others
     explicit Classes(std::vector<Class> classes);
 
     /// Null where there is none of that name.
@@ -37,13 +41,22 @@ public:
     /// The superclasses that are known, nearest first.
     [[nodiscard]] std::vector<const Class*> superclassesOf(const Class& declaration) const;
 
+    /// Those that derive from a class, in the order of the declarations: directly, or at all. With an empty
+    /// name the classes whose superclass is not known, or all.
+    [[nodiscard]] std::vector<const Class*> subclassesOf(std::string_view name, bool deep) const;
+
+    /// A class with what it inherits: properties, those of superclasses first, and qualifiers, but those that
+    /// say something of one class alone, such as Version.
+    [[nodiscard]] Class completed(const Class& declaration) const;
+
     /// What a property overrides: the nearest superclass' property of that name; null: none.
     [[nodiscard]] const Property* findInherited(const Class& declaration, std::string_view name) const;
 
 private:
     std::vector<Class> classes_;
+    std::map<std::string, std::size_t> places_; ///< by the name in lower case
 };
 
-} // namespace schema
+} // namespace cimhost::schema
 
 #endif
