@@ -106,6 +106,19 @@ Classes::Classes(std::vector<Class> classes) : classes_(std::move(classes))
                 throw MofError("the class " + declaration.name + " derives from itself, or from more than " +
                                std::to_string(deepestInheritance) + " others");
     }
+    for (const Class& declaration : classes_) {
+        std::vector<std::string>& keys = keys_.emplace_back();
+        for (const Property& property : completed(declaration).properties)
+            if (isKey(property))
+                keys.push_back(property.name);
+    }
+}
+
+const std::vector<std::string>& Classes::keysOf(std::string_view name) const
+{
+    static const std::vector<std::string> none;
+    const Class* const declaration = find(name);
+    return declaration == nullptr ? none : keys_[static_cast<std::size_t>(declaration - classes_.data())];
 }
 
 const Class* Classes::find(std::string_view name) const

@@ -49,12 +49,16 @@ public:
     /// say something of one class alone, such as Version.
     [[nodiscard]] Class completed(const Class& declaration) const;
 
+    /// The names of the keys of a class, its own and inherited; none of a class that is not known.
+    [[nodiscard]] const std::vector<std::string>& keysOf(std::string_view name) const;
+
     /// What a property overrides: the nearest superclass' property of that name; null: none.
     [[nodiscard]] const Property* findInherited(const Class& declaration, std::string_view name) const;
 
 private:
     std::vector<Class> classes_;
-    std::map<std::string, std::size_t> places_; ///< by the name in lower case
+    std::map<std::string, std::size_t> places_;  ///< by the name in lower case
+    std::vector<std::vector<std::string>> keys_; ///< of each class
 };
 
 } // namespace cimhost::schema

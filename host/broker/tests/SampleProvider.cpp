@@ -61,6 +61,12 @@ std::string shown(const char* text)
     return text == nullptr ? "null" : text;
 }
 
+std::string classNameOf(const CMPIObjectPath* path)
+{
+    CMPIString* const name = path->ft->getClassName(path, nullptr);
+    return name->ft->getCharPtr(name, nullptr);
+}
+
 /// All operations answer code 7; a provider replaces those that it has.
 struct NotSupported
 {
@@ -287,6 +293,7 @@ CMPIObjectPath* kept = nullptr;
 CMPIStatus enumerateNames(CMPIInstanceMI* /*mi*/, const CMPIContext* /*context*/, const CMPIResult* result,
                           const CMPIObjectPath* path)
 {
+    say("keeping " + classNameOf(path));
     if (kept == nullptr)
         kept = thingPath(path, "kept");
     return result->ft->returnObjectPath(result, kept);

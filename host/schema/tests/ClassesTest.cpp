@@ -104,6 +104,14 @@ TEST(Classes, AreCompletedByWhatTheyInherit)
     EXPECT_EQ(leaf.properties[2].origin, "Leaf");
 }
 
+TEST(Classes, HaveTheKeysThatTheyInherit)
+{
+    const Classes classes(readMof(family, "a.mof").classes);
+    EXPECT_THAT(classes.keysOf("leaf"), ElementsAre("Id"));
+    EXPECT_THAT(classes.keysOf("Stranger"), IsEmpty());
+    EXPECT_THAT(classes.keysOf("Nobody"), IsEmpty());
+}
+
 TEST(Classes, DeriveFromSixtyFourOthersAtMost)
 {
     std::string text = "class C0 {};";
