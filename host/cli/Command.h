@@ -64,6 +64,7 @@ struct Settings
 {
     std::vector<std::string> providerDirectories; ///< none: the default ones
     std::vector<std::string> registrationFiles;   ///< none: the default ones
+    std::vector<std::string> schemaFiles;         ///< none: the default ones
     std::optional<std::string> inventory;         ///< file for TAVRO_INVENTORY; nothing: as it is
     bool trace = false;
     std::optional<std::string> like; ///< the broker whose habits to have; nothing: none

@@ -5,6 +5,7 @@
 #include "cli/Arguments.h"
 #include "cli/Execute.h"
 #include "cli/Reports.h"
+#include "schema/MofReader.h"
 
 #include <exception>
 #include <ostream>
@@ -23,7 +24,8 @@ ExitStatus follow(const Invocation& invocation, const Surroundings& surroundings
     if (settings.inventory)
         useInventory(*settings.inventory);
     Broker broker(std::move(registration), findProviderDirectories(settings, surroundings),
-                  reportTo(err, settings.trace), settings.like ? findHabits(*settings.like) : nullptr);
+                  reportTo(err, settings.trace), settings.like ? findHabits(*settings.like) : nullptr,
+                  readClasses(findSchemaFiles(settings, surroundings)));
     return execute(invocation.command, broker, isTerminal, out, err);
 }
 
@@ -47,6 +49,8 @@ ExitStatus run(const std::vector<std::string>& arguments, const Surroundings& su
     } catch (const UsageError& error) {
         return fail(error, exitUsage, err);
     } catch (const RegistrationError& error) {
+        return fail(error, exitUsage, err);
+    } catch (const schema::MofError& error) {
         return fail(error, exitUsage, err);
     } catch (const std::exception& error) {
         return fail(error, exitError, err);

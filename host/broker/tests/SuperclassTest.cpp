@@ -45,7 +45,7 @@ TEST_F(Superclass, IsEnumeratedByTheProvidersOfWhatDerivesFromIt)
     const cim::Answer answer = broker_.enumerateInstanceNames(classPath("test_base"));
     EXPECT_EQ(answer.status.code, CMPI_RC_OK);
     EXPECT_THAT(answer.paths, ElementsAre(thingPath("one"), thingPath("three"), thingPath("kept")));
-    EXPECT_THAT(traces_, ElementsAre("1 Sample: keeping TEST_Keeping"));
+    EXPECT_EQ(traces_.back(), "1 Sample: keeping TEST_Keeping");
 }
 
 TEST_F(Superclass, HasTheFirstErrorOfItsProviders)
