@@ -26,12 +26,6 @@ constexpr std::size_t deepestInheritance = 64;
 constexpr std::array<std::string_view, 6> restrictedQualifiers{"Abstract", "Deprecated", "Experimental",
                                                                "Override", "Terminal",   "Version"};
 
-bool isRestricted(const Qualifier& qualifier)
-{
-    return std::any_of(restrictedQualifiers.begin(), restrictedQualifiers.end(),
-                       [&](std::string_view name) { return sameName(name, qualifier.name); });
-}
-
 void inherit(std::vector<Qualifier>& qualifiers, const std::vector<Qualifier>& inherited)
 {
     for (const Qualifier& qualifier : inherited)
@@ -76,6 +70,12 @@ const Property* findProperty(const Class& declaration, std::string_view name)
     return findNamed(declaration.properties, name);
 }
 
+bool isRestricted(const Qualifier& qualifier)
+{
+    return std::any_of(restrictedQualifiers.begin(), restrictedQualifiers.end(),
+                       [&](std::string_view name) { return sameName(name, qualifier.name); });
+}
+
 bool isKey(const Property& property)
 {
     return findQualifier(property.qualifiers, "Key") != nullptr;
@@ -112,6 +112,15 @@ Classes::Classes(std::vector<Class> classes) : classes_(std::move(classes))
             if (isKey(property))
                 keys.push_back(property.name);
     }
+}
+
+std::string_view Classes::originOf(std::string_view className, std::string_view property) const
+{
+    std::string_view origin;
+    for (const Class* next = find(className); next != nullptr; next = find(next->superclass))
+        if (findProperty(*next, property) != nullptr)
+            origin = next->name;
+    return origin;
 }
 
 const std::vector<std::string>& Classes::keysOf(std::string_view name) const
@@ -172,6 +181,12 @@ std::vector<const Class*> Classes::superclassesOf(const Class& declaration) cons
     for (const Class* next = find(declaration.superclass); next != nullptr; next = find(next->superclass))
         result.push_back(next);
     return result;
+}
+
+const Property* Classes::findDeclared(const Class& declaration, std::string_view name) const
+{
+    const Property* const own = findProperty(declaration, name);
+    return own != nullptr ? own : findInherited(declaration, name);
 }
 
 const Property* Classes::findInherited(const Class& declaration, std::string_view name) const

@@ -17,6 +17,8 @@ namespace cimhost::schema {
 const Qualifier* findQualifier(const std::vector<Qualifier>& qualifiers, std::string_view name);
 const Property* findProperty(const Class& declaration, std::string_view name);
 
+/// Whether it is for the class or property alone that has it: DMTF DSP0004 declares it so.
+bool isRestricted(const Qualifier& qualifier);
 bool isKey(const Property& property);
 bool isAssociation(const Class& declaration);
 
@@ -49,8 +51,14 @@ public:
     /// say something of one class alone, such as Version.
     [[nodiscard]] Class completed(const Class& declaration) const;
 
+    /// The class that declared a property first that a class has; empty: it has none of that name.
+    [[nodiscard]] std::string_view originOf(std::string_view className, std::string_view property) const;
+
     /// The names of the keys of a class, its own and inherited; none of a class that is not known.
     [[nodiscard]] const std::vector<std::string>& keysOf(std::string_view name) const;
+
+    /// The declaration that holds for a property of a class: its own or the nearest superclass'; null: none.
+    [[nodiscard]] const Property* findDeclared(const Class& declaration, std::string_view name) const;
 
     /// What a property overrides: the nearest superclass' property of that name; null: none.
     [[nodiscard]] const Property* findInherited(const Class& declaration, std::string_view name) const;

@@ -112,6 +112,15 @@ TEST(Classes, HaveTheKeysThatTheyInherit)
     EXPECT_THAT(classes.keysOf("Nobody"), IsEmpty());
 }
 
+TEST(Classes, TellWhereAPropertyComesFrom)
+{
+    const Classes classes(readMof(family, "a.mof").classes);
+    EXPECT_EQ(classes.originOf("Leaf", "state"), "Base");
+    EXPECT_EQ(classes.originOf("Leaf", "Own"), "Leaf");
+    EXPECT_EQ(classes.originOf("Middle", "Own"), "");
+    EXPECT_EQ(classes.originOf("Nobody", "Own"), "");
+}
+
 TEST(Classes, DeriveFromSixtyFourOthersAtMost)
 {
     std::string text = "class C0 {};";

@@ -23,8 +23,8 @@ OperationRequest requestOf(const std::string& message)
     const RequestMessage read = readRequest(message);
     if (const auto* status = std::get_if<cim::Status>(&read.content))
         ADD_FAILURE() << status->message.value_or("");
-    const auto* request = std::get_if<OperationRequest>(&read.content);
-    return request == nullptr ? OperationRequest() : *request;
+    const auto* question = std::get_if<Question>(&read.content);
+    return question == nullptr ? OperationRequest() : question->request;
 }
 
 /// The status that a message is answered with by itself.

@@ -22,15 +22,15 @@ namespace {
 
 RequestMessage requestFor(Operation operation)
 {
-    OperationRequest request;
-    request.operation = operation;
-    return {"7 & \"8\"", "1.0", "Method", true, "root/cimv2", request};
+    Question question;
+    question.request.operation = operation;
+    return {"7 & \"8\"", "1.0", "Method", true, "root/cimv2", question};
 }
 
 /// What stands inside of the response's method.
 std::string bodyOf(Operation operation, const cim::Answer& answer)
 {
-    const std::string document = writeResponse(requestFor(operation), answer, "here");
+    const std::string document = writeResponse(requestFor(operation), {answer}, "here");
     const std::string before =
         "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\">"
         "<MESSAGE ID=\"7 &amp; &quot;8&quot;\" PROTOCOLVERSION=\"1.0\"><SIMPLERSP><IMETHODRESPONSE NAME=\"Method\">";
@@ -121,7 +121,7 @@ TEST(ResponseWriter, answersMethodsOfClassesInTheirOwnElement)
     const RequestMessage message{"1",   "1.0", "Reset",
                                  false, "a",   cim::Status{CMPI_RC_ERR_NOT_SUPPORTED, "no"}};
     EXPECT_THAT(
-        writeResponse(message, {{CMPI_RC_ERR_NOT_SUPPORTED, "no"}, {}, {}}, "here"),
+        writeResponse(message, {{{CMPI_RC_ERR_NOT_SUPPORTED, "no"}, {}, {}}}, "here"),
         HasSubstr(
             "<METHODRESPONSE NAME=\"Reset\"><ERROR CODE=\"7\" DESCRIPTION=\"no\"></ERROR></METHODRESPONSE>"));
 }
