@@ -1,7 +1,6 @@
 #include "serve/ValueReader.h"
 
 #include "broker/DateTime.h"
-#include "cim/Literal.h"
 #include "cim/Number.h"
 #include "cim/Utf8.h"
 #include "cim/Values.h"
@@ -210,29 +209,15 @@ void readKey(const Element& element, cim::ObjectPath& path)
     path.keys.push_back({name, readAnyKeyValue(onlyChild(element, {"KEYVALUE", "VALUE.REFERENCE"}))});
 }
 
-/// What stands in a key, as it would in an element.
-std::string writtenText(const cim::Value& value)
+/// The key's value as one of the declared type, which CIM-XML need not tell; nothing: it is none of it.
+std::optional<cim::Value::Scalar> typedAs(CMPIType declared, const cim::Value& given)
 {
-    if (const auto* const text = std::get_if<std::string>(&value.items.front()))
-        return *text;
-    return cim::literal(value);
-}
-
-/// The key as one of the declared type.
-void typeKey(cim::Key& key, const schema::Property& declared)
-{
-    const std::optional<CMPIType> type =
-        declared.isReference ? std::optional<CMPIType>(CMPI_ref) : findType(declared.type);
-    if (!type || key.value.type == *type)
-        return;
-    std::optional<cim::Value::Scalar> value;
-    if (*type != CMPI_ref && key.value.type != CMPI_ref)
-        value = parseScalar(writtenText(key.value), *type);
-    if (!value)
-        throw ValueError(CMPI_RC_ERR_INVALID_PARAMETER, "the key " + key.name + ": found " +
-                                                            cim::excerpt(cim::literal(key.value)) +
-                                                            ", expected " + typeText(declared));
-    key.value = scalarValue(*type, std::move(*value));
+    const bool isText = declared == CMPI_string || declared == CMPI_dateTime || declared == CMPI_char16;
+    const cim::Value::Scalar& item = given.items.front();
+    if (const auto* const text = std::get_if<std::string>(&item))
+        return isText ? parseScalar(*text, declared) : std::nullopt;
+    const bool isNumber = given.type != CMPI_boolean && given.type != CMPI_ref && given.type != CMPI_char16;
+    return isNumber && !isText && declared != CMPI_boolean ? narrowed(item, declared) : std::nullopt;
 }
 
 cim::ObjectPath readClassName(const Element& element)
@@ -395,10 +380,13 @@ void typeKeys(cim::ObjectPath& path, const schema::Classes& classes)
                                      cim::excerpt(path.className) + " is not known to have one key");
             key.name = names.front();
         }
-        if (declaration == nullptr)
+        const schema::Property* const declared =
+            declaration == nullptr ? nullptr : classes.findDeclared(*declaration, key.name);
+        const std::optional<CMPIType> type = declared == nullptr ? std::nullopt : findType(declared->type);
+        if (!type)
             continue;
-        if (const schema::Property* const declared = classes.findDeclared(*declaration, key.name))
-            typeKey(key, *declared);
+        if (std::optional<cim::Value::Scalar> value = typedAs(*type, key.value))
+            key.value = scalarValue(*type, std::move(*value));
     }
 }
 

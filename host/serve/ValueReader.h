@@ -35,8 +35,8 @@ std::string readNameSpace(const Element& element);
 /// \throws ValueError
 cim::ObjectPath readInstanceName(const Element& element);
 
-/// Gives the keys the types that the class declares, and the only key its name, as far as the class is known.
-/// \throws ValueError  for a value that its type cannot have, or a key without a name where the class is not
+/// Gives the keys the types that the class declares, as far as it is known and their values are of these
+/// types, and the only key its name. \throws ValueError  for a key without a name where the class is not
 /// known or has several
 void typeKeys(cim::ObjectPath& path, const schema::Classes& classes);
 
