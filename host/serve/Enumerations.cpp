@@ -50,18 +50,16 @@ void Enumerations::checkOpening(const Question& question)
                                                       std::to_string(*question.timeout) + ", expected 1 to " +
                                                       std::to_string(limits_.longest.count()) + " seconds");
     const std::lock_guard<std::mutex> lock(mutex_);
-    giveUpForgotten();
-    if (held_.size() >= limits_.open)
-        throw ValueError(serverLimitsExceeded,
-                         std::to_string(limits_.open) + " enumerations are open, which is the most");
+    requireRoom();
 }
 
 Reply Enumerations::open(const Question& question, cim::Answer answer)
 {
-    checkOpening(question); // again: others may have been opened since
     const std::lock_guard<std::mutex> lock(mutex_);
-    Held held{question.request.target.nameSpace, question.items, {}, {}, std::move(answer)};
-    held.timeout = question.timeout ? std::chrono::seconds(*question.timeout) : limits_.usual;
+    requireRoom(); // others may have been opened since the check
+    Held held{question.request.target.nameSpace, question.items, limits_.usual, {}, std::move(answer)};
+    if (question.timeout)
+        held.timeout = std::chrono::seconds(*question.timeout);
     return nextPiece(held_.emplace(newContext(), std::move(held)).first, question.mostItems);
 }
 
@@ -91,6 +89,14 @@ void Enumerations::giveUpForgotten()
 {
     for (auto entry = held_.begin(); entry != held_.end();)
         entry = entry->second.end < now_() ? held_.erase(entry) : std::next(entry);
+}
+
+void Enumerations::requireRoom()
+{
+    giveUpForgotten();
+    if (held_.size() >= limits_.open)
+        throw ValueError(serverLimitsExceeded,
+                         std::to_string(limits_.open) + " enumerations are open, which is the most");
 }
 
 Enumerations::Place Enumerations::find(const Question& question)

@@ -36,7 +36,7 @@ public:
     void checkOpening(const Question& question);
 
     /// The first piece of an answer; the rest is held unless it is empty.
-    /// \param question  whose step is Step::open
+    /// \param question  whose step is Step::open, and which was checked
     /// \throws ValueError  there are too many
     Reply open(const Question& question, cim::Answer answer);
 
@@ -61,7 +61,9 @@ private:
     };
     using Place = std::map<std::string, Held>::iterator;
 
+    // All with the mutex held.
     void giveUpForgotten();
+    void requireRoom();
     Place find(const Question& question);
     Reply nextPiece(Place place, std::uint32_t most);
 
