@@ -66,7 +66,7 @@ Reply Enumerations::open(const Question& question, cim::Answer answer)
 Reply Enumerations::pull(const Question& question)
 {
     const std::lock_guard<std::mutex> lock(mutex_);
-    const Place place = find(question);
+    const auto place = find(question);
     if (place->second.items != question.items)
         throw ValueError(invalidEnumerationContext, "the enumeration was opened for another kind of items");
     return nextPiece(place, question.mostItems);
@@ -102,7 +102,7 @@ void Enumerations::requireRoom()
 Enumerations::Place Enumerations::find(const Question& question)
 {
     giveUpForgotten();
-    const Place place = held_.find(question.context);
+    const auto place = held_.find(question.context);
     if (place == held_.end() || !cim::sameName(place->second.nameSpace, question.request.target.nameSpace))
         throw ValueError(invalidEnumerationContext, "there is no such enumeration in " +
                                                         question.request.target.nameSpace +

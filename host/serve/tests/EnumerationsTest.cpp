@@ -188,6 +188,7 @@ TEST(PulledEnumerationsOnThreads, GiveEachItemOnce)
     question.mostItems = 1;
     std::vector<std::vector<std::string>> taken(4);
     std::vector<std::thread> threads;
+    threads.reserve(taken.size());
     for (std::vector<std::string>& mine : taken)
         threads.emplace_back([&] {
             for (int pieces = 0; pieces < 100; ++pieces)

@@ -112,7 +112,7 @@ TEST(ResponseWriter, writesClassesAndTheirNames)
                "</QUALIFIER>";
     };
     const std::string whole =
-        "<CLASS NAME=\"CIM_Leaf\" SUPERCLASS=\"CIM_Base\">" +
+        R"(<CLASS NAME="CIM_Leaf" SUPERCLASS="CIM_Base">)" +
         qualifier("Version", "string", "<VALUE>2.0</VALUE>", false, "false") +
         qualifier("Association", "boolean", "<VALUE>TRUE</VALUE>") +
         qualifier("Description", "string", "<VALUE>a &lt;b&gt;</VALUE>") +

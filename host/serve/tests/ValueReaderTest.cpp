@@ -133,7 +133,7 @@ cim::ObjectPath typed(const std::string& className, std::vector<cim::Key> keys)
 TEST(TypeKeys, NamesTheOnlyKey)
 {
     const cim::ObjectPath path = readInstanceName(elementOf(
-        "<INSTANCENAME CLASSNAME=\"cim_one\"><KEYVALUE VALUETYPE=\"numeric\">5</KEYVALUE></INSTANCENAME>"));
+        R"(<INSTANCENAME CLASSNAME="cim_one"><KEYVALUE VALUETYPE="numeric">5</KEYVALUE></INSTANCENAME>)"));
     const cim::ObjectPath whole = typed(path.className, path.keys);
     EXPECT_EQ(whole, (cim::ObjectPath{"", "", "cim_one", {{"Number", cim::unsignedValue(5, CMPI_uint16)}}}));
     EXPECT_THAT(errorOf([] {
