@@ -57,6 +57,7 @@ TEST(Classes, InheritFromTheNearestSuperclass)
 std::vector<std::string> names(const std::vector<const Class*>& classes)
 {
     std::vector<std::string> result;
+    result.reserve(classes.size());
     for (const Class* const declaration : classes)
         result.push_back(declaration->name);
     return result;

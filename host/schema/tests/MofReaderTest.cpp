@@ -60,7 +60,7 @@ TEST(MofReader, ReadsPropertiesArraysAndReferences)
 TEST(MofReader, ReadsDefaultValues)
 {
     const auto properties =
-        readMof("class A { uint16 One = 5; string Many[] = {\"a\", \"b\"}; string None; };", "a.mof")
+        readMof(R"(class A { uint16 One = 5; string Many[] = {"a", "b"}; string None; };)", "a.mof")
             .classes[0]
             .properties;
     EXPECT_THAT(properties[0].defaultValue.elements, ElementsAre("5"));
