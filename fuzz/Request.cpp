@@ -35,18 +35,19 @@ void checkRoundTrip(cim::Instance instance)
 
 void checkResponse(const RequestMessage& message)
 {
-    cim::Answer answer;
+    Reply reply;
+    cim::Answer& answer = reply.answer;
     if (const auto* const status = std::get_if<cim::Status>(&message.content)) {
         Fuzz::require(status->code != CMPI_RC_OK && status->message.has_value(), "a refusal has its reason");
         answer.status = *status;
     } else {
-        const auto& request = std::get<OperationRequest>(message.content);
+        const auto& request = std::get<Question>(message.content).request;
         Fuzz::require(request.target.nameSpace == message.nameSpace,
                       "a request is for the message's namespace");
         answer.paths.push_back(request.target);
         answer.instances.push_back(request.instance);
     }
-    parse(writeResponse(message, answer, "here"));
+    parse(writeResponse(message, reply, "here"));
 }
 
 } // namespace
@@ -56,8 +57,8 @@ int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size)
     try {
         const RequestMessage message = readRequest(Fuzz::textOf(data, size));
         checkResponse(message);
-        if (const auto* const request = std::get_if<OperationRequest>(&message.content))
-            checkRoundTrip(request->instance);
+        if (const auto* const question = std::get_if<Question>(&message.content))
+            checkRoundTrip(question->request.instance);
     } catch (const UnwritableError&) {
         // A reference to nothing; a request may have it, a provider may not return it.
     } catch (const RequestError& error) {

@@ -5,6 +5,7 @@
 #include "broker/Names.h"
 #include "broker/ProviderCall.h"
 #include "broker/Scope.h"
+#include "cim/Values.h"
 
 #include <algorithm>
 #include <iterator>
@@ -71,23 +72,6 @@ cim::Answer askHabitually(Core& core, const char* name, OperationRequest questio
     return answer;
 }
 
-/// Asks the instance provider of the class in question.
-/// \param operation  called with the management interface, the request, the question and its path
-template <class Operation>
-cim::Answer askInstanceProvider(Core& core, Router& router, const char* name, OperationRequest question,
-                                const Operation& operation)
-{
-    return answer(core, [&] {
-        const std::string nameSpace = question.target.nameSpace;
-        const RegisteredClass& served = router.instanceClass(question.target.className, nameSpace);
-        CMPIInstanceMI& mi = router.providerOf(served).instanceMI(nameSpace);
-        return askHabitually(core, name, std::move(question), served,
-                             [&](Request& request, const OperationRequest& asked, CMPIObjectPath* path) {
-                                 return operation(mi, request, asked, path);
-                             });
-    });
-}
-
 void append(cim::Answer& all, cim::Answer more)
 {
     if (all.status.code == CMPI_RC_OK)
@@ -98,19 +82,70 @@ void append(cim::Answer& all, cim::Answer more)
                          std::make_move_iterator(more.instances.end()));
 }
 
-/// Which classes to ask the providers of: that one, or each. A provider of several is not asked the same
-/// twice.
-std::vector<const RegisteredClass*> associationsToAsk(const Core& core, Router& router,
-                                                      const OperationRequest& question,
-                                                      const std::optional<std::string>& associationClass)
+/// The question as one for a class that derives from the one asked for.
+OperationRequest asOneFor(const RegisteredClass& served, OperationRequest question)
+{
+    if (!cim::sameName(question.target.className, served.className))
+        question.target.className = served.className;
+    return question;
+}
+
+/// Asks the instance providers of the class in question and, when it is enumerated, of those that derive from
+/// it.
+/// \param operation  called with the management interface, the request, the question and its path
+template <class Operation>
+cim::Answer askInstanceProviders(Core& core, Router& router, const char* name,
+                                 const OperationRequest& question, const Operation& operation)
 {
     const std::string& nameSpace = question.target.nameSpace;
-    if (associationClass)
-        return {&router.associationClass(*associationClass, nameSpace)};
+    const std::string& className = question.target.className;
+    const auto askOne = [&](const RegisteredClass& served) {
+        return answer(core, [&] {
+            CMPIInstanceMI& mi = router.providerOf(served).instanceMI(nameSpace);
+            return askHabitually(core, name, asOneFor(served, question), served,
+                                 [&](Request& request, const OperationRequest& asked, CMPIObjectPath* path) {
+                                     return operation(mi, request, asked, path);
+                                 });
+        });
+    };
+    return answer(core, [&] {
+        if (!isEnumeration(question.operation))
+            return askOne(router.instanceClass(className, nameSpace));
+        cim::Answer all;
+        for (const RegisteredClass* const served : router.instanceClasses(className, nameSpace))
+            append(all, askOne(*served));
+        return all;
+    });
+}
+
+/// A traversal's association class.
+std::optional<std::string>& associationClassOf(OperationRequest& question)
+{
+    return isReferenceTraversal(question.operation) ? question.traversal.resultClass
+                                                    : question.traversal.assocClass;
+}
+
+/// The traversal as the provider of that association is asked it.
+OperationRequest asTraversalOf(const Core& core, const RegisteredClass& served, OperationRequest question)
+{
+    std::optional<std::string>& asked = associationClassOf(question);
+    if (core.habits == nullptr && asked && !cim::sameName(*asked, served.className))
+        asked = served.className;
+    return question;
+}
+
+/// Which classes to ask the providers of: those that an association class stands for, or all. A provider of
+/// several is not asked the same twice.
+std::vector<const RegisteredClass*> associationsToAsk(const Core& core, Router& router,
+                                                      OperationRequest question)
+{
+    const std::optional<std::string> given = associationClassOf(question);
+    const std::string& nameSpace = question.target.nameSpace;
     std::vector<const RegisteredClass*> classes;
     std::vector<std::pair<const Provider*, Traversal>> asked;
-    for (const RegisteredClass* const served : router.associationClasses(nameSpace)) {
-        OperationRequest asOfThisClass = question;
+    for (const RegisteredClass* const served :
+         given ? router.associationClasses(*given, nameSpace) : router.associationClasses(nameSpace)) {
+        OperationRequest asOfThisClass = asTraversalOf(core, *served, question);
         shape(core.habits, asOfThisClass, *served);
         std::pair<const Provider*, Traversal> asking{&router.providerOf(*served), asOfThisClass.traversal};
         if (std::find(asked.begin(), asked.end(), asking) != asked.end())
@@ -121,29 +156,57 @@ std::vector<const RegisteredClass*> associationsToAsk(const Core& core, Router& 
     return classes;
 }
 
-/// Asks the provider of an association class, or all association providers when there is none.
+/// A class that only classes deriving from it are served of, when it is asked for as the result; the question
+/// is then for results of any class.
+std::optional<std::string> takeResultSuperclass(const Core& core, const Router& router,
+                                                OperationRequest& question)
+{
+    std::optional<std::string>& wanted = question.traversal.resultClass;
+    if (core.habits != nullptr || isReferenceTraversal(question.operation) || !wanted ||
+        router.isRegistered(*wanted, question.target.nameSpace) || core.classes.find(*wanted) == nullptr)
+        return std::nullopt;
+    return std::exchange(wanted, std::nullopt);
+}
+
+void keepThoseOf(const std::string& superclass, const schema::Classes& classes, cim::Answer& answer)
+{
+    const auto isOther = [&](const std::string& name) {
+        return classes.find(name) != nullptr && !classes.isA(name, superclass);
+    };
+    answer.paths.erase(std::remove_if(answer.paths.begin(), answer.paths.end(),
+                                      [&](const cim::ObjectPath& path) { return isOther(path.className); }),
+                       answer.paths.end());
+    answer.instances.erase(
+        std::remove_if(answer.instances.begin(), answer.instances.end(),
+                       [&](const cim::Instance& instance) { return isOther(instance.path.className); }),
+        answer.instances.end());
+}
+
+/// Asks the providers of an association class, or all association providers when there is none.
 /// \param operation  called with the management interface, the request, the question and its path
 template <class Operation>
-cim::Answer
-askAssociationProviders(Core& core, Router& router, const char* name, const OperationRequest& question,
-                        const std::optional<std::string>& associationClass, const Operation& operation)
+cim::Answer askAssociationProviders(Core& core, Router& router, const char* name, OperationRequest question,
+                                    const Operation& operation)
 {
+    const std::optional<std::string> superclass = takeResultSuperclass(core, router, question);
     const auto askOne = [&](const RegisteredClass& served) {
         return answer(core, [&] {
             CMPIAssociationMI& mi = router.providerOf(served).associationMI(question.target.nameSpace);
-            return askHabitually(core, name, question, served,
+            return askHabitually(core, name, asTraversalOf(core, served, question), served,
                                  [&](Request& request, const OperationRequest& asked, CMPIObjectPath* path) {
                                      return operation(mi, request, asked, path);
                                  });
         });
     };
-    return answer(core, [&] {
+    cim::Answer found = answer(core, [&] {
         cim::Answer all;
-        for (const RegisteredClass* const served :
-             associationsToAsk(core, router, question, associationClass))
+        for (const RegisteredClass* const served : associationsToAsk(core, router, question))
             append(all, askOne(*served));
         return all;
     });
+    if (superclass)
+        keepThoseOf(*superclass, core.classes, found);
+    return found;
 }
 
 const char* textOf(const std::optional<std::string>& text)
@@ -160,9 +223,10 @@ bool operator==(const Traversal& a, const Traversal& b)
 }
 
 Broker::Broker(Registration registration, std::vector<std::string> providerDirectories, Listeners listeners,
-               const Habits* habits)
-    : implementation_(std::make_unique<Implementation>(
-          *this, std::move(registration), std::move(providerDirectories), std::move(listeners), habits))
+               const Habits* habits, schema::Classes classes)
+    : implementation_(std::make_unique<Implementation>(*this, std::move(registration),
+                                                       std::move(providerDirectories), std::move(listeners),
+                                                       habits, std::move(classes)))
 {}
 
 Broker::~Broker()
@@ -172,18 +236,18 @@ Broker::~Broker()
 
 cim::Answer Broker::enumerateInstanceNames(const cim::ObjectPath& classPath)
 {
-    return askInstanceProvider(implementation_->core, implementation_->router, "enumerateInstanceNames",
-                               {Operation::enumerateInstanceNames, classPath},
-                               [](CMPIInstanceMI& mi, Request& request, const OperationRequest& /*asked*/,
-                                  const CMPIObjectPath* path) {
-                                   return mi.ft->enumerateInstanceNames(&mi, request.context(),
-                                                                        request.result(), path);
-                               });
+    return askInstanceProviders(implementation_->core, implementation_->router, "enumerateInstanceNames",
+                                {Operation::enumerateInstanceNames, classPath},
+                                [](CMPIInstanceMI& mi, Request& request, const OperationRequest& /*asked*/,
+                                   const CMPIObjectPath* path) {
+                                    return mi.ft->enumerateInstanceNames(&mi, request.context(),
+                                                                         request.result(), path);
+                                });
 }
 
 cim::Answer Broker::enumerateInstances(const cim::ObjectPath& classPath, const cim::PropertyList& properties)
 {
-    return askInstanceProvider(
+    return askInstanceProviders(
         implementation_->core, implementation_->router, "enumerateInstances",
         {Operation::enumerateInstances, classPath, {}, properties},
         [](CMPIInstanceMI& mi, Request& request, const OperationRequest& asked, const CMPIObjectPath* path) {
@@ -195,13 +259,13 @@ cim::Answer Broker::enumerateInstances(const cim::ObjectPath& classPath, const c
 cim::Answer Broker::getInstance(const cim::ObjectPath& path, const cim::PropertyList& properties)
 {
     cim::Answer answer =
-        askInstanceProvider(implementation_->core, implementation_->router, "getInstance",
-                            {Operation::getInstance, path, {}, properties},
-                            [](CMPIInstanceMI& mi, Request& request, const OperationRequest& asked,
-                               const CMPIObjectPath* instPath) {
-                                return mi.ft->getInstance(&mi, request.context(), request.result(), instPath,
-                                                          NameArray(asked.properties).get());
-                            });
+        askInstanceProviders(implementation_->core, implementation_->router, "getInstance",
+                             {Operation::getInstance, path, {}, properties},
+                             [](CMPIInstanceMI& mi, Request& request, const OperationRequest& asked,
+                                const CMPIObjectPath* instPath) {
+                                 return mi.ft->getInstance(&mi, request.context(), request.result(), instPath,
+                                                           NameArray(asked.properties).get());
+                             });
     if (answer.status.code == CMPI_RC_OK && answer.instances.empty())
         answer.status.code = CMPI_RC_ERR_NOT_FOUND;
     return answer;
@@ -209,31 +273,31 @@ cim::Answer Broker::getInstance(const cim::ObjectPath& path, const cim::Property
 
 cim::Answer Broker::createInstance(const cim::ObjectPath& classPath, const cim::Instance& instance)
 {
-    return askInstanceProvider(implementation_->core, implementation_->router, "createInstance",
-                               {Operation::createInstance, classPath},
-                               [&](CMPIInstanceMI& mi, Request& request, const OperationRequest& /*asked*/,
-                                   const CMPIObjectPath* path) {
-                                   return mi.ft->createInstance(&mi, request.context(), request.result(),
-                                                                path, request.instance(instance));
-                               });
+    return askInstanceProviders(implementation_->core, implementation_->router, "createInstance",
+                                {Operation::createInstance, classPath},
+                                [&](CMPIInstanceMI& mi, Request& request, const OperationRequest& /*asked*/,
+                                    const CMPIObjectPath* path) {
+                                    return mi.ft->createInstance(&mi, request.context(), request.result(),
+                                                                 path, request.instance(instance));
+                                });
 }
 
 cim::Answer Broker::modifyInstance(const cim::ObjectPath& path, const cim::Instance& instance,
                                    const cim::PropertyList& properties)
 {
-    return askInstanceProvider(implementation_->core, implementation_->router, "modifyInstance",
-                               {Operation::modifyInstance, path, {}, properties},
-                               [&](CMPIInstanceMI& mi, Request& request, const OperationRequest& asked,
-                                   const CMPIObjectPath* instPath) {
-                                   return mi.ft->modifyInstance(&mi, request.context(), request.result(),
-                                                                instPath, request.instance(instance),
-                                                                NameArray(asked.properties).get());
-                               });
+    return askInstanceProviders(implementation_->core, implementation_->router, "modifyInstance",
+                                {Operation::modifyInstance, path, {}, properties},
+                                [&](CMPIInstanceMI& mi, Request& request, const OperationRequest& asked,
+                                    const CMPIObjectPath* instPath) {
+                                    return mi.ft->modifyInstance(&mi, request.context(), request.result(),
+                                                                 instPath, request.instance(instance),
+                                                                 NameArray(asked.properties).get());
+                                });
 }
 
 cim::Answer Broker::deleteInstance(const cim::ObjectPath& path)
 {
-    return askInstanceProvider(
+    return askInstanceProviders(
         implementation_->core, implementation_->router, "deleteInstance", {Operation::deleteInstance, path},
         [](CMPIInstanceMI& mi, Request& request, const OperationRequest& /*asked*/,
            const CMPIObjectPath* instPath) {
@@ -244,34 +308,34 @@ cim::Answer Broker::deleteInstance(const cim::ObjectPath& path)
 cim::Answer Broker::execQuery(const cim::ObjectPath& classPath, const std::string& query,
                               const std::string& language)
 {
-    return askInstanceProvider(implementation_->core, implementation_->router, "execQuery",
-                               {Operation::execQuery, classPath},
-                               [&](CMPIInstanceMI& mi, Request& request, const OperationRequest& /*asked*/,
-                                   const CMPIObjectPath* path) {
-                                   return mi.ft->execQuery(&mi, request.context(), request.result(), path,
-                                                           query.c_str(), language.c_str());
-                               });
+    return askInstanceProviders(implementation_->core, implementation_->router, "execQuery",
+                                {Operation::execQuery, classPath},
+                                [&](CMPIInstanceMI& mi, Request& request, const OperationRequest& /*asked*/,
+                                    const CMPIObjectPath* path) {
+                                    return mi.ft->execQuery(&mi, request.context(), request.result(), path,
+                                                            query.c_str(), language.c_str());
+                                });
 }
 
 cim::Answer Broker::associators(const cim::ObjectPath& path, const Traversal& traversal,
                                 const cim::PropertyList& properties)
 {
-    return askAssociationProviders(
-        implementation_->core, implementation_->router, "associators",
-        {Operation::associators, path, traversal, properties}, traversal.assocClass,
-        [](CMPIAssociationMI& mi, Request& request, const OperationRequest& asked,
-           const CMPIObjectPath* from) {
-            const Traversal& by = asked.traversal;
-            return mi.ft->associators(&mi, request.context(), request.result(), from, textOf(by.assocClass),
-                                      textOf(by.resultClass), textOf(by.role), textOf(by.resultRole),
-                                      NameArray(asked.properties).get());
-        });
+    return askAssociationProviders(implementation_->core, implementation_->router, "associators",
+                                   {Operation::associators, path, traversal, properties},
+                                   [](CMPIAssociationMI& mi, Request& request, const OperationRequest& asked,
+                                      const CMPIObjectPath* from) {
+                                       const Traversal& by = asked.traversal;
+                                       return mi.ft->associators(
+                                           &mi, request.context(), request.result(), from,
+                                           textOf(by.assocClass), textOf(by.resultClass), textOf(by.role),
+                                           textOf(by.resultRole), NameArray(asked.properties).get());
+                                   });
 }
 
 cim::Answer Broker::associatorNames(const cim::ObjectPath& path, const Traversal& traversal)
 {
     return askAssociationProviders(implementation_->core, implementation_->router, "associatorNames",
-                                   {Operation::associatorNames, path, traversal}, traversal.assocClass,
+                                   {Operation::associatorNames, path, traversal},
                                    [](CMPIAssociationMI& mi, Request& request, const OperationRequest& asked,
                                       const CMPIObjectPath* from) {
                                        const Traversal& by = asked.traversal;
@@ -285,21 +349,21 @@ cim::Answer Broker::associatorNames(const cim::ObjectPath& path, const Traversal
 cim::Answer Broker::references(const cim::ObjectPath& path, const Traversal& traversal,
                                const cim::PropertyList& properties)
 {
-    return askAssociationProviders(
-        implementation_->core, implementation_->router, "references",
-        {Operation::references, path, traversal, properties}, traversal.resultClass,
-        [](CMPIAssociationMI& mi, Request& request, const OperationRequest& asked,
-           const CMPIObjectPath* from) {
-            const Traversal& by = asked.traversal;
-            return mi.ft->references(&mi, request.context(), request.result(), from, textOf(by.resultClass),
-                                     textOf(by.role), NameArray(asked.properties).get());
-        });
+    return askAssociationProviders(implementation_->core, implementation_->router, "references",
+                                   {Operation::references, path, traversal, properties},
+                                   [](CMPIAssociationMI& mi, Request& request, const OperationRequest& asked,
+                                      const CMPIObjectPath* from) {
+                                       const Traversal& by = asked.traversal;
+                                       return mi.ft->references(&mi, request.context(), request.result(),
+                                                                from, textOf(by.resultClass), textOf(by.role),
+                                                                NameArray(asked.properties).get());
+                                   });
 }
 
 cim::Answer Broker::referenceNames(const cim::ObjectPath& path, const Traversal& traversal)
 {
     return askAssociationProviders(implementation_->core, implementation_->router, "referenceNames",
-                                   {Operation::referenceNames, path, traversal}, traversal.resultClass,
+                                   {Operation::referenceNames, path, traversal},
                                    [](CMPIAssociationMI& mi, Request& request, const OperationRequest& asked,
                                       const CMPIObjectPath* from) {
                                        const Traversal& by = asked.traversal;
@@ -312,6 +376,11 @@ cim::Answer Broker::referenceNames(const cim::ObjectPath& path, const Traversal&
 const Registration& Broker::registration() const
 {
     return implementation_->router.registration();
+}
+
+const schema::Classes& Broker::classes() const
+{
+    return implementation_->core.classes;
 }
 
 const CMPIBroker* Broker::cmpiBroker() const

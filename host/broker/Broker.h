@@ -8,6 +8,7 @@
 #include "broker/FunctionTables.h"
 #include "broker/Registration.h"
 #include "cim/Model.h"
+#include "schema/Classes.h"
 
 #include <functional>
 #include <memory>
@@ -60,8 +61,9 @@ bool operator==(const Traversal& a, const Traversal& b);
 struct Habits;
 
 /// The broker. Requests may come from several threads at once. Each request is answered by the
-/// provider registered for the class (letter case ignored) and namespace of its path; a class that
-/// nobody serves is answered with CMPI_RC_ERR_INVALID_CLASS, a namespace that no registration names
+/// provider registered for the class (letter case ignored) and namespace of its path, an enumeration by
+/// those of the classes that derive from it too, each asked for its own class; a class that is not known
+/// and nobody serves is answered with CMPI_RC_ERR_INVALID_CLASS, a namespace that no registration names
 /// with CMPI_RC_ERR_INVALID_NAMESPACE, a provider that could not be loaded with CMPI_RC_ERR_FAILED
 /// and the reason. Providers are loaded on first use and cleaned up and unloaded with the broker.
 class Broker
@@ -70,8 +72,9 @@ public:
     /// \param registration  what serves which class
     /// \param providerDirectories  searched in order for libLOCATION.so
     /// \param habits  of a real broker, which this one takes on (Habits.h); they must outlive it. Null: none
+    /// \param classes  what derives from what, and what the keys are, as far as it is known
     Broker(Registration registration, std::vector<std::string> providerDirectories, Listeners listeners = {},
-           const Habits* habits = nullptr);
+           const Habits* habits = nullptr, schema::Classes classes = {});
     ~Broker();
     Broker(const Broker&) = delete;
     Broker& operator=(const Broker&) = delete;
@@ -90,7 +93,9 @@ public:
 
     /// The traversals ask the provider of `assocClass` (of `resultClass` for the references); without
     /// one, every association provider registered for the namespace, each with a null class, and join
-    /// the answers; the first error among them becomes the status.
+    /// the answers; the first error among them becomes the status. A superclass stands for the registered
+    /// classes that derive from it: without habits, each provider is asked for its own association class, and
+    /// for results of any class, of which those of the superclass and of unknown classes are taken.
     cim::Answer associators(const cim::ObjectPath& path, const Traversal& traversal,
                             const cim::PropertyList& properties = {});
     cim::Answer associatorNames(const cim::ObjectPath& path, const Traversal& traversal);
@@ -99,6 +104,7 @@ public:
     cim::Answer referenceNames(const cim::ObjectPath& path, const Traversal& traversal);
 
     [[nodiscard]] const Registration& registration() const;
+    [[nodiscard]] const schema::Classes& classes() const;
 
     /// The broker as a provider sees it, for driving a provider's function tables by hand.
     [[nodiscard]] const CMPIBroker* cmpiBroker() const;

@@ -17,8 +17,8 @@ class Broker::Implementation
 {
 public:
     Implementation(Broker& broker, Registration registration, std::vector<std::string> directories,
-                   Listeners listeners, const Habits* habits)
-        : core(broker, std::move(listeners), habits),
+                   Listeners listeners, const Habits* habits, schema::Classes classes)
+        : core(broker, std::move(listeners), habits, std::move(classes)),
           router(core, std::move(registration), std::move(directories))
     {}
 

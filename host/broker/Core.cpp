@@ -48,11 +48,13 @@ private:
 
 } // namespace
 
-Core::Core(Broker& owner, Listeners toldListeners, const Habits* habitsOfThisOne)
+Core::Core(Broker& owner, Listeners toldListeners, const Habits* habitsOfThisOne,
+           schema::Classes classesKnown)
     : broker(owner),
       tables(servedTables()),
       cmpi{this, &tables.broker, &tables.enc, &tables.ext, &tables.mem},
       habits(habitsOfThisOne),
+      classes(std::move(classesKnown)),
       lasting(std::make_unique<ObjectStore>(*this)),
       listeners_(std::move(toldListeners))
 {

@@ -5,6 +5,7 @@
 
 #include "broker/Broker.h"
 #include "broker/FunctionTables.h"
+#include "schema/Classes.h"
 
 #include <memory>
 #include <mutex>
@@ -16,7 +17,7 @@ class ObjectStore;
 
 struct Core
 {
-    Core(Broker& owner, Listeners toldListeners, const Habits* habitsOfThisOne);
+    Core(Broker& owner, Listeners toldListeners, const Habits* habitsOfThisOne, schema::Classes classesKnown);
     ~Core();
     Core(const Core&) = delete;
     Core& operator=(const Core&) = delete;
@@ -30,6 +31,7 @@ struct Core
     FunctionTables tables;
     CMPIBroker cmpi;      ///< its handle is this Core
     const Habits* habits; ///< null: those of this broker alone
+    const schema::Classes classes;
     /// Objects made outside of any request, and clones: they live until released or until the broker
     /// goes. Guarded by `lastingMutex`.
     std::unique_ptr<ObjectStore> lasting;

@@ -12,8 +12,11 @@ namespace {
 CMPIInstance* newInstance(const CMPIBroker* broker, const CMPIObjectPath* path, CMPIStatus* rc)
 {
     return serve("CMPIBrokerEncFT.newInstance", rc, static_cast<CMPIInstance*>(nullptr), [&](Call& call) {
-        call.broker(broker);
-        return call.make<InstanceObject>(call.use<ObjectPathObject>(path, "the object path").path.read());
+        const Core& core = call.broker(broker);
+        InstanceObject instance(call.use<ObjectPathObject>(path, "the object path").path.read());
+        const std::vector<std::string>& keys = core.classes.keysOf(instance.content.read().path.className);
+        instance.classKeys = keys.empty() ? nullptr : &keys;
+        return call.make<InstanceObject>(std::move(instance));
     });
 }
 
@@ -104,16 +107,15 @@ CMPISelectExp* newSelectExp(const CMPIBroker* broker, const char* /*query*/, con
                  });
 }
 
-/// True for the path's own class only: without a class repository there are no superclasses.
 CMPIBoolean classPathIsA(const CMPIBroker* broker, const CMPIObjectPath* path, const char* className,
                          CMPIStatus* rc)
 {
     return serve("CMPIBrokerEncFT.classPathIsA", rc, CMPIBoolean{0}, [&](Call& call) {
         call.broker(broker);
         const auto& content = call.use<ObjectPathObject>(path, "the object path");
-        const bool same =
-            cim::sameName(content.path.read().className, call.text(className, "the class name"));
-        return static_cast<CMPIBoolean>(same ? 1 : 0);
+        const std::string& own = content.path.read().className;
+        const bool is = call.core().classes.isA(own, call.text(className, "the class name"));
+        return static_cast<CMPIBoolean>(is ? 1 : 0);
     });
 }
 

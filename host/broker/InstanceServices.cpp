@@ -117,7 +117,7 @@ CMPIStatus setObjectPath(const CMPIInstance* instance, const CMPIObjectPath* pat
     });
 }
 
-/// An origin says which class defines a property; it is of no use without a class repository.
+/// An origin says which class defines a property, which the declarations of classes do here.
 CMPIStatus setPropertyWithOrigin(const CMPIInstance* instance, const char* name, const CMPIValue* value,
                                  const CMPIType type, const char* /*origin*/)
 {

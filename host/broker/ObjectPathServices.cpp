@@ -129,7 +129,7 @@ CMPIStatus setHostAndNameSpaceFromObjectPath(const CMPIObjectPath* path, const C
     });
 }
 
-// There is no class repository, and so there are no qualifiers.
+// Qualifiers are known to clients only.
 
 CMPIData noQualifier(const char* service, const CMPIObjectPath* path, CMPIStatus* rc)
 {

@@ -21,17 +21,21 @@ std::vector<cim::Key> missingKeys(const InstanceObject& instance)
     const cim::Instance& content = instance.content.read();
     std::vector<cim::Key> missing;
     const auto add = [&](const cim::Property& property) {
-        if (findNamed(content.path.keys, property.name) == nullptr &&
+        if (!property.value.isNull && findNamed(content.path.keys, property.name) == nullptr &&
             findNamed(missing, property.name) == nullptr)
             missing.push_back({property.name, property.value});
     };
+    const auto addNamed = [&](const std::vector<std::string>& names) {
+        for (const std::string& name : names)
+            for (const auto* const properties : {&content.properties, &instance.hiddenReferences})
+                if (const cim::Property* const property = findNamed(*properties, name))
+                    add(*property);
+    };
 
-    for (const std::string& name : instance.keyNames) {
-        const cim::Property* const property = findNamed(content.properties, name);
-        if (property != nullptr && !property->value.isNull)
-            add(*property);
-    }
-    if (!content.path.keys.empty())
+    addNamed(instance.keyNames);
+    if (instance.classKeys != nullptr)
+        addNamed(*instance.classKeys);
+    if (instance.classKeys != nullptr || !content.path.keys.empty())
         return missing;
     for (const auto* const properties : {&content.properties, &instance.hiddenReferences})
         for (const cim::Property& property : *properties)

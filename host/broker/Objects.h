@@ -33,14 +33,16 @@ struct InstanceObject
     CopyOnWrite<cim::Instance> content;
     std::optional<std::vector<std::string>> wanted; ///< the property filter; nothing: every property
     std::vector<std::string> keyNames;              ///< the filter's key list
+    /// Those that the class declares, kept by the broker's classes; null: it is not known, or has none.
+    const std::vector<std::string>* classKeys = nullptr;
     /// References that the filter keeps out of the properties; they still identify the instance.
     std::vector<cim::Property> hiddenReferences;
 };
 
-/// The path of an instance with all its keys. There is no class repository to tell which properties
-/// are keys, so: a key that the path lacks is taken from the property of that name if the filter's
-/// key list names it; and an instance made on a path without any key takes every reference as a key,
-/// since the references of an association are its keys.
+/// The path of an instance with all its keys. A key that the path lacks is taken from the property of that
+/// name if the class declares it as a key or the filter's key list names it. Where the class is not known,
+/// an instance made on a path without any key takes every reference as a key, since the references of an
+/// association are its keys.
 cim::ObjectPath completedPath(const InstanceObject& instance);
 
 /// The instance with its path completed; shared with the object when there was nothing to add.

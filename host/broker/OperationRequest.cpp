@@ -15,6 +15,11 @@ bool answersPaths(Operation operation)
     }
 }
 
+bool isEnumeration(Operation operation)
+{
+    return operation == Operation::enumerateInstanceNames || operation == Operation::enumerateInstances;
+}
+
 bool isReferenceTraversal(Operation operation)
 {
     return operation == Operation::references || operation == Operation::referenceNames;

@@ -42,6 +42,9 @@ struct OperationRequest
 /// Whether the answer consists of paths; otherwise it consists of instances, or of nothing at all.
 bool answersPaths(Operation operation);
 
+/// The two that ask for all of a class.
+bool isEnumeration(Operation operation);
+
 /// The four traversals, and of them the two that answer associations.
 bool isTraversal(Operation operation);
 bool isReferenceTraversal(Operation operation);

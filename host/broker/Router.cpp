@@ -20,13 +20,23 @@ Router::Router(Core& core, Registration registration, std::vector<std::string> d
 
 const RegisteredClass& Router::instanceClass(const std::string& className, const std::string& nameSpace) const
 {
-    return find(className, nameSpace, &RegisteredClass::instance, "instance");
+    requireNameSpace(nameSpace);
+    for (const RegisteredClass& entry : registration_.classes)
+        if (entry.instance && cim::sameName(entry.className, className) && isRegisteredIn(entry, nameSpace))
+            return entry;
+    fail(className, nameSpace, "instance");
 }
 
-const RegisteredClass& Router::associationClass(const std::string& className,
-                                                const std::string& nameSpace) const
+std::vector<const RegisteredClass*> Router::instanceClasses(const std::string& className,
+                                                            const std::string& nameSpace) const
 {
-    return find(className, nameSpace, &RegisteredClass::association, "association");
+    return findAll(className, nameSpace, &RegisteredClass::instance, "instance");
+}
+
+std::vector<const RegisteredClass*> Router::associationClasses(const std::string& className,
+                                                               const std::string& nameSpace) const
+{
+    return findAll(className, nameSpace, &RegisteredClass::association, "association");
 }
 
 std::vector<const RegisteredClass*> Router::associationClasses(const std::string& nameSpace) const
@@ -45,25 +55,44 @@ void Router::cleanUp()
         provider->cleanUp();
 }
 
-const RegisteredClass& Router::find(const std::string& className, const std::string& nameSpace,
-                                    bool RegisteredClass::*serves, const char* type) const
+std::vector<const RegisteredClass*> Router::findAll(const std::string& className,
+                                                    const std::string& nameSpace,
+                                                    bool RegisteredClass::*serves, const char* type) const
 {
     requireNameSpace(nameSpace);
-    bool known = false;
-    std::vector<std::string> names;
-    for (const RegisteredClass& entry : registration_.classes) {
-        if (!isRegisteredIn(entry, nameSpace))
-            continue;
-        names.push_back(entry.className);
-        if (!cim::sameName(entry.className, className))
-            continue;
-        if (entry.*serves)
-            return entry;
-        known = true;
-    }
-    if (known)
+    std::vector<const RegisteredClass*> found;
+    const auto isFound = [&](const RegisteredClass& entry) {
+        return std::any_of(found.begin(), found.end(), [&](const RegisteredClass* other) {
+            return cim::sameName(other->className, entry.className);
+        });
+    };
+    for (const RegisteredClass& entry : registration_.classes)
+        if (entry.*serves && isRegisteredIn(entry, nameSpace) && !isFound(entry) &&
+            surroundings_.core.classes.isA(entry.className, className))
+            found.push_back(&entry);
+    if (found.empty() &&
+        (isRegistered(className, nameSpace) || surroundings_.core.classes.find(className) == nullptr))
+        fail(className, nameSpace, type);
+    return found;
+}
+
+bool Router::isRegistered(const std::string& className, const std::string& nameSpace) const
+{
+    return std::any_of(
+        registration_.classes.begin(), registration_.classes.end(), [&](const RegisteredClass& entry) {
+            return cim::sameName(entry.className, className) && isRegisteredIn(entry, nameSpace);
+        });
+}
+
+void Router::fail(const std::string& className, const std::string& nameSpace, const char* type) const
+{
+    if (isRegistered(className, nameSpace) || surroundings_.core.classes.find(className) != nullptr)
         throw RoutingError(CMPI_RC_ERR_NOT_SUPPORTED,
                            "no " + std::string(type) + " provider is registered for the class " + className);
+    std::vector<std::string> names;
+    for (const RegisteredClass& entry : registration_.classes)
+        if (isRegisteredIn(entry, nameSpace))
+            names.push_back(entry.className);
     throw RoutingError(CMPI_RC_ERR_INVALID_CLASS, "no provider is registered for the class " + className +
                                                       " in " + nameSpace + cim::didYouMean(className, names));
 }

@@ -36,16 +36,21 @@ public:
 
     [[nodiscard]] const Registration& registration() const { return registration_; }
 
-    /// What serves the instances of a class in a namespace.
-    /// \throws RoutingError
+    /// Whether anything serves exactly that class in a namespace.
+    [[nodiscard]] bool isRegistered(const std::string& className, const std::string& nameSpace) const;
+
+    /// What serves the instances of a class in a namespace. \throws RoutingError
     [[nodiscard]] const RegisteredClass& instanceClass(const std::string& className,
                                                        const std::string& nameSpace) const;
-    /// What serves the traversals of an association class in a namespace.
+    /// The same with the classes that derive from it; none: the class is known, and nobody serves it.
     /// \throws RoutingError
-    [[nodiscard]] const RegisteredClass& associationClass(const std::string& className,
-                                                          const std::string& nameSpace) const;
-    /// All that serves traversals in a namespace.
-    /// \throws RoutingError
+    [[nodiscard]] std::vector<const RegisteredClass*> instanceClasses(const std::string& className,
+                                                                      const std::string& nameSpace) const;
+    /// What serves the traversals of an association class, and of those that derive from it, in a namespace;
+    /// none as above. \throws RoutingError
+    [[nodiscard]] std::vector<const RegisteredClass*> associationClasses(const std::string& className,
+                                                                         const std::string& nameSpace) const;
+    /// All that serves traversals in a namespace. \throws RoutingError
     [[nodiscard]] std::vector<const RegisteredClass*> associationClasses(const std::string& nameSpace) const;
 
     /// Who serves one of these.
@@ -55,8 +60,12 @@ public:
     void cleanUp();
 
 private:
-    const RegisteredClass& find(const std::string& className, const std::string& nameSpace,
-                                bool RegisteredClass::*serves, const char* type) const;
+    [[nodiscard]] std::vector<const RegisteredClass*> findAll(const std::string& className,
+                                                              const std::string& nameSpace,
+                                                              bool RegisteredClass::*serves,
+                                                              const char* type) const;
+    [[noreturn]] void fail(const std::string& className, const std::string& nameSpace,
+                           const char* type) const;
     void requireNameSpace(const std::string& nameSpace) const;
 
     Registration registration_;

@@ -79,15 +79,6 @@ bool sameKeyScalar(const Value::Scalar& a, const Value::Scalar& b)
     return equalScalars(a, b);
 }
 
-std::string lowerCase(std::string text)
-{
-    const auto lower = [](char byte) {
-        return byte >= 'A' && byte <= 'Z' ? static_cast<char>(byte - 'A' + 'a') : byte;
-    };
-    std::transform(text.begin(), text.end(), text.begin(), lower);
-    return text;
-}
-
 std::string lookupText(const Value& value)
 {
     if (value.items.size() != 1)
@@ -210,6 +201,15 @@ bool operator!=(const ObjectPath& a, const ObjectPath& b)
 bool operator!=(const Instance& a, const Instance& b)
 {
     return !(a == b);
+}
+
+std::string lowerCase(std::string text)
+{
+    const auto lower = [](char byte) {
+        return byte >= 'A' && byte <= 'Z' ? static_cast<char>(byte - 'A' + 'a') : byte;
+    };
+    std::transform(text.begin(), text.end(), text.begin(), lower);
+    return text;
 }
 
 bool sameName(std::string_view a, std::string_view b)

@@ -36,6 +36,9 @@ bool operator!=(const Instance& a, const Instance& b);
 /// CIM names (of classes, keys, properties, namespaces) are the same whatever their letter case.
 bool sameName(std::string_view a, std::string_view b);
 
+/// With capital letters of ASCII, the only ones that names have, as small ones.
+std::string lowerCase(std::string text);
+
 /// Equal as a key is: integers by their number, whatever their width; a datetime as its text;
 /// references as sameObject(); everything else exactly.
 bool sameKeyValue(const Value& a, const Value& b);

@@ -38,6 +38,7 @@ Examples:
 Environment:
   CIMHOST_PROVIDER_DIR   directories of provider libraries, separated by colons
   CIMHOST_REGISTRATION   registration files, separated by colons
+  CIMHOST_SCHEMA         files of class declarations, separated by colons
 
 Exit status: 0 answered; 1 answered with an error status, or the answer could not be written;
 2 wrong usage.)";
@@ -214,6 +215,10 @@ void addCommonOptions(CLI::App& app, Arguments& arguments)
         ->check(named("directory"))
         ->allow_extra_args(false);
     app.add_option("--registration", settings.registrationFiles, "Registration of providers; repeatable")
+        ->type_name("FILE")
+        ->check(named("file"))
+        ->allow_extra_args(false);
+    app.add_option("--schema", settings.schemaFiles, "Declarations of classes, in MOF; repeatable")
         ->type_name("FILE")
         ->check(named("file"))
         ->allow_extra_args(false);

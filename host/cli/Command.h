@@ -70,6 +70,7 @@ struct Settings
 {
     std::vector<std::string> providerDirectories; ///< none: the default ones
     std::vector<std::string> registrationFiles;   ///< none: the default ones
+    std::vector<std::string> schemaFiles;         ///< none: the default ones
     std::optional<std::string> inventory;         ///< file for the providers; nothing: theirs
     bool trace = false;
     std::optional<std::string> like; ///< the broker whose habits to have; nothing: none

@@ -3,6 +3,7 @@
 #include "cim/Utf8.h"
 #include "cim/Values.h"
 #include "cli/Arguments.h"
+#include "schema/MofReader.h"
 
 #include <algorithm>
 #include <cstdlib>
@@ -45,12 +46,13 @@ std::optional<fs::path> findDirectory(const fs::path& programDirectory,
     return std::nullopt;
 }
 
-std::vector<std::string> registrationFilesIn(const fs::path& directory)
+/// By name.
+std::vector<std::string> filesIn(const fs::path& directory, const char* extension)
 {
     std::vector<std::string> files;
     std::error_code error;
     for (fs::directory_iterator entry(directory, error), end; !error && entry != end; entry.increment(error))
-        if (entry->path().extension() == ".reg")
+        if (entry->path().extension() == extension)
             files.push_back(entry->path().string());
     std::sort(files.begin(), files.end());
     return files;
@@ -77,7 +79,8 @@ Surroundings readSurroundings()
 {
     std::error_code ignored;
     return {fs::read_symlink("/proc/self/exe", ignored).parent_path(),
-            environmentVariable("CIMHOST_PROVIDER_DIR"), environmentVariable("CIMHOST_REGISTRATION")};
+            environmentVariable("CIMHOST_PROVIDER_DIR"), environmentVariable("CIMHOST_REGISTRATION"),
+            environmentVariable("CIMHOST_SCHEMA")};
 }
 
 std::vector<std::string> findProviderDirectories(const Settings& settings, const Surroundings& surroundings)
@@ -103,7 +106,7 @@ std::vector<std::string> findRegistrationFiles(const Settings& settings, const S
     if (surroundings.registrationFiles)
         return splitAtColons(*surroundings.registrationFiles);
     const std::optional<fs::path> directory = findSchemaDirectory(surroundings);
-    std::vector<std::string> files = directory ? registrationFilesIn(*directory) : std::vector<std::string>{};
+    std::vector<std::string> files = directory ? filesIn(*directory, ".reg") : std::vector<std::string>{};
     if (files.empty())
         throw UsageError("no registration of providers is installed beside the program; name a file with "
                          "--registration or CIMHOST_REGISTRATION");
@@ -120,6 +123,30 @@ Registration readRegistrations(const std::vector<std::string>& files)
         append(added, file, all);
     }
     return all;
+}
+
+std::vector<std::string> findSchemaFiles(const Settings& settings, const Surroundings& surroundings)
+{
+    if (!settings.schemaFiles.empty())
+        return settings.schemaFiles;
+    if (surroundings.schemaFiles)
+        return splitAtColons(*surroundings.schemaFiles);
+    const std::optional<fs::path> directory = findSchemaDirectory(surroundings);
+    if (!directory)
+        return {};
+    std::vector<std::string> files = filesIn(*directory, ".mof");
+    for (std::string& file : filesIn(*directory / "cimhost", ".mof"))
+        files.push_back(std::move(file));
+    return files;
+}
+
+schema::Classes readClasses(const std::vector<std::string>& files)
+{
+    std::vector<schema::Class> all;
+    for (const std::string& file : files)
+        for (schema::Class& declaration : schema::readMofFile(file).classes)
+            all.push_back(std::move(declaration));
+    return schema::Classes(std::move(all));
 }
 
 } // namespace cimhost::cli

@@ -5,6 +5,7 @@
 
 #include "broker/Registration.h"
 #include "cli/Command.h"
+#include "schema/Classes.h"
 
 #include <filesystem>
 #include <optional>
@@ -19,6 +20,7 @@ struct Surroundings
     std::filesystem::path programDirectory;       ///< the folder of the executable
     std::optional<std::string> providerDirs;      ///< CIMHOST_PROVIDER_DIR
     std::optional<std::string> registrationFiles; ///< CIMHOST_REGISTRATION
+    std::optional<std::string> schemaFiles{};     ///< CIMHOST_SCHEMA
 };
 
 /// Those of this process.
@@ -42,6 +44,15 @@ std::vector<std::string> findRegistrationFiles(const Settings& settings, const S
 /// \throws RegistrationError  also for a file without any class, and for a class that two files register
 /// with the same provider
 Registration readRegistrations(const std::vector<std::string>& files);
+
+/// The files of the command line; without any, those of the environment; without these, every .mof file, by
+/// name, in the schema directory and in its folder `cimhost`, where the classes are that a broker brings
+/// itself. None, if there is none of these.
+std::vector<std::string> findSchemaFiles(const Settings& settings, const Surroundings& surroundings);
+
+/// The classes of all files.
+/// \throws schema::MofError  also for a class that two files declare
+schema::Classes readClasses(const std::vector<std::string>& files);
 
 } // namespace cimhost::cli
 

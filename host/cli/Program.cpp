@@ -6,6 +6,7 @@
 #include "cli/Defaults.h"
 #include "cli/Execute.h"
 #include "cli/Reports.h"
+#include "schema/MofReader.h"
 
 #include <exception>
 #include <ostream>
@@ -27,7 +28,8 @@ Ending follow(const Invocation& invocation, const Surroundings& surroundings,
     if (settings.inventory)
         useInventory(*settings.inventory, defaults);
     Broker broker(std::move(registration), findProviderDirectories(settings, surroundings),
-                  reportTo(err, settings.trace), settings.like ? findHabits(*settings.like) : nullptr);
+                  reportTo(err, settings.trace), settings.like ? findHabits(*settings.like) : nullptr,
+                  readClasses(findSchemaFiles(settings, surroundings)));
     return {execute(command, broker, columns, out, err), std::holds_alternative<DrawGraph>(command)};
 }
 
@@ -51,6 +53,8 @@ Ending run(const std::vector<std::string>& arguments, const Surroundings& surrou
     } catch (const UsageError& error) {
         return fail(error, exitUsage, err);
     } catch (const RegistrationError& error) {
+        return fail(error, exitUsage, err);
+    } catch (const schema::MofError& error) {
         return fail(error, exitUsage, err);
     } catch (const std::exception& error) {
         return fail(error, exitError, err);

@@ -244,8 +244,8 @@ HttpResponse CimBinding::respond(const HttpRequest& request) const
     checkAccept(request);
     const RequestMessage message = readRequest(request.body, limits_.xml);
     checkMatch(request, prefix, message);
-    const cim::Answer answer = execute(message, broker_);
-    return {200, responseHeaders(prefix), writeResponse(message, answer, hostName_)};
+    const Reply reply = execute(message, broker_, *enumerations_);
+    return {200, responseHeaders(prefix), writeResponse(message, reply, hostName_, broker_.classes())};
 }
 
 } // namespace cimhost::serve

@@ -4,10 +4,12 @@
 #define CIMHOST_SERVE_CIMBINDING_H
 
 #include "broker/Broker.h"
+#include "serve/Enumerations.h"
 #include "serve/Http.h"
 #include "serve/Xml.h"
 
 #include <cstddef>
+#include <memory>
 #include <optional>
 #include <string>
 
@@ -47,6 +49,7 @@ private:
     Broker& broker_;
     std::string hostName_;
     RequestLimits limits_;
+    std::unique_ptr<Enumerations> enumerations_ = std::make_unique<Enumerations>();
 };
 
 } // namespace cimhost::serve

@@ -1,12 +1,82 @@
 #include "serve/Executor.h"
 
+#include "serve/ClassRequests.h"
+#include "serve/ValueReader.h"
+
+#include <algorithm>
+
 namespace cimhost::serve {
 
-cim::Answer execute(const RequestMessage& message, Broker& broker)
+namespace {
+
+/// Takes away what a class deriving from the one asked for adds.
+void dropAddedProperties(cim::Answer& answer, const std::string& className, const schema::Classes& classes)
+{
+    if (classes.find(className) == nullptr)
+        return;
+    for (cim::Instance& instance : answer.instances)
+        instance.properties.erase(
+            std::remove_if(instance.properties.begin(), instance.properties.end(),
+                           [&](const cim::Property& property) {
+                               return classes.originOf(className, property.name).empty();
+                           }),
+            instance.properties.end());
+}
+
+cim::Answer ask(const Question& question, Broker& broker)
+{
+    OperationRequest request = question.request;
+    typeKeys(request.target, broker.classes());
+    if (request.operation == Operation::modifyInstance)
+        request.instance.path = request.target;
+    cim::Answer answer = perform(request, broker);
+    if (request.operation == Operation::enumerateInstances && !question.deepInheritance.value_or(true))
+        dropAddedProperties(answer, request.target.className, broker.classes());
+    return answer;
+}
+
+Reply open(const Question& question, Broker& broker, Enumerations& enumerations)
+{
+    enumerations.checkOpening(question);
+    cim::Answer answer = ask(question, broker);
+    if (answer.status.code != CMPI_RC_OK)
+        return {std::move(answer)};
+    return enumerations.open(question, std::move(answer));
+}
+
+Reply carryOut(const Question& question, Broker& broker, Enumerations& enumerations)
+{
+    switch (question.step) {
+    case Step::ask:
+        return {ask(question, broker)};
+    case Step::open:
+        return open(question, broker, enumerations);
+    case Step::pull:
+        return enumerations.pull(question);
+    case Step::close:
+        enumerations.close(question);
+        return {};
+    case Step::count: {
+        Reply reply;
+        reply.count = enumerations.count(question);
+        return reply;
+    }
+    default:
+        return findClasses(question, broker);
+    }
+}
+
+} // namespace
+
+Reply execute(const RequestMessage& message, Broker& broker, Enumerations& enumerations)
 {
     if (const auto* status = std::get_if<cim::Status>(&message.content))
-        return {*status, {}, {}};
-    return perform(std::get<OperationRequest>(message.content), broker);
+        return {{*status, {}, {}}};
+    try {
+        return carryOut(std::get<Question>(message.content), broker, enumerations);
+    } catch (const ValueError& error) {
+        return {{{error.code(), error.what()}, {}, {}}};
+    }
 }
 
 } // namespace cimhost::serve

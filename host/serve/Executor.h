@@ -3,12 +3,13 @@
 #define CIMHOST_SERVE_EXECUTOR_H
 
 #include "broker/Broker.h"
+#include "serve/Enumerations.h"
 #include "serve/Message.h"
 
 namespace cimhost::serve {
 
 /// What the broker answers; what is wrong with the question is an answer too.
-cim::Answer execute(const RequestMessage& message, Broker& broker);
+Reply execute(const RequestMessage& message, Broker& broker, Enumerations& enumerations);
 
 } // namespace cimhost::serve
 

@@ -20,7 +20,7 @@ namespace {
 struct Parameter
 {
     const Element& value;
-    OperationRequest& request;
+    Question& question;
     const XmlLimits& limits;
 };
 
@@ -44,16 +44,16 @@ const std::string& readText(const Parameter& parameter)
 
 void takeClassName(const Parameter& parameter)
 {
-    parameter.request.target.className = readClassName(parameter);
+    parameter.question.request.target.className = readClassName(parameter);
 }
 
 void takeInstanceName(const Parameter& parameter)
 {
     require(parameter, "INSTANCENAME");
-    parameter.request.target = readInstanceName(parameter.value);
+    parameter.question.request.target = readInstanceName(parameter.value);
 }
 
-/// A traversal from a class leads to classes, which only a class repository knows.
+/// A traversal from a class leads to classes.
 void takeObjectName(const Parameter& parameter)
 {
     if (parameter.value.name == "CLASSNAME")
@@ -65,7 +65,7 @@ void takeObjectName(const Parameter& parameter)
 void takePropertyList(const Parameter& parameter)
 {
     require(parameter, "VALUE.ARRAY");
-    std::vector<std::string>& names = parameter.request.properties.emplace();
+    std::vector<std::string>& names = parameter.question.request.properties.emplace();
     for (const Element& name : childrenAmong(parameter.value, {"VALUE", "VALUE.NULL"})) {
         if (name.name == "VALUE.NULL")
             throw ValueError(name, "no name", "the name of a property");
@@ -73,56 +73,104 @@ void takePropertyList(const Parameter& parameter)
     }
 }
 
-/// Nothing here has qualifiers, class origins or inherited classes that could be left out.
-void takeFlag(const Parameter& parameter)
+bool readFlag(const Parameter& parameter)
 {
     require(parameter, "VALUE");
-    readBoolean(parameter.value);
+    return readBoolean(parameter.value);
+}
+
+void takeLocalOnly(const Parameter& parameter)
+{
+    parameter.question.localOnly = readFlag(parameter);
+}
+
+void takeDeepInheritance(const Parameter& parameter)
+{
+    parameter.question.deepInheritance = readFlag(parameter);
+}
+
+void takeIncludeQualifiers(const Parameter& parameter)
+{
+    parameter.question.includeQualifiers = readFlag(parameter);
+}
+
+void takeIncludeClassOrigin(const Parameter& parameter)
+{
+    parameter.question.includeClassOrigin = readFlag(parameter);
+}
+
+void takeContext(const Parameter& parameter)
+{
+    parameter.question.context = readText(parameter);
+}
+
+void takeMostItems(const Parameter& parameter)
+{
+    require(parameter, "VALUE");
+    parameter.question.mostItems = readUnsigned(parameter.value);
+}
+
+void takeTimeout(const Parameter& parameter)
+{
+    require(parameter, "VALUE");
+    parameter.question.timeout = readUnsigned(parameter.value);
+}
+
+void takeContinueOnError(const Parameter& parameter)
+{
+    if (readFlag(parameter))
+        throw ValueError(continuationOnErrorNotSupported,
+                         placeOf(parameter.value) + ": an enumeration ends with its first error");
+}
+
+void refuseFilter(const Parameter& parameter)
+{
+    throw ValueError(filteredEnumerationNotSupported, placeOf(parameter.value) + ": filters are not served");
 }
 
 void takeAssocClass(const Parameter& parameter)
 {
-    parameter.request.traversal.assocClass = readClassName(parameter);
+    parameter.question.request.traversal.assocClass = readClassName(parameter);
 }
 
 void takeResultClass(const Parameter& parameter)
 {
-    parameter.request.traversal.resultClass = readClassName(parameter);
+    parameter.question.request.traversal.resultClass = readClassName(parameter);
 }
 
 void takeRole(const Parameter& parameter)
 {
-    parameter.request.traversal.role = readText(parameter);
+    parameter.question.request.traversal.role = readText(parameter);
 }
 
 void takeResultRole(const Parameter& parameter)
 {
-    parameter.request.traversal.resultRole = readText(parameter);
+    parameter.question.request.traversal.resultRole = readText(parameter);
 }
 
 void takeNewInstance(const Parameter& parameter)
 {
     require(parameter, "INSTANCE");
-    parameter.request.instance = readInstance(parameter.value, parameter.limits);
-    parameter.request.target.className = parameter.request.instance.path.className;
+    parameter.question.request.instance = readInstance(parameter.value, parameter.limits);
+    parameter.question.request.target.className = parameter.question.request.instance.path.className;
 }
 
 void takeModifiedInstance(const Parameter& parameter)
 {
     require(parameter, "VALUE.NAMEDINSTANCE");
     const std::vector<Element>& parts = childrenInOrder(parameter.value, {"INSTANCENAME", "INSTANCE"});
-    parameter.request.target = readInstanceName(parts[0]);
-    parameter.request.instance = readInstance(parts[1], parameter.limits);
+    parameter.question.request.target = readInstanceName(parts[0]);
+    parameter.question.request.instance = readInstance(parts[1], parameter.limits);
 }
 
 void takeQueryLanguage(const Parameter& parameter)
 {
-    parameter.request.queryLanguage = readText(parameter);
+    parameter.question.request.queryLanguage = readText(parameter);
 }
 
 void takeQuery(const Parameter& parameter)
 {
-    parameter.request.query = readText(parameter);
+    parameter.question.request.query = readText(parameter);
 }
 
 struct ParameterEntry
@@ -133,12 +181,13 @@ struct ParameterEntry
 };
 
 constexpr ParameterEntry className{"ClassName", true, &takeClassName};
+constexpr ParameterEntry superclassName{"ClassName", false, &takeClassName};
 constexpr ParameterEntry instanceName{"InstanceName", true, &takeInstanceName};
 constexpr ParameterEntry objectName{"ObjectName", true, &takeObjectName};
-constexpr ParameterEntry localOnly{"LocalOnly", false, &takeFlag};
-constexpr ParameterEntry deepInheritance{"DeepInheritance", false, &takeFlag};
-constexpr ParameterEntry includeQualifiers{"IncludeQualifiers", false, &takeFlag};
-constexpr ParameterEntry includeClassOrigin{"IncludeClassOrigin", false, &takeFlag};
+constexpr ParameterEntry localOnly{"LocalOnly", false, &takeLocalOnly};
+constexpr ParameterEntry deepInheritance{"DeepInheritance", false, &takeDeepInheritance};
+constexpr ParameterEntry includeQualifiers{"IncludeQualifiers", false, &takeIncludeQualifiers};
+constexpr ParameterEntry includeClassOrigin{"IncludeClassOrigin", false, &takeIncludeClassOrigin};
 constexpr ParameterEntry propertyList{"PropertyList", false, &takePropertyList};
 constexpr ParameterEntry assocClass{"AssocClass", false, &takeAssocClass};
 constexpr ParameterEntry resultClass{"ResultClass", false, &takeResultClass};
@@ -149,39 +198,88 @@ constexpr ParameterEntry modifiedInstance{"ModifiedInstance", true, &takeModifie
 constexpr ParameterEntry queryLanguage{"QueryLanguage", true, &takeQueryLanguage};
 constexpr ParameterEntry query{"Query", true, &takeQuery};
 
+constexpr ParameterEntry filterQueryLanguage{"FilterQueryLanguage", false, &refuseFilter};
+constexpr ParameterEntry filterQuery{"FilterQuery", false, &refuseFilter};
+constexpr ParameterEntry operationTimeout{"OperationTimeout", false, &takeTimeout};
+constexpr ParameterEntry continueOnError{"ContinueOnError", false, &takeContinueOnError};
+constexpr ParameterEntry maxObjectCount{"MaxObjectCount", false, &takeMostItems};
+constexpr ParameterEntry maxObjectCountOfPull{"MaxObjectCount", true, &takeMostItems};
+constexpr ParameterEntry enumerationContext{"EnumerationContext", true, &takeContext};
+
 struct MethodEntry
 {
     const char* name;
-    Operation operation;
+    Step step;
+    Operation operation; ///< of the steps ask and open
+    Items items;         ///< of the steps open and pull
     std::vector<ParameterEntry> parameters;
 };
+
+MethodEntry asking(const char* name, Operation operation, std::vector<ParameterEntry> parameters)
+{
+    return {name, Step::ask, operation, {}, std::move(parameters)};
+}
+
+MethodEntry opening(const char* name, Operation operation, std::vector<ParameterEntry> parameters)
+{
+    const Items items = answersPaths(operation) ? Items::paths : Items::instancesWithPaths;
+    if (items != Items::paths)
+        parameters.insert(parameters.end(), {includeClassOrigin, propertyList});
+    parameters.insert(parameters.end(),
+                      {filterQueryLanguage, filterQuery, operationTimeout, continueOnError, maxObjectCount});
+    return {name, Step::open, operation, items, std::move(parameters)};
+}
+
+MethodEntry pulling(const char* name, Items items)
+{
+    return {name, Step::pull, {}, items, {enumerationContext, maxObjectCountOfPull}};
+}
+
+MethodEntry answering(const char* name, Step step, std::vector<ParameterEntry> parameters)
+{
+    return {name, step, {}, {}, std::move(parameters)};
+}
 
 /// The operations served, with their parameters (DMTF DSP0200, 5.4).
 const std::vector<MethodEntry>& methods()
 {
     static const std::vector<MethodEntry> entries{
-        {"EnumerateInstanceNames", Operation::enumerateInstanceNames, {className}},
-        {"EnumerateInstances",
-         Operation::enumerateInstances,
-         {className, localOnly, deepInheritance, includeQualifiers, includeClassOrigin, propertyList}},
-        {"GetInstance",
-         Operation::getInstance,
-         {instanceName, localOnly, includeQualifiers, includeClassOrigin, propertyList}},
-        {"CreateInstance", Operation::createInstance, {newInstance}},
-        {"ModifyInstance", Operation::modifyInstance, {modifiedInstance, includeQualifiers, propertyList}},
-        {"DeleteInstance", Operation::deleteInstance, {instanceName}},
-        {"ExecQuery", Operation::execQuery, {queryLanguage, query}},
-        {"Associators",
-         Operation::associators,
-         {objectName, assocClass, resultClass, role, resultRole, includeQualifiers, includeClassOrigin,
-          propertyList}},
-        {"AssociatorNames",
-         Operation::associatorNames,
-         {objectName, assocClass, resultClass, role, resultRole}},
-        {"References",
-         Operation::references,
-         {objectName, resultClass, role, includeQualifiers, includeClassOrigin, propertyList}},
-        {"ReferenceNames", Operation::referenceNames, {objectName, resultClass, role}},
+        asking("EnumerateInstanceNames", Operation::enumerateInstanceNames, {className}),
+        asking("EnumerateInstances", Operation::enumerateInstances,
+               {className, localOnly, deepInheritance, includeQualifiers, includeClassOrigin, propertyList}),
+        asking("GetInstance", Operation::getInstance,
+               {instanceName, localOnly, includeQualifiers, includeClassOrigin, propertyList}),
+        asking("CreateInstance", Operation::createInstance, {newInstance}),
+        asking("ModifyInstance", Operation::modifyInstance,
+               {modifiedInstance, includeQualifiers, propertyList}),
+        asking("DeleteInstance", Operation::deleteInstance, {instanceName}),
+        asking("ExecQuery", Operation::execQuery, {queryLanguage, query}),
+        asking("Associators", Operation::associators,
+               {objectName, assocClass, resultClass, role, resultRole, includeQualifiers, includeClassOrigin,
+                propertyList}),
+        asking("AssociatorNames", Operation::associatorNames,
+               {objectName, assocClass, resultClass, role, resultRole}),
+        asking("References", Operation::references,
+               {objectName, resultClass, role, includeQualifiers, includeClassOrigin, propertyList}),
+        asking("ReferenceNames", Operation::referenceNames, {objectName, resultClass, role}),
+        opening("OpenEnumerateInstances", Operation::enumerateInstances, {className, deepInheritance}),
+        opening("OpenEnumerateInstancePaths", Operation::enumerateInstanceNames, {className}),
+        opening("OpenAssociatorInstances", Operation::associators,
+                {instanceName, assocClass, resultClass, role, resultRole}),
+        opening("OpenAssociatorInstancePaths", Operation::associatorNames,
+                {instanceName, assocClass, resultClass, role, resultRole}),
+        opening("OpenReferenceInstances", Operation::references, {instanceName, resultClass, role}),
+        opening("OpenReferenceInstancePaths", Operation::referenceNames, {instanceName, resultClass, role}),
+        pulling("PullInstancesWithPath", Items::instancesWithPaths),
+        pulling("PullInstancePaths", Items::paths),
+        pulling("PullInstances", Items::instances),
+        answering("CloseEnumeration", Step::close, {enumerationContext}),
+        answering("EnumerationCount", Step::count, {enumerationContext}),
+        answering("GetClass", Step::getClass,
+                  {className, localOnly, includeQualifiers, includeClassOrigin, propertyList}),
+        answering("EnumerateClasses", Step::enumerateClasses,
+                  {superclassName, deepInheritance, localOnly, includeQualifiers, includeClassOrigin}),
+        answering("EnumerateClassNames", Step::enumerateClassNames, {superclassName, deepInheritance}),
     };
     return entries;
 }
@@ -206,9 +304,9 @@ std::string namesOf(const std::vector<ParameterEntry>& parameters)
 class ParameterReader
 {
 public:
-    ParameterReader(const MethodEntry& method, OperationRequest& request, const XmlLimits& limits)
+    ParameterReader(const MethodEntry& method, Question& question, const XmlLimits& limits)
         : method_(method),
-          request_(request),
+          question_(question),
           limits_(limits)
     {}
 
@@ -251,14 +349,14 @@ private:
     void take(const ParameterEntry& entry, const Element& value)
     {
         try {
-            entry.take({value, request_, limits_});
+            entry.take({value, question_, limits_});
         } catch (const ValueError& error) {
             throw ValueError(error.code(), std::string(error.what()) + ", in the parameter " + entry.name);
         }
     }
 
     const MethodEntry& method_;
-    OperationRequest& request_;
+    Question& question_;
     const XmlLimits& limits_;
     std::set<const ParameterEntry*> given_;
     std::set<const ParameterEntry*> withValue_;
@@ -303,11 +401,12 @@ std::string classOf(const std::string& text)
     return from == words.end() || from + 1 == words.end() ? std::string() : *(from + 1);
 }
 
-using Content = std::variant<OperationRequest, cim::Status>;
+using Content = std::variant<Question, cim::Status>;
 
 /// The parts of the question that follow from others.
-Content completed(OperationRequest request, const std::string& nameSpace)
+Content completed(Question question, const std::string& nameSpace)
 {
+    OperationRequest& request = question.request;
     if (request.operation == Operation::execQuery) {
         request.target.className = classOf(request.query);
         if (request.target.className.empty())
@@ -321,7 +420,7 @@ Content completed(OperationRequest request, const std::string& nameSpace)
                           "ModifiedInstance: the instance is not of the class of its name");
         request.instance.path = request.target;
     }
-    return request;
+    return question;
 }
 
 /// \param call  IMETHODCALL
@@ -332,14 +431,16 @@ Content readContent(const Element& call, const RequestMessage& message, const Xm
         return status(CMPI_RC_ERR_NOT_SUPPORTED,
                       "the operation " + cim::excerpt(message.method) + " is not served");
     try {
-        OperationRequest request;
-        request.operation = method->operation;
-        ParameterReader reader(*method, request, limits);
+        Question question;
+        question.step = method->step;
+        question.items = method->items;
+        question.request.operation = method->operation;
+        ParameterReader reader(*method, question, limits);
         for (const Element& child : call.children)
             if (child.name == "IPARAMVALUE")
                 reader.take(child);
         reader.requireAll(call);
-        return completed(std::move(request), message.nameSpace);
+        return completed(std::move(question), message.nameSpace);
     } catch (const ValueError& error) {
         return status(error.code(), error.what());
     }

@@ -2,6 +2,7 @@
 
 #include "cim/StatusCode.h"
 #include "cim/Utf8.h"
+#include "serve/ClassWriter.h"
 #include "serve/ValueWriter.h"
 #include "serve/XmlWriter.h"
 
@@ -21,30 +22,51 @@ cim::ObjectPath located(cim::ObjectPath path, const RequestMessage& request, con
     return path;
 }
 
-/// IRETURNVALUE, in the form that each operation has (DMTF DSP0200, 5.4).
-class ReturnValueWriter
+/// What stands in a good response, in the form that each operation has (DMTF DSP0200, 5.4).
+class BodyWriter
 {
 public:
-    ReturnValueWriter(XmlWriter& xml, const RequestMessage& request, const cim::Answer& answer,
-                      const std::string& hostName)
+    BodyWriter(XmlWriter& xml, const RequestMessage& request, const Question& question, const Reply& reply,
+               const std::string& hostName, const schema::Classes& classes)
         : xml_(xml),
           request_(request),
-          answer_(answer),
-          hostName_(hostName)
+          question_(question),
+          reply_(reply),
+          answer_(reply.answer),
+          hostName_(hostName),
+          origins_(question.includeClassOrigin.value_or(false) ? &classes : nullptr)
     {}
 
-    void write(Operation operation)
+    void write()
     {
-        switch (operation) {
-        case Operation::modifyInstance:
-        case Operation::deleteInstance:
+        switch (question_.step) {
+        case Step::ask:
+            return writeAnswer(question_.request.operation);
+        case Step::close:
             return; // nothing is returned
+        case Step::count:
+            return returned([&] { xml_.element("VALUE", [&] { xml_.text(std::to_string(reply_.count)); }); });
+        case Step::open:
+        case Step::pull:
+            return writePiece();
         default:
-            xml_.element("IRETURNVALUE", [&] { writeContent(operation); });
+            return returned([&] { writeClasses(); });
         }
     }
 
 private:
+    template <class Content>
+    void returned(const Content& content)
+    {
+        xml_.element("IRETURNVALUE", content);
+    }
+
+    void writeAnswer(Operation operation)
+    {
+        if (operation != Operation::modifyInstance && operation != Operation::deleteInstance)
+            returned([&] { writeContent(operation); });
+    }
+
     void writeContent(Operation operation)
     {
         switch (operation) {
@@ -55,10 +77,13 @@ private:
             break;
         case Operation::enumerateInstances:
             for (const cim::Instance& instance : answer_.instances)
-                writeNamedInstance(instance);
+                xml_.element("VALUE.NAMEDINSTANCE", [&] {
+                    writeInstanceName(xml_, instance.path);
+                    writeInstance(xml_, instance, origins_);
+                });
             break;
         case Operation::getInstance:
-            writeInstance(xml_, answer_.instances.front());
+            writeInstance(xml_, answer_.instances.front(), origins_);
             break;
         case Operation::execQuery:
             for (const cim::Instance& instance : answer_.instances)
@@ -66,40 +91,66 @@ private:
             break;
         case Operation::associators:
         case Operation::references:
-            for (const cim::Instance& instance : answer_.instances)
-                writeObjectWithPath(instance);
+            writeInstancesWithPaths("VALUE.OBJECTWITHPATH");
             break;
         case Operation::associatorNames:
         case Operation::referenceNames:
             for (const cim::ObjectPath& path : answer_.paths)
-                xml_.element("OBJECTPATH",
-                             [&] { writeInstancePath(xml_, located(path, request_, hostName_)); });
+                xml_.element("OBJECTPATH", [&] { writePath(path); });
             break;
         default:
             break;
         }
     }
 
-    void writeNamedInstance(const cim::Instance& instance)
+    void writePiece()
     {
-        xml_.element("VALUE.NAMEDINSTANCE", [&] {
-            writeInstanceName(xml_, instance.path);
-            writeInstance(xml_, instance);
+        returned([&] {
+            for (const cim::ObjectPath& path : answer_.paths)
+                writePath(path);
+            writeInstancesWithPaths("VALUE.INSTANCEWITHPATH");
         });
+        const auto writeOut = [&](const char* name, const char* type, const std::string& value) {
+            xml_.element("PARAMVALUE", [&] {
+                xml_.attribute("NAME", name);
+                xml_.attribute("PARAMTYPE", type);
+                xml_.element("VALUE", [&] { xml_.text(value); });
+            });
+        };
+        writeOut("EnumerationContext", "string", reply_.context);
+        writeOut("EndOfSequence", "boolean", reply_.context.empty() ? "TRUE" : "FALSE");
     }
 
-    void writeObjectWithPath(const cim::Instance& instance)
+    void writeInstancesWithPaths(const char* element)
     {
-        xml_.element("VALUE.OBJECTWITHPATH", [&] {
-            writeInstancePath(xml_, located(instance.path, request_, hostName_));
-            writeInstance(xml_, instance);
-        });
+        for (const cim::Instance& instance : answer_.instances)
+            xml_.element(element, [&] {
+                writePath(instance.path);
+                writeInstance(xml_, instance, origins_);
+            });
+    }
+
+    void writePath(const cim::ObjectPath& path)
+    {
+        writeInstancePath(xml_, located(path, request_, hostName_));
+    }
+
+    void writeClasses()
+    {
+        for (const schema::Class& declaration : reply_.classes)
+            if (question_.step == Step::enumerateClassNames)
+                xml_.element("CLASSNAME", [&] { xml_.attribute("NAME", declaration.name); });
+            else
+                writeClass(xml_, declaration);
     }
 
     XmlWriter& xml_;
     const RequestMessage& request_;
+    const Question& question_;
+    const Reply& reply_;
     const cim::Answer& answer_;
     const std::string& hostName_;
+    const schema::Classes* origins_;
 };
 
 /// The document around the body of a response.
@@ -125,12 +176,16 @@ std::string messageWith(const RequestMessage& request, const Body& body)
     return xml.document();
 }
 
-/// The codes of CIM's own are those of CMPI, up to the last of them.
-constexpr CMPIrc lastCimStatus = CMPI_RC_ERR_METHOD_NOT_FOUND;
+/// The codes of CIM's own are the first of CMPI, and those of enumerations in pieces.
+bool isCimStatus(CMPIrc code)
+{
+    return code <= CMPI_RC_ERR_METHOD_NOT_FOUND ||
+           (code >= invalidEnumerationContext && code <= serverLimitsExceeded);
+}
 
 std::string writeError(const RequestMessage& request, const cim::Status& status)
 {
-    const bool isCims = status.code <= lastCimStatus;
+    const bool isCims = isCimStatus(status.code);
     const std::string message =
         status.message.value_or(isCims ? std::string() : cim::statusName(status.code));
     return messageWith(request, [&](XmlWriter& xml) {
@@ -144,15 +199,15 @@ std::string writeError(const RequestMessage& request, const cim::Status& status)
 
 } // namespace
 
-std::string writeResponse(const RequestMessage& request, const cim::Answer& answer,
-                          const std::string& hostName)
+std::string writeResponse(const RequestMessage& request, const Reply& reply, const std::string& hostName,
+                          const schema::Classes& classes)
 {
-    const auto* const operation = std::get_if<OperationRequest>(&request.content);
-    if (answer.status.code != CMPI_RC_OK || operation == nullptr)
-        return writeError(request, answer.status);
+    const auto* const question = std::get_if<Question>(&request.content);
+    if (reply.answer.status.code != CMPI_RC_OK || question == nullptr)
+        return writeError(request, reply.answer.status);
     try {
         return messageWith(request, [&](XmlWriter& xml) {
-            ReturnValueWriter(xml, request, answer, hostName).write(operation->operation);
+            BodyWriter(xml, request, *question, reply, hostName, classes).write();
         });
     } catch (const UnwritableError& error) {
         return writeError(request,

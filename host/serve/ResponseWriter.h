@@ -3,7 +3,7 @@
 #ifndef CIMHOST_SERVE_RESPONSEWRITER_H
 #define CIMHOST_SERVE_RESPONSEWRITER_H
 
-#include "cim/Model.h"
+#include "schema/Classes.h"
 #include "serve/Message.h"
 
 #include <string>
@@ -14,8 +14,9 @@ namespace cimhost::serve {
 /// with the status's code, or CIM_ERR_FAILED for one that CIM lacks; what came before the error is not
 /// sent. So does an answer with a value for which CIM-XML has no form.
 /// \param hostName  for paths that name no host but have to
-std::string writeResponse(const RequestMessage& request, const cim::Answer& answer,
-                          const std::string& hostName);
+/// \param classes   tell the origins of properties, where the request asks for them
+std::string writeResponse(const RequestMessage& request, const Reply& reply, const std::string& hostName,
+                          const schema::Classes& classes = {});
 
 } // namespace cimhost::serve
 

@@ -193,14 +193,31 @@ cim::Value readKeyValue(const Element& element)
     return std::move(*number);
 }
 
+/// \param element  KEYVALUE or VALUE.REFERENCE
+cim::Value readAnyKeyValue(const Element& element)
+{
+    return element.name == "KEYVALUE" ? readKeyValue(element) : cim::referenceValue(readReference(element));
+}
+
 void readKey(const Element& element, cim::ObjectPath& path)
 {
     const std::string& name = attribute(element, "NAME");
+    if (name.empty())
+        failAt(element, "an empty NAME", "the name of a key");
     if (cim::findKey(path, name) != nullptr)
         throw ValueError(element, "the key " + cim::excerpt(name) + " again", "each key once");
-    const Element& value = onlyChild(element, {"KEYVALUE", "VALUE.REFERENCE"});
-    path.keys.push_back(
-        {name, value.name == "KEYVALUE" ? readKeyValue(value) : cim::referenceValue(readReference(value))});
+    path.keys.push_back({name, readAnyKeyValue(onlyChild(element, {"KEYVALUE", "VALUE.REFERENCE"}))});
+}
+
+/// The key's value as one of the declared type, which CIM-XML need not tell; nothing: it is none of it.
+std::optional<cim::Value::Scalar> typedAs(CMPIType declared, const cim::Value& given)
+{
+    const bool isText = declared == CMPI_string || declared == CMPI_dateTime || declared == CMPI_char16;
+    const cim::Value::Scalar& item = given.items.front();
+    if (const auto* const text = std::get_if<std::string>(&item))
+        return isText ? parseScalar(*text, declared) : std::nullopt;
+    const bool isNumber = given.type != CMPI_boolean && given.type != CMPI_ref && given.type != CMPI_char16;
+    return isNumber && !isText && declared != CMPI_boolean ? narrowed(item, declared) : std::nullopt;
 }
 
 cim::ObjectPath readClassName(const Element& element)
@@ -233,8 +250,12 @@ cim::ObjectPath readAnyPath(const Element& element)
 /// \param element  VALUE.REFERENCE
 cim::ObjectPath readReference(const Element& element)
 {
-    return readAnyPath(onlyChild(element, {"CLASSPATH", "LOCALCLASSPATH", "CLASSNAME", "INSTANCEPATH",
-                                           "LOCALINSTANCEPATH", "INSTANCENAME"}));
+    cim::ObjectPath path =
+        readAnyPath(onlyChild(element, {"CLASSPATH", "LOCALCLASSPATH", "CLASSNAME", "INSTANCEPATH",
+                                        "LOCALINSTANCEPATH", "INSTANCENAME"}));
+    if (!path.keys.empty() && path.keys.front().name.empty())
+        throw ValueError(element, "a key without its name in a reference", "KEYBINDING");
+    return path;
 }
 
 /// Reads the properties of one instance.
@@ -337,11 +358,36 @@ cim::ObjectPath readInstanceName(const Element& element)
 {
     cim::ObjectPath path{"", "", attribute(element, "CLASSNAME"), {}};
     for (const Element& key : childrenAmong(element, {"KEYBINDING", "KEYVALUE", "VALUE.REFERENCE"})) {
-        if (key.name != "KEYBINDING")
-            throw ValueError(key, "a key without its name", "KEYBINDING");
-        readKey(key, path);
+        if (key.name == "KEYBINDING")
+            readKey(key, path);
+        else if (element.children.size() == 1)
+            path.keys.push_back({"", readAnyKeyValue(key)});
+        else
+            throw ValueError(key, "a key without its name among others", "KEYBINDING");
     }
     return path;
+}
+
+void typeKeys(cim::ObjectPath& path, const schema::Classes& classes)
+{
+    const schema::Class* const declaration = classes.find(path.className);
+    for (cim::Key& key : path.keys) {
+        if (key.name.empty()) {
+            const std::vector<std::string>& names = classes.keysOf(path.className);
+            if (names.size() != 1)
+                throw ValueError(CMPI_RC_ERR_INVALID_PARAMETER,
+                                 "found a key without its name, expected KEYBINDING: the class " +
+                                     cim::excerpt(path.className) + " is not known to have one key");
+            key.name = names.front();
+        }
+        const schema::Property* const declared =
+            declaration == nullptr ? nullptr : classes.findDeclared(*declaration, key.name);
+        const std::optional<CMPIType> type = declared == nullptr ? std::nullopt : findType(declared->type);
+        if (!type)
+            continue;
+        if (std::optional<cim::Value::Scalar> value = typedAs(*type, key.value))
+            key.value = scalarValue(*type, std::move(*value));
+    }
 }
 
 cim::Instance readInstance(const Element& element, const XmlLimits& limits)
@@ -359,6 +405,11 @@ cim::Instance readInstance(const Element& element, const XmlLimits& limits)
         instance.properties.push_back({name, reader.read(child)});
     }
     return instance;
+}
+
+std::uint32_t readUnsigned(const Element& element)
+{
+    return static_cast<std::uint32_t>(std::get<std::uint64_t>(readScalar(element, CMPI_uint32)));
 }
 
 bool readBoolean(const Element& element)

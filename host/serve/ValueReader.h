@@ -4,8 +4,10 @@
 #define CIMHOST_SERVE_VALUEREADER_H
 
 #include "cim/Model.h"
+#include "schema/Classes.h"
 #include "serve/Xml.h"
 
+#include <cstdint>
 #include <stdexcept>
 #include <string>
 
@@ -29,9 +31,14 @@ private:
 std::string readNameSpace(const Element& element);
 
 /// \param element  INSTANCENAME. A key's type is that of its TYPE; without one string, boolean, or the
-/// widest type that a number needs.
-/// \throws ValueError  also for a key without a name, which only a class repository could tell
+/// widest type that a number needs. The only key may have no name, which is then empty.
+/// \throws ValueError
 cim::ObjectPath readInstanceName(const Element& element);
+
+/// Gives the keys the types that the class declares, as far as it is known and their values are of these
+/// types, and the only key its name. \throws ValueError  for a key without a name where the class is not
+/// known or has several
+void typeKeys(cim::ObjectPath& path, const schema::Classes& classes);
 
 /// \param element   INSTANCE
 /// \param limits    of the documents that embedded instances are
@@ -40,6 +47,7 @@ cim::Instance readInstance(const Element& element, const XmlLimits& limits);
 
 /// \param element  VALUE  \throws ValueError
 bool readBoolean(const Element& element);
+std::uint32_t readUnsigned(const Element& element);
 
 } // namespace cimhost::serve
 

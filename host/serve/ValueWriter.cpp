@@ -133,10 +133,17 @@ void writeReference(XmlWriter& xml, const cim::ObjectPath& path)
     });
 }
 
-/// The attributes that all kinds of properties have.
-void writeHead(XmlWriter& xml, const cim::Property& property)
+void writeOrigin(XmlWriter& xml, std::string_view origin)
+{
+    if (!origin.empty())
+        xml.attribute("CLASSORIGIN", origin);
+}
+
+/// The attributes that all kinds of properties with a type have.
+void writeHead(XmlWriter& xml, const cim::Property& property, std::string_view origin)
 {
     xml.attribute("NAME", property.name);
+    writeOrigin(xml, origin);
     const CMPIType type = elementTypeOf(property.value);
     const bool isInstance = type == CMPI_instance;
     // A null without a type has to have one.
@@ -145,11 +152,11 @@ void writeHead(XmlWriter& xml, const cim::Property& property)
         xml.attribute("EmbeddedObject", "instance");
 }
 
-void writeArray(XmlWriter& xml, const cim::Property& property)
+void writeArray(XmlWriter& xml, const cim::Property& property, std::string_view origin)
 {
     const CMPIType type = elementTypeOf(property.value);
     xml.element("PROPERTY.ARRAY", [&] {
-        writeHead(xml, property);
+        writeHead(xml, property, origin);
         if (property.value.isNull)
             return;
         xml.element("VALUE.ARRAY", [&] {
@@ -162,20 +169,22 @@ void writeArray(XmlWriter& xml, const cim::Property& property)
     });
 }
 
-void writeProperty(XmlWriter& xml, const cim::Property& property)
+/// \param origin  empty: it is not told
+void writeProperty(XmlWriter& xml, const cim::Property& property, std::string_view origin)
 {
     const cim::Value& value = property.value;
     if (value.type == CMPI_ref)
         xml.element("PROPERTY.REFERENCE", [&] {
             xml.attribute("NAME", property.name);
+            writeOrigin(xml, origin);
             if (!value.isNull)
                 writeReference(xml, referenceOf(value));
         });
     else if (cim::isArray(value))
-        writeArray(xml, property);
+        writeArray(xml, property, origin);
     else
         xml.element("PROPERTY", [&] {
-            writeHead(xml, property);
+            writeHead(xml, property, origin);
             if (!value.isNull)
                 xml.element("VALUE", [&] { xml.text(textOf(value.items.front(), value.type)); });
         });
@@ -206,12 +215,14 @@ void writeInstancePath(XmlWriter& xml, const cim::ObjectPath& path)
     });
 }
 
-void writeInstance(XmlWriter& xml, const cim::Instance& instance)
+void writeInstance(XmlWriter& xml, const cim::Instance& instance, const schema::Classes* origins)
 {
     xml.element("INSTANCE", [&] {
         xml.attribute("CLASSNAME", instance.path.className);
         for (const cim::Property& property : instance.properties)
-            writeProperty(xml, property);
+            writeProperty(xml, property,
+                          origins == nullptr ? std::string_view()
+                                             : origins->originOf(instance.path.className, property.name));
     });
 }
 

@@ -4,6 +4,7 @@
 #define CIMHOST_SERVE_VALUEWRITER_H
 
 #include "cim/Model.h"
+#include "schema/Classes.h"
 #include "serve/XmlWriter.h"
 
 #include <stdexcept>
@@ -24,8 +25,9 @@ void writeInstanceName(XmlWriter& xml, const cim::ObjectPath& path);
 /// INSTANCEPATH: host, namespace, class and keys. \throws UnwritableError
 void writeInstancePath(XmlWriter& xml, const cim::ObjectPath& path);
 
-/// INSTANCE: class and properties. \throws UnwritableError
-void writeInstance(XmlWriter& xml, const cim::Instance& instance);
+/// INSTANCE: class and properties. \param origins  null: where properties come from is not told
+/// \throws UnwritableError
+void writeInstance(XmlWriter& xml, const cim::Instance& instance, const schema::Classes* origins = nullptr);
 
 } // namespace cimhost::serve
 

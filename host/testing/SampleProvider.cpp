@@ -38,6 +38,11 @@ std::string shown(const char* text)
     return text == nullptr ? "null" : text;
 }
 
+std::string classNameOf(const CMPIObjectPath* path)
+{
+    return textOf(path->ft->getClassName(path, nullptr));
+}
+
 // TEST_Thing: two things, "one" and "three", of the sizes of their names.
 
 namespace thing_provider {
@@ -209,6 +214,7 @@ CMPIObjectPath* kept = nullptr;
 CMPIStatus enumerateNames(CMPIInstanceMI* /*mi*/, const CMPIContext* /*context*/, const CMPIResult* result,
                           const CMPIObjectPath* path)
 {
+    say("keeping " + classNameOf(path));
     if (kept == nullptr)
         kept = thingPath(path, "kept");
     return result->ft->returnObjectPath(result, kept);

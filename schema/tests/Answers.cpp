@@ -4,7 +4,7 @@
 
 #include <algorithm>
 
-namespace schema {
+namespace cimhost::schema {
 namespace {
 
 using cimhost::cim::Instance;
@@ -151,4 +151,4 @@ Lines unusedValues(const std::vector<Instance>& instances, const Class& declarat
     return lines;
 }
 
-} // namespace schema
+} // namespace cimhost::schema

@@ -3,7 +3,7 @@
 #ifndef SCHEMA_ANSWERS_H
 #define SCHEMA_ANSWERS_H
 
-#include "Classes.h"
+#include "schema/Classes.h"
 
 #include "cim/Model.h"
 
@@ -11,7 +11,7 @@
 #include <string>
 #include <vector>
 
-namespace schema {
+namespace cimhost::schema {
 
 /// How a path departs from the class, one line each; empty: not at all. Its keys are those declared, each of
 /// the declared type; a reference is to the declared class or one that derives from it, and has that class'
@@ -28,6 +28,6 @@ std::vector<std::string> departures(const cimhost::cim::Instance& instance, cons
 std::vector<std::string> unusedValues(const std::vector<cimhost::cim::Instance>& instances,
                                       const Class& declaration);
 
-} // namespace schema
+} // namespace cimhost::schema
 
 #endif

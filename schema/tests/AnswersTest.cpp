@@ -15,8 +15,8 @@ using cimhost::cim::ObjectPath;
 using cimhost::cim::referenceValue;
 using cimhost::cim::textValue;
 using cimhost::cim::unsignedValue;
-using schema::Classes;
-using schema::readMof;
+using cimhost::schema::Classes;
+using cimhost::schema::readMof;
 using testing::ElementsAre;
 using testing::IsEmpty;
 
@@ -36,7 +36,8 @@ protected:
         class A : Base { [Key] string Id; [ValueMap{"1", "2"}, Values{"a", "b"}] uint16 States[]; boolean Flag; };
         class B : Base { [Key] string Id; };
         class Link { [Key] Base REF One; [Key] A REF Other; };)",
-                            "a.mof")};
+                            "a.mof")
+                        .classes};
     ObjectPath pathOfA{"", "root/cimv2", "A", {{"Id", textValue("1")}}};
     ObjectPath pathOfB{"", "root/cimv2", "B", {{"Id", textValue("2")}}};
     Instance instanceOfA{pathOfA,

@@ -1,7 +1,7 @@
 // The registrations for OpenPegasus against those for the small-footprint broker, and against what
 // OpenPegasus asks of them.
 
-#include "MofReader.h"
+#include "schema/MofReader.h"
 
 #include "broker/Registration.h"
 
@@ -35,8 +35,8 @@ void PrintTo(const RegisteredClass& entry, std::ostream* stream)
 namespace {
 
 using cimhost::RegisteredClass;
-using schema::WrittenInstance;
-using schema::WrittenValue;
+using cimhost::schema::WrittenInstance;
+using cimhost::schema::WrittenValue;
 using testing::UnorderedElementsAre;
 using testing::UnorderedElementsAreArray;
 
@@ -91,7 +91,7 @@ protected:
     }
 
     const std::vector<WrittenInstance> instances =
-        schema::readMofInstancesFile(std::string(SCHEMA_DIRECTORY "/") + GetParam().pegasus);
+        cimhost::schema::readMofFile(std::string(SCHEMA_DIRECTORY "/") + GetParam().pegasus).instances;
     const std::vector<RegisteredClass> registered =
         cimhost::readRegistrationFile(std::string(SCHEMA_DIRECTORY "/") + GetParam().sfcb).classes;
 };

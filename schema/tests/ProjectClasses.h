@@ -3,15 +3,15 @@
 #ifndef SCHEMA_PROJECTCLASSES_H
 #define SCHEMA_PROJECTCLASSES_H
 
-#include "Classes.h"
+#include "schema/Classes.h"
 
-namespace schema {
+namespace cimhost::schema {
 
 /// Those of TAVRO_Glimmark.mof and TAVRO_ComputerSystem.mof.
 inline std::vector<Class> projectClasses()
 {
-    std::vector<Class> classes = readMofFile(SCHEMA_DIRECTORY "/TAVRO_Glimmark.mof");
-    for (Class& declaration : readMofFile(SCHEMA_DIRECTORY "/TAVRO_ComputerSystem.mof"))
+    std::vector<Class> classes = readMofFile(SCHEMA_DIRECTORY "/TAVRO_Glimmark.mof").classes;
+    for (Class& declaration : readMofFile(SCHEMA_DIRECTORY "/TAVRO_ComputerSystem.mof").classes)
         classes.push_back(std::move(declaration));
     return classes;
 }
@@ -19,12 +19,12 @@ inline std::vector<Class> projectClasses()
 /// The same with their superclasses.
 inline Classes allClasses()
 {
-    std::vector<Class> classes = readMofFile(SCHEMA_DIRECTORY "/tests/dmtf-superclasses.mof");
+    std::vector<Class> classes = readMofFile(SUPERCLASSES).classes;
     for (Class& declaration : projectClasses())
         classes.push_back(std::move(declaration));
     return Classes(std::move(classes));
 }
 
-} // namespace schema
+} // namespace cimhost::schema
 
 #endif

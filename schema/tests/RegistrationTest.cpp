@@ -15,8 +15,8 @@ namespace {
 
 using cimhost::readRegistrationFile;
 using cimhost::RegisteredClass;
-using schema::Class;
-using schema::Classes;
+using cimhost::schema::Class;
+using cimhost::schema::Classes;
 using testing::ElementsAre;
 
 /// The MOF file of a registration, and the classes in both.
@@ -38,7 +38,7 @@ protected:
     const std::string directory = SCHEMA_DIRECTORY "/";
     const std::vector<RegisteredClass> registered =
         readRegistrationFile(directory + GetParam().registration).classes;
-    const std::vector<Class> declared = schema::readMofFile(directory + GetParam().mof);
+    const std::vector<Class> declared = cimhost::schema::readMofFile(directory + GetParam().mof).classes;
 };
 
 TEST_P(Registration, HasEachDeclaredClassOnce)

@@ -5,7 +5,7 @@
 #include <regex>
 #include <set>
 
-namespace schema {
+namespace cimhost::schema {
 namespace {
 
 /// Of the DMTF schema's qualifier declarations, what the project's classes use.
@@ -179,4 +179,4 @@ std::vector<std::string> breaches(const Class& declaration, const Classes& class
     return Inspection(declaration, classes).inspect();
 }
 
-} // namespace schema
+} // namespace cimhost::schema

@@ -3,12 +3,12 @@
 #ifndef SCHEMA_RULES_H
 #define SCHEMA_RULES_H
 
-#include "Classes.h"
+#include "schema/Classes.h"
 
 #include <string>
 #include <vector>
 
-namespace schema {
+namespace cimhost::schema {
 
 /// What is wrong with a class, one line each, with the place; empty: nothing.
 /// - The superclass is known; a class is an association if and only if its superclass is.
@@ -20,6 +20,6 @@ namespace schema {
 /// - ValueMap and Values come together, in equal number; the mapped numbers differ and fit a uint16.
 std::vector<std::string> breaches(const Class& declaration, const Classes& classes);
 
-} // namespace schema
+} // namespace cimhost::schema
 
 #endif

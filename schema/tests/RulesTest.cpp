@@ -5,10 +5,10 @@
 
 namespace {
 
-using schema::breaches;
-using schema::Class;
-using schema::Classes;
-using schema::readMof;
+using cimhost::schema::breaches;
+using cimhost::schema::Class;
+using cimhost::schema::Classes;
+using cimhost::schema::readMof;
 using testing::ElementsAre;
 using testing::IsEmpty;
 
@@ -21,8 +21,8 @@ const char* const superclasses = R"(
 
 std::vector<std::string> breachesOf(const std::string& mof)
 {
-    const std::vector<Class> read = readMof(mof, "a.mof");
-    std::vector<Class> all = readMof(superclasses, "superclasses.mof");
+    const std::vector<Class> read = readMof(mof, "a.mof").classes;
+    std::vector<Class> all = readMof(superclasses, "superclasses.mof").classes;
     all.insert(all.end(), read.begin(), read.end());
     return breaches(read.front(), Classes(all));
 }

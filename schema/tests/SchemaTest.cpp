@@ -20,8 +20,8 @@ namespace {
 using cimhost::cim::Answer;
 using cimhost::cim::Instance;
 using cimhost::cim::ObjectPath;
-using schema::Class;
-using schema::Classes;
+using cimhost::schema::Class;
+using cimhost::schema::Classes;
 using Testing::Environment;
 using testing::IsEmpty;
 using testing::Not;
@@ -30,7 +30,7 @@ using testing::UnorderedElementsAre;
 std::vector<std::string> classNames()
 {
     std::vector<std::string> names;
-    for (const Class& declaration : schema::projectClasses())
+    for (const Class& declaration : cimhost::schema::projectClasses())
         names.push_back(declaration.name);
     return names;
 }
@@ -44,7 +44,7 @@ TEST(Schema, HasTheClassesServed)
 
 TEST(Schema, BuildsOnTheRightSuperclasses)
 {
-    const Classes classes = schema::allClasses();
+    const Classes classes = cimhost::schema::allClasses();
     EXPECT_EQ(classes.find("TAVRO_Glimmark")->superclass, "CIM_AlarmDevice");
     EXPECT_EQ(classes.find("TAVRO_GlimmarkCapabilities")->superclass, "CIM_AlarmDeviceCapabilities");
     EXPECT_EQ(classes.find("TAVRO_GlimmarkElementCapabilities")->superclass, "CIM_ElementCapabilities");
@@ -54,7 +54,7 @@ TEST(Schema, BuildsOnTheRightSuperclasses)
 
 TEST(Schema, AssociatesTheRightClasses)
 {
-    const Classes classes = schema::allClasses();
+    const Classes classes = cimhost::schema::allClasses();
     const auto typeOf = [&](const char* association, const char* end) {
         return typeText(*findProperty(*classes.find(association), end));
     };
@@ -67,12 +67,13 @@ TEST(Schema, AssociatesTheRightClasses)
 /// Each file is compiled with the DMTF schema loaded and nothing else, the stand-in's perhaps never.
 TEST(Schema, RefersOnlyToClassesOfItsFileAndOfDmtf)
 {
-    std::vector<Class> known = schema::readMofFile(SCHEMA_DIRECTORY "/tests/dmtf-superclasses.mof");
-    const std::vector<Class> own = schema::readMofFile(SCHEMA_DIRECTORY "/TAVRO_Glimmark.mof");
+    std::vector<Class> known = cimhost::schema::readMofFile(SUPERCLASSES).classes;
+    const std::vector<Class> own =
+        cimhost::schema::readMofFile(SCHEMA_DIRECTORY "/TAVRO_Glimmark.mof").classes;
     known.insert(known.end(), own.begin(), own.end());
     const Classes classes(known);
     for (const Class& declaration : own) {
-        for (const schema::Property& property : declaration.properties) {
+        for (const cimhost::schema::Property& property : declaration.properties) {
             const bool isKnown = !property.isReference || classes.find(property.type) != nullptr;
             EXPECT_TRUE(isKnown) << declaration.name << '.' << property.name;
         }
@@ -104,7 +105,7 @@ TEST(Schema, IsPlainAsciiWithoutPragmas)
 class SchemaClass : public testing::TestWithParam<std::string>
 {
 protected:
-    const Classes classes = schema::allClasses();
+    const Classes classes = cimhost::schema::allClasses();
     const Class& declaration = *classes.find(GetParam());
 };
 

@@ -10,7 +10,7 @@ import typing
 
 from changes import names_of, with_instances, with_paths, with_texts
 from cim import COMPUTER_SYSTEM, GLIMMARK, Answer, Instance, Path, Question
-from questions import ENDS, NO_CLASS, SUPERCLASSES
+from questions import ENDS, NO_CLASS
 
 # In the order in which the entries change an answer. Of each broker, those that change what is asked come last, so that
 # all others see the question changed.
@@ -65,16 +65,6 @@ def with_unset_properties(answer, names, schema):
         return dataclasses.replace(instance, properties={**added, **instance.properties})
 
     return with_instances(answer, complete)
-
-
-# --- Both ---
-
-
-@differs("sfcb", "pegasus", reason="A superclass of the schema is enumerated, which cimhost does not know.")
-def superclasses(question, ask, schema):
-    if question.operation not in ("ein", "ei"):
-        return ask(question)
-    return ask(dataclasses.replace(question, target=SUPERCLASSES.get(question.target, question.target)))
 
 
 # --- SFCB ---

@@ -14,7 +14,7 @@ ENDS = {
 }
 
 # Classes of the schema of which only ours have instances on such a server.
-SUPERCLASSES = {"CIM_AlarmDevice": GLIMMARK, "CIM_AlarmDeviceCapabilities": CAPABILITIES}
+SUPERCLASSES = ["CIM_AlarmDevice", "CIM_AlarmDeviceCapabilities"]
 
 # Without keys, with keys, without end: a name of each kind, several, unknown ones, none.
 PROPERTY_LISTS = {

@@ -22,6 +22,7 @@ CAPABILITIES = (
     "TAVRO:GlimmarkCapabilities1</KEYVALUE></KEYBINDING></INSTANCENAME>"
 )
 ASSOCIATION = '<CLASSNAME NAME="TAVRO_GlimmarkElementCapabilities"/>'
+MOST = ("MaxObjectCount", "<VALUE>100</VALUE>")
 BOMB = b'<!DOCTYPE CIM [<!ENTITY a "aaaa"><!ENTITY b "&a;&a;&a;&a;">]><CIM>&b;&b;&b;&b;</CIM>'
 
 Case = collections.namedtuple("Case", "name message headers status count_of count")
@@ -46,7 +47,11 @@ CASES = [
     operation("References", [("ObjectName", FAN), ("ResultClass", ASSOCIATION)], "<VALUE.OBJECTWITHPATH>", 1),
     operation("ReferenceNames", [("ObjectName", CAPABILITIES), ("ResultClass", ASSOCIATION)], "<OBJECTPATH>", 13),
     operation("DeleteInstance", [("InstanceName", FAN)], '<ERROR CODE="7">', 1),
-    operation("GetClass", [("ClassName", GLIMMARK)], '<ERROR CODE="7" ', 1),
+    operation("EnumerateInstanceNames", [("ClassName", '<CLASSNAME NAME="CIM_AlarmDevice"/>')], "<INSTANCENAME ", 13),
+    operation("GetClass", [("ClassName", GLIMMARK)], "<CLASS ", 1),
+    operation("EnumerateClassNames", [("DeepInheritance", "<VALUE>true</VALUE>")], "<CLASSNAME ", 20),
+    operation("OpenEnumerateInstancePaths", [("ClassName", GLIMMARK), MOST], "<INSTANCEPATH>", 13),
+    operation("GetQualifier", [], '<ERROR CODE="7" ', 1),
     operation("EnumerateInstances", [("ClassName", '<CLASSNAME NAME="CIM_Fan"/>')], '<ERROR CODE="5" ', 1),
     operation("EnumerateInstances", [], '<ERROR CODE="4" ', 1),
     hostile("an entity bomb", BOMB, 400, "found a document type declaration"),

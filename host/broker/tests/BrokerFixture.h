@@ -61,8 +61,8 @@ class BrokerFixture : public testing::Test
 protected:
     explicit BrokerFixture(Registration registration = {},
                            std::vector<std::string> directories = {SAMPLE_DIRECTORY},
-                           const Habits* habits = nullptr)
-        : broker_(std::move(registration), std::move(directories), listeners(), habits)
+                           const Habits* habits = nullptr, schema::Classes classes = {})
+        : broker_(std::move(registration), std::move(directories), listeners(), habits, std::move(classes))
     {}
 
     [[nodiscard]] const CMPIBroker* mb() const { return broker_.cmpiBroker(); }

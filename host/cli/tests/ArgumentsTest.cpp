@@ -271,12 +271,30 @@ TEST(Arguments, setTheBrokerUp)
     EXPECT_FALSE(defaults.trace);
     EXPECT_EQ(defaults.like, std::nullopt);
 
-    const Settings settings =
-        parse({"--provider-dir", "/a", "ei", "C", "P", "--provider-dir", "/b", "--registration", "r1",
-               "--registration", "r2", "--inventory", "i.json", "--trace", "--like", "sfcb"})
-            .settings;
+    const Settings settings = parse({"--provider-dir",
+                                     "/a",
+                                     "ei",
+                                     "C",
+                                     "P",
+                                     "--provider-dir",
+                                     "/b",
+                                     "--registration",
+                                     "r1",
+                                     "--registration",
+                                     "r2",
+                                     "--schema",
+                                     "s1",
+                                     "--schema",
+                                     "s2",
+                                     "--inventory",
+                                     "i.json",
+                                     "--trace",
+                                     "--like",
+                                     "sfcb"})
+                                  .settings;
     EXPECT_THAT(settings.providerDirectories, ElementsAre("/a", "/b"));
     EXPECT_THAT(settings.registrationFiles, ElementsAre("r1", "r2"));
+    EXPECT_THAT(settings.schemaFiles, ElementsAre("s1", "s2"));
     EXPECT_EQ(settings.inventory, "i.json");
     EXPECT_TRUE(settings.trace);
     EXPECT_EQ(settings.like, "sfcb");

@@ -1,6 +1,7 @@
 #include "cli/Installation.h"
 
 #include "cli/Arguments.h"
+#include "schema/MofReader.h"
 #include "testing/TemporaryDirectory.h"
 
 #include <gmock/gmock.h>
@@ -109,6 +110,35 @@ TEST_F(Installation, withoutRegistrationsNothingCanBeDone)
     } catch (const UsageError& error) {
         EXPECT_THAT(error.what(), HasSubstr("--registration or CIMHOST_REGISTRATION"));
     }
+}
+
+TEST_F(Installation, theCommandLinesSchemaComesFirstThenThatOfTheEnvironment)
+{
+    Surroundings around = surroundings();
+    around.schemaFiles = "b.mof:c.mof";
+    EXPECT_THAT(findSchemaFiles(settings, around), ElementsAre("b.mof", "c.mof"));
+    settings.schemaFiles = {"a.mof"};
+    EXPECT_THAT(findSchemaFiles(settings, around), ElementsAre("a.mof"));
+}
+
+TEST_F(Installation, theSchemaIsInTheInstalledTree)
+{
+    EXPECT_THAT(findSchemaFiles(settings, surroundings()), IsEmpty());
+    const std::string folder = "bin/" CIMHOST_SCHEMADIR_FROM_BIN;
+    const std::string second = tree.file(folder + "/b.mof", "");
+    const std::string first = tree.file(folder + "/a.mof", "");
+    const std::string other = tree.file(folder + "/a.reg", "");
+    const std::string brokers = tree.file(folder + "/cimhost/a.mof", "");
+    EXPECT_THAT(findSchemaFiles(settings, surroundings()),
+                ElementsAre(normal(first), normal(second), normal(brokers)));
+}
+
+TEST_F(Installation, classesOfSeveralFilesAddUp)
+{
+    const std::string first = tree.file("a.mof", "class A : B {}; instance of A {};");
+    const std::string second = tree.file("b.mof", "class B {};");
+    EXPECT_TRUE(readClasses({first, second}).isA("A", "B"));
+    EXPECT_THROW(readClasses({first, second, tree.file("c.mof", "class a {};")}), schema::MofError);
 }
 
 std::string section(const std::string& className, const std::string& provider)

@@ -391,6 +391,15 @@ TEST(Errors, ofARegistrationReturnTwo)
     EXPECT_EQ(run({"ei", "CIMT_Lamp", "--registration", directory.path().string() + "/none.reg"}).status, 2);
 }
 
+TEST(Errors, ofASchemaReturnTwo)
+{
+    const TemporaryDirectory directory;
+    const std::string wrong = directory.file("wrong.mof", "class A {\n};\nnonsense\n");
+    const Outcome outcome = run({"ei", "CIMT_Lamp", "--schema", wrong});
+    EXPECT_EQ(outcome.status, 2);
+    EXPECT_EQ(outcome.err, "cimhost: " + wrong + ":3:1: expected class, found \"nonsense\"\n");
+}
+
 TEST(Errors, ofAMissingProviderAreTheAnswers)
 {
     const TemporaryDirectory directory;

@@ -6,6 +6,7 @@
 
 #include <functional>
 #include <string>
+#include <tuple>
 #include <utility>
 
 #include <gmock/gmock.h>
@@ -250,12 +251,32 @@ TEST_F(Binding, namesTheFaultOfTheMessage)
     expectError(413, "", "deep in each other");
 }
 
+TEST_F(Binding, answersAllStepsOfAnEnumeration)
+{
+    // Each comes to who answers it: the broker, which has no namespaces, or the enumerations, of which none
+    // is open.
+    for (const auto& [method, parameters, code] :
+         {std::tuple{"GetClass", parameter("ClassName", className()), "3"},
+          {"OpenEnumerateInstances", parameter("ClassName", className()), "3"},
+          {"OpenEnumerateInstances",
+           parameter("ClassName", className()) + parameter("OperationTimeout", text("0")), "22"},
+          {"PullInstancePaths",
+           parameter("EnumerationContext", text("x")) + parameter("MaxObjectCount", text("1")), "21"},
+          {"CloseEnumeration", parameter("EnumerationContext", text("x")), "21"},
+          {"EnumerationCount", parameter("EnumerationContext", text("x")), "21"}}) {
+        request.body = callOf(method, parameters);
+        set("CIMMethod", method);
+        EXPECT_THAT(binding.answer(request).body, HasSubstr(std::string("<ERROR CODE=\"") + code + '"'))
+            << method;
+    }
+}
+
 TEST_F(Binding, answersWhatIsNotServedByAStatus)
 {
-    request.body = callOf("GetClass", parameter("ClassName", className()));
-    set("CIMMethod", "GetClass");
+    request.body = callOf("CreateClass", "");
+    set("CIMMethod", "CreateClass");
     EXPECT_THAT(binding.answer(request).body,
-                HasSubstr("<IMETHODRESPONSE NAME=\"GetClass\"><ERROR CODE=\"7\""));
+                HasSubstr("<IMETHODRESPONSE NAME=\"CreateClass\"><ERROR CODE=\"7\""));
     request.body = messageWith(
         R"(<SIMPLEREQ><METHODCALL NAME="Reset"><LOCALCLASSPATH><LOCALNAMESPACEPATH><NAMESPACE NAME="a"/>)"
         R"(</LOCALNAMESPACEPATH><CLASSNAME NAME="CIM_A"/></LOCALCLASSPATH></METHODCALL></SIMPLEREQ>)");

@@ -5,6 +5,7 @@
 
 #include <optional>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include <gmock/gmock.h>
@@ -18,13 +19,19 @@ using testing::HasSubstr;
 namespace {
 
 /// The question that a message asks.
-OperationRequest requestOf(const std::string& message)
+Question questionOf(const std::string& message)
 {
     const RequestMessage read = readRequest(message);
     if (const auto* status = std::get_if<cim::Status>(&read.content))
         ADD_FAILURE() << status->message.value_or("");
-    const auto* request = std::get_if<OperationRequest>(&read.content);
-    return request == nullptr ? OperationRequest() : *request;
+    const auto* question = std::get_if<Question>(&read.content);
+    return question == nullptr ? Question() : *question;
+}
+
+/// What a provider is asked by it.
+OperationRequest requestOf(const std::string& message)
+{
+    return questionOf(message).request;
 }
 
 /// The status that a message is answered with by itself.
@@ -189,11 +196,113 @@ TEST(RequestReader, asksTheClassThatAQuerySelectsFrom)
         expectStatus(queryOf(query), CMPI_RC_ERR_INVALID_QUERY, "names no class after FROM");
 }
 
+TEST(RequestReader, readsQuestionsForClasses)
+{
+    const Question get = questionOf(callOf("GetClass", parameter("ClassName", className())));
+    EXPECT_EQ(get.step, Step::getClass);
+    EXPECT_EQ(get.request.target, classA);
+    for (const auto& flag :
+         {get.localOnly, get.deepInheritance, get.includeQualifiers, get.includeClassOrigin})
+        EXPECT_EQ(flag, std::nullopt);
+
+    const Question chosen = questionOf(
+        callOf("GetClass", parameter("ClassName", className()) + parameter("LocalOnly", text("false")) +
+                               parameter("IncludeQualifiers", text("FALSE")) +
+                               parameter("IncludeClassOrigin", text("true")) +
+                               parameter("PropertyList", "<VALUE.ARRAY><VALUE>Name</VALUE></VALUE.ARRAY>")));
+    EXPECT_EQ(chosen.localOnly, false);
+    EXPECT_EQ(chosen.includeQualifiers, false);
+    EXPECT_EQ(chosen.includeClassOrigin, true);
+    EXPECT_EQ(chosen.request.properties, cim::PropertyList({"Name"}));
+
+    const Question all = questionOf(callOf("EnumerateClasses", parameter("DeepInheritance", text("TRUE"))));
+    EXPECT_EQ(all.step, Step::enumerateClasses);
+    EXPECT_EQ(all.request.target.className, "");
+    EXPECT_EQ(all.request.target.nameSpace, "root/cimv2");
+    EXPECT_EQ(all.deepInheritance, true);
+    EXPECT_EQ(questionOf(callOf("EnumerateClassNames", parameter("ClassName", className()))).step,
+              Step::enumerateClassNames);
+    expectStatus(callOf("GetClass", ""), CMPI_RC_ERR_INVALID_PARAMETER,
+                 "GetClass without a value of ClassName");
+    expectStatus(callOf("GetClass", parameter("DeepInheritance", text("TRUE"))),
+                 CMPI_RC_ERR_INVALID_PARAMETER, "the parameter \"DeepInheritance\"");
+}
+
+TEST(RequestReader, readsOpeningsOfEnumerations)
+{
+    const std::string terms = parameter("OperationTimeout", text("20")) +
+                              parameter("ContinueOnError", text("false")) +
+                              parameter("MaxObjectCount", text("7")) + parameter("FilterQuery", "");
+    const struct
+    {
+        const char* method;
+        std::string object;
+        Operation operation;
+        Items items;
+    } openings[] = {
+        {"OpenEnumerateInstances", parameter("ClassName", className()), Operation::enumerateInstances,
+         Items::instancesWithPaths},
+        {"OpenEnumerateInstancePaths", parameter("ClassName", className()), Operation::enumerateInstanceNames,
+         Items::paths},
+        {"OpenAssociatorInstances", parameter("InstanceName", instanceName()), Operation::associators,
+         Items::instancesWithPaths},
+        {"OpenAssociatorInstancePaths", parameter("InstanceName", instanceName()), Operation::associatorNames,
+         Items::paths},
+        {"OpenReferenceInstances", parameter("InstanceName", instanceName()), Operation::references,
+         Items::instancesWithPaths},
+        {"OpenReferenceInstancePaths", parameter("InstanceName", instanceName()), Operation::referenceNames,
+         Items::paths},
+    };
+    for (const auto& opening : openings) {
+        const Question question = questionOf(callOf(opening.method, opening.object + terms));
+        EXPECT_EQ(question.step, Step::open) << opening.method;
+        EXPECT_EQ(question.request.operation, opening.operation) << opening.method;
+        EXPECT_EQ(question.items, opening.items) << opening.method;
+        EXPECT_EQ(question.timeout, 20U);
+        EXPECT_EQ(question.mostItems, 7U);
+        const Question bare = questionOf(callOf(opening.method, opening.object));
+        EXPECT_EQ(bare.timeout, std::nullopt);
+        EXPECT_EQ(bare.mostItems, 0U);
+        expectStatus(
+            callOf(opening.method, opening.object + parameter("FilterQueryLanguage", text("DMTF:FQL"))),
+            filteredEnumerationNotSupported, "filters are not served");
+        expectStatus(callOf(opening.method, opening.object + parameter("ContinueOnError", text("true"))),
+                     continuationOnErrorNotSupported, "ends with its first error");
+        expectStatus(callOf(opening.method, opening.object + parameter("MaxObjectCount", text("-1"))),
+                     CMPI_RC_ERR_INVALID_PARAMETER, "a value of the type uint32");
+    }
+    const std::string origin =
+        parameter("ClassName", className()) + parameter("IncludeClassOrigin", text("true"));
+    EXPECT_EQ(questionOf(callOf("OpenEnumerateInstances", origin)).includeClassOrigin, true);
+    expectStatus(callOf("OpenEnumerateInstancePaths", origin), CMPI_RC_ERR_INVALID_PARAMETER,
+                 "IncludeClassOrigin");
+}
+
+TEST(RequestReader, readsWhatComesAfterAnOpening)
+{
+    const std::string context = parameter("EnumerationContext", text("1-2"));
+    const std::string most = parameter("MaxObjectCount", text("3"));
+    for (const auto& [method, items] : {std::pair{"PullInstancesWithPath", Items::instancesWithPaths},
+                                        {"PullInstancePaths", Items::paths},
+                                        {"PullInstances", Items::instances}}) {
+        const Question question = questionOf(callOf(method, context + most));
+        EXPECT_EQ(question.step, Step::pull);
+        EXPECT_EQ(question.items, items);
+        EXPECT_EQ(question.context, "1-2");
+        EXPECT_EQ(question.mostItems, 3U);
+        expectStatus(callOf(method, context), CMPI_RC_ERR_INVALID_PARAMETER,
+                     "without a value of MaxObjectCount");
+        expectStatus(callOf(method, most), CMPI_RC_ERR_INVALID_PARAMETER,
+                     "without a value of EnumerationContext");
+    }
+    EXPECT_EQ(questionOf(callOf("CloseEnumeration", context)).step, Step::close);
+    EXPECT_EQ(questionOf(callOf("EnumerationCount", context)).context, "1-2");
+}
+
 TEST(RequestReader, doesNotServeWhatNoProviderAnswers)
 {
-    for (const char* method :
-         {"GetClass", "EnumerateClasses", "EnumerateClassNames", "CreateClass", "GetQualifier", "GetProperty",
-          "SetProperty", "OpenEnumerateInstances", "NoSuchMethod", ""})
+    for (const char* method : {"CreateClass", "GetQualifier", "GetProperty", "SetProperty",
+                               "OpenQueryInstances", "NoSuchMethod", ""})
         expectStatus(callOf(method, parameter("ClassName", className())), CMPI_RC_ERR_NOT_SUPPORTED,
                      "is not served");
 }

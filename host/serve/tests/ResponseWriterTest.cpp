@@ -2,6 +2,8 @@
 
 #include "cim/Values.h"
 #include "cim/tests/Print.h"
+#include "schema/MofReader.h"
+#include "serve/ClassWriter.h"
 #include "serve/Dtd.h"
 #include "serve/ValueReader.h"
 #include "serve/ValueWriter.h"
@@ -22,15 +24,15 @@ namespace {
 
 RequestMessage requestFor(Operation operation)
 {
-    OperationRequest request;
-    request.operation = operation;
-    return {"7 & \"8\"", "1.0", "Method", true, "root/cimv2", request};
+    Question question;
+    question.request.operation = operation;
+    return {"7 & \"8\"", "1.0", "Method", true, "root/cimv2", question};
 }
 
 /// What stands inside of the response's method.
-std::string bodyOf(Operation operation, const cim::Answer& answer)
+std::string bodyOf(const RequestMessage& request, const Reply& reply, const schema::Classes& classes = {})
 {
-    const std::string document = writeResponse(requestFor(operation), answer, "here");
+    const std::string document = writeResponse(request, reply, "here", classes);
     const std::string before =
         "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\">"
         "<MESSAGE ID=\"7 &amp; &quot;8&quot;\" PROTOCOLVERSION=\"1.0\"><SIMPLERSP><IMETHODRESPONSE NAME=\"Method\">";
@@ -38,6 +40,18 @@ std::string bodyOf(Operation operation, const cim::Answer& answer)
     EXPECT_EQ(document.substr(0, before.size()), before);
     EXPECT_EQ(document.substr(document.size() - after.size()), after);
     return document.substr(before.size(), document.size() - before.size() - after.size());
+}
+
+std::string bodyOf(Operation operation, const cim::Answer& answer)
+{
+    return bodyOf(requestFor(operation), {answer});
+}
+
+RequestMessage requestFor(Step step)
+{
+    RequestMessage request = requestFor(Operation::enumerateInstances);
+    std::get<Question>(request.content).step = step;
+    return request;
 }
 
 std::string instanceText(const cim::Instance& instance)
@@ -59,6 +73,86 @@ const std::string pathXml =
     "<INSTANCEPATH><NAMESPACEPATH><HOST>here</HOST><LOCALNAMESPACEPATH><NAMESPACE NAME=\"root\">"
     "</NAMESPACE><NAMESPACE NAME=\"cimv2\"></NAMESPACE></LOCALNAMESPACEPATH></NAMESPACEPATH>" +
     nameXml + "</INSTANCEPATH>";
+
+TEST(ResponseWriter, givesPiecesOfEnumerationsTheirForm)
+{
+    const auto trailer = [](const std::string& context, const std::string& isEnd) {
+        return R"(<PARAMVALUE NAME="EnumerationContext" PARAMTYPE="string"><VALUE>)" + context +
+               R"(</VALUE></PARAMVALUE><PARAMVALUE NAME="EndOfSequence" PARAMTYPE="boolean"><VALUE>)" +
+               isEnd + "</VALUE></PARAMVALUE>";
+    };
+    Reply reply{{{}, {}, {instance}}};
+    reply.context = "7";
+    EXPECT_EQ(bodyOf(requestFor(Step::open), reply),
+              "<IRETURNVALUE><VALUE.INSTANCEWITHPATH>" + pathXml + instanceXml +
+                  "</VALUE.INSTANCEWITHPATH></IRETURNVALUE>" + trailer("7", "FALSE"));
+    EXPECT_EQ(bodyOf(requestFor(Step::pull), {{{}, {path}, {}}}),
+              "<IRETURNVALUE>" + pathXml + "</IRETURNVALUE>" + trailer("", "TRUE"));
+    EXPECT_EQ(bodyOf(requestFor(Step::close), {}), "");
+    reply.count = 12;
+    EXPECT_EQ(bodyOf(requestFor(Step::count), reply), "<IRETURNVALUE><VALUE>12</VALUE></IRETURNVALUE>");
+}
+
+TEST(ResponseWriter, writesClassesAndTheirNames)
+{
+    const schema::Classes classes(schema::readMof(R"(
+        [Association, Version("1.0"), Description("a <b>")] class CIM_Base {
+            [Key, MaxLen(64), MinValue(1), Experimental(false)] string Name = "x";
+            uint16 States[] = {1, 2}; boolean Flag = true; };
+        [Version("2.0")] class CIM_Leaf : CIM_Base {
+            [Override("States"), Values {"a", "b"}] uint16 States[]; CIM_Base REF End; };)",
+                                                  "a.mof")
+                                      .classes);
+    Reply reply;
+    reply.classes = {classes.completed(*classes.find("CIM_Leaf"))};
+    const auto qualifier = [](const std::string& name, const std::string& type, const std::string& value,
+                              bool isInherited = true, const std::string& toSubclass = "true") {
+        return "<QUALIFIER NAME=\"" + name + "\" TYPE=\"" + type + '"' +
+               (isInherited ? " PROPAGATED=\"true\"" : "") + " TOSUBCLASS=\"" + toSubclass + "\">" + value +
+               "</QUALIFIER>";
+    };
+    const std::string whole =
+        R"(<CLASS NAME="CIM_Leaf" SUPERCLASS="CIM_Base">)" +
+        qualifier("Version", "string", "<VALUE>2.0</VALUE>", false, "false") +
+        qualifier("Association", "boolean", "<VALUE>TRUE</VALUE>") +
+        qualifier("Description", "string", "<VALUE>a &lt;b&gt;</VALUE>") +
+        R"(<PROPERTY NAME="Name" TYPE="string" CLASSORIGIN="CIM_Base" PROPAGATED="true">)" +
+        qualifier("Key", "boolean", "<VALUE>TRUE</VALUE>") +
+        qualifier("MaxLen", "uint32", "<VALUE>64</VALUE>") +
+        qualifier("MinValue", "sint64", "<VALUE>1</VALUE>") +
+        qualifier("Experimental", "boolean", "<VALUE>FALSE</VALUE>", true, "false") +
+        R"(<VALUE>x</VALUE></PROPERTY>)"
+        R"(<PROPERTY.ARRAY NAME="States" TYPE="uint16" CLASSORIGIN="CIM_Base" PROPAGATED="false">)" +
+        qualifier("Override", "string", "<VALUE>States</VALUE>", false, "false") +
+        qualifier("Values", "string", "<VALUE.ARRAY><VALUE>a</VALUE><VALUE>b</VALUE></VALUE.ARRAY>", false) +
+        R"(</PROPERTY.ARRAY><PROPERTY NAME="Flag" TYPE="boolean" CLASSORIGIN="CIM_Base" PROPAGATED="true">)"
+        R"(<VALUE>TRUE</VALUE></PROPERTY>)"
+        R"(<PROPERTY.REFERENCE NAME="End" REFERENCECLASS="CIM_Base" CLASSORIGIN="CIM_Leaf" PROPAGATED="false">)"
+        "</PROPERTY.REFERENCE></CLASS>";
+    EXPECT_EQ(bodyOf(requestFor(Step::getClass), reply), "<IRETURNVALUE>" + whole + "</IRETURNVALUE>");
+    EXPECT_EQ(bodyOf(requestFor(Step::enumerateClasses), reply),
+              "<IRETURNVALUE>" + whole + "</IRETURNVALUE>");
+    EXPECT_EQ(bodyOf(requestFor(Step::enumerateClassNames), reply),
+              "<IRETURNVALUE><CLASSNAME NAME=\"CIM_Leaf\"></CLASSNAME></IRETURNVALUE>");
+
+    const schema::Class base = classes.completed(*classes.find("CIM_Base"));
+    XmlWriter xml;
+    writeClass(xml, base);
+    EXPECT_THAT(xml.document(),
+                HasSubstr("<VALUE.ARRAY><VALUE>1</VALUE><VALUE>2</VALUE></VALUE.ARRAY></PROPERTY.ARRAY>"));
+}
+
+TEST(ResponseWriter, tellsWhereInstancesPropertiesComeFromWhenAsked)
+{
+    const schema::Classes classes(
+        schema::readMof("class CIM_Base { uint16 Size; }; class CIM_A : CIM_Base {};", "a.mof").classes);
+    RequestMessage request = requestFor(Operation::enumerateInstances);
+    const Reply reply{{{}, {}, {instance}}};
+    EXPECT_THAT(bodyOf(request, reply, classes), Not(HasSubstr("CLASSORIGIN")));
+    std::get<Question>(request.content).includeClassOrigin = true;
+    EXPECT_THAT(bodyOf(request, reply, classes), HasSubstr("NAME=\"Size\" CLASSORIGIN=\"CIM_Base\" TYPE"));
+    EXPECT_THAT(bodyOf(request, reply), Not(HasSubstr("CLASSORIGIN"))) << "of no known class";
+}
 
 TEST(ResponseWriter, givesEachOperationItsForm)
 {
@@ -121,7 +215,7 @@ TEST(ResponseWriter, answersMethodsOfClassesInTheirOwnElement)
     const RequestMessage message{"1",   "1.0", "Reset",
                                  false, "a",   cim::Status{CMPI_RC_ERR_NOT_SUPPORTED, "no"}};
     EXPECT_THAT(
-        writeResponse(message, {{CMPI_RC_ERR_NOT_SUPPORTED, "no"}, {}, {}}, "here"),
+        writeResponse(message, {{{CMPI_RC_ERR_NOT_SUPPORTED, "no"}, {}, {}}}, "here"),
         HasSubstr(
             "<METHODRESPONSE NAME=\"Reset\"><ERROR CODE=\"7\" DESCRIPTION=\"no\"></ERROR></METHODRESPONSE>"));
 }

@@ -1,5 +1,7 @@
 #include "serve/ValueReader.h"
 
+#include "schema/MofReader.h"
+
 #include "cim/Values.h"
 #include "cim/tests/Print.h"
 #include "serve/Dtd.h"
@@ -99,10 +101,77 @@ TEST(KeyReader, refusesKeysThatRepeatOrHaveNoName)
                 }),
                 HasSubstr("found the key K again, expected each key once"));
     EXPECT_THAT(errorOf([&] {
-                    readInstanceName(
-                        elementOf("<INSTANCENAME CLASSNAME=\"C\"><KEYVALUE>a</KEYVALUE></INSTANCENAME>"));
+                    readInstanceName(elementOf("<INSTANCENAME CLASSNAME=\"C\"><KEYVALUE>a</KEYVALUE>" + key +
+                                               "</INSTANCENAME>"));
                 }),
-                HasSubstr("found a key without its name, expected KEYBINDING"));
+                HasSubstr("found a key without its name among others, expected KEYBINDING"));
+    EXPECT_THAT(errorOf([&] {
+                    keyOf(
+                        "<VALUE.REFERENCE><INSTANCENAME CLASSNAME=\"C\"><KEYVALUE>a</KEYVALUE></INSTANCENAME>"
+                        "</VALUE.REFERENCE>");
+                }),
+                HasSubstr("found a key without its name in a reference"));
+}
+
+schema::Classes classes()
+{
+    return schema::Classes(schema::readMof(R"(class CIM_Base { [Key] uint16 Number; };
+                                              class CIM_One : CIM_Base { string Text; };
+                                              class CIM_Many { [Key] string Text; [Key] boolean Flag;
+                                                               [Key] CIM_One REF End; [Key] datetime Time; };)",
+                                           "a.mof")
+                               .classes);
+}
+
+cim::ObjectPath typed(const std::string& className, std::vector<cim::Key> keys)
+{
+    cim::ObjectPath path{"", "", className, std::move(keys)};
+    typeKeys(path, classes());
+    return path;
+}
+
+TEST(TypeKeys, NamesTheOnlyKey)
+{
+    const cim::ObjectPath path = readInstanceName(elementOf(
+        R"(<INSTANCENAME CLASSNAME="cim_one"><KEYVALUE VALUETYPE="numeric">5</KEYVALUE></INSTANCENAME>)"));
+    const cim::ObjectPath whole = typed(path.className, path.keys);
+    EXPECT_EQ(whole, (cim::ObjectPath{"", "", "cim_one", {{"Number", cim::unsignedValue(5, CMPI_uint16)}}}));
+    EXPECT_THAT(errorOf([] {
+                    typed("CIM_Many", {{"", cim::textValue("a")}});
+                }),
+                HasSubstr("the class CIM_Many is not known to have one key"));
+    EXPECT_THAT(errorOf([] {
+                    typed("CIM_None", {{"", cim::textValue("a")}});
+                }),
+                HasSubstr("expected KEYBINDING"));
+}
+
+TEST(TypeKeys, TakesTheTypesThatTheClassDeclares)
+{
+    EXPECT_EQ(typed("CIM_One", {{"number", cim::unsignedValue(7)}}).keys[0].value,
+              cim::unsignedValue(7, CMPI_uint16));
+    const char* const time = "20260101120000.000000+000";
+    EXPECT_EQ(typed("CIM_Many", {{"Time", cim::textValue(time)}}).keys[0].value,
+              cim::textValue(time, CMPI_dateTime));
+}
+
+TEST(TypeKeys, LeavesWhatIsNotOfTheDeclaredType)
+{
+    const auto expectUnchanged = [](const char* className, const char* key, const cim::Value& value) {
+        EXPECT_EQ(typed(className, {{key, value}}).keys[0].value, value) << className << '.' << key;
+    };
+    const cim::Value seven = cim::unsignedValue(7);
+    const cim::Value text = cim::textValue("7");
+    expectUnchanged("CIM_One", "Number", text);
+    expectUnchanged("CIM_One", "Number", cim::unsignedValue(70000));
+    expectUnchanged("CIM_One", "Number", cim::booleanValue(true));
+    expectUnchanged("CIM_One", "Other", seven);
+    expectUnchanged("CIM_None", "Number", seven);
+    for (const char* const key : {"Text", "Flag", "End", "Time"})
+        expectUnchanged("CIM_Many", key, seven);
+    for (const char* const key : {"Flag", "End", "Time"})
+        expectUnchanged("CIM_Many", key, text);
+    expectUnchanged("CIM_Many", "Text", cim::referenceValue({"", "", "CIM_One", {}}));
 }
 
 TEST(NameSpaceReader, joinsNames)

@@ -47,7 +47,7 @@ load machine
 @test "classes and registrations in a folder with a blank" {
     make_machine_of_sfcb
     mkdir -p "$BATS_TEST_TMPDIR/some classes"
-    cp "$SCHEMA"/* "$BATS_TEST_TMPDIR/some classes"
+    cp -r "$SCHEMA"/* "$BATS_TEST_TMPDIR/some classes"
     cd "$BATS_TEST_TMPDIR"
     register 0 --schema-dir "some classes" register
     grep -q "TAVRO_Glimmark.mof" "$CALLS"

@@ -1,32 +1,22 @@
-#include "MofReader.h"
+#include "schema/MofReader.h"
 
+#include "cim/RegularFile.h"
+#include "cim/Utf8.h"
 #include "cim/Values.h"
 
 #include <algorithm>
 #include <array>
-#include <filesystem>
-#include <fstream>
-#include <sstream>
 #include <string_view>
 #include <utility>
 
-namespace schema {
+namespace cimhost::schema {
 namespace {
 
-using cimhost::cim::sameName;
+using cim::sameName;
 
 constexpr std::array intrinsicTypes = {"boolean", "char16", "datetime", "real32", "real64",
                                        "sint16",  "sint32", "sint64",   "sint8",  "string",
                                        "uint16",  "uint32", "uint64",   "uint8"};
-
-/// Lower case, of ASCII.
-std::string lowered(std::string text)
-{
-    for (char& c : text)
-        if (c >= 'A' && c <= 'Z')
-            c = static_cast<char>(c - 'A' + 'a');
-    return text;
-}
 
 bool isLetter(char c)
 {
@@ -37,6 +27,13 @@ bool isDigit(char c)
 {
     return c >= '0' && c <= '9';
 }
+
+/// Both counted from 1, the column in bytes.
+struct Place
+{
+    int line = 1;
+    int column = 1;
+};
 
 struct Token
 {
@@ -50,7 +47,7 @@ struct Token
     };
     Kind kind = End;
     std::string text; ///< of a Text: what it says
-    int line = 0;
+    Place place;
 };
 
 /// Cuts MOF into tokens.
@@ -62,21 +59,22 @@ public:
     Token next()
     {
         skipBlanksAndComments();
-        const int line = line_;
+        const Place place = place_;
         if (rest_.empty())
-            return {Token::End, "the end of the file", line};
+            return {Token::End, "the end of the file", place};
         if (rest_.front() == '"')
-            return {Token::Text, takeText(), line};
+            return {Token::Text, takeText(), place};
         if (isLetter(rest_.front()))
-            return {Token::Name, takeWhile([](char c) { return isLetter(c) || isDigit(c); }), line};
+            return {Token::Name, takeWhile([](char c) { return isLetter(c) || isDigit(c); }), place};
         if (isDigit(rest_.front()) || rest_.front() == '-')
-            return {Token::Number, takeNumber(), line};
-        return {Token::Sign, take(), line};
+            return {Token::Number, takeNumber(), place};
+        return {Token::Sign, take(), place};
     }
 
-    [[noreturn]] void fail(int line, const std::string& what) const
+    [[noreturn]] void fail(Place place, const std::string& what) const
     {
-        throw MofError(fileName_ + ":" + std::to_string(line) + ": " + what);
+        throw MofError(cim::printable(fileName_) + ':' + std::to_string(place.line) + ':' +
+                       std::to_string(place.column) + ": " + what);
     }
 
 private:
@@ -96,12 +94,12 @@ private:
 
     void skipLongComment()
     {
-        const int line = line_;
+        const Place place = place_;
         take();
         take();
         while (!startsWith("*/"))
             if (rest_.empty())
-                fail(line, "the comment has no end");
+                fail(place, "the comment has no end");
             else
                 take();
         take();
@@ -110,12 +108,12 @@ private:
 
     std::string takeText()
     {
-        const int line = line_;
+        const Place place = place_;
         take();
         std::string text;
         for (;;) {
             if (rest_.empty() || rest_.front() == '\n')
-                fail(line, "the text has no closing quote on its line");
+                fail(place, "the text has no closing quote on its line");
             const std::string c = take();
             if (c == "\"")
                 return text;
@@ -126,7 +124,7 @@ private:
     std::string takeEscaped()
     {
         if (rest_.empty() || (rest_.front() != '"' && rest_.front() != '\\'))
-            fail(line_, R"(expected \" or \\ after a backslash)");
+            fail(place_, R"(expected \" or \\ after a backslash)");
         return take();
     }
 
@@ -144,8 +142,7 @@ private:
     std::string take()
     {
         const char c = rest_.front();
-        if (c == '\n')
-            ++line_;
+        place_ = c == '\n' ? Place{place_.line + 1, 1} : Place{place_.line, place_.column + 1};
         rest_.remove_prefix(1);
         return {c};
     }
@@ -161,7 +158,7 @@ private:
 
     std::string_view rest_;
     const std::string& fileName_;
-    int line_ = 1;
+    Place place_;
 };
 
 /// Reads the grammar; `token_` is the one that comes next.
@@ -170,24 +167,18 @@ class Parser
 public:
     Parser(std::string_view text, const std::string& fileName) : scanner_(text, fileName) { advance(); }
 
-    std::vector<Class> parse()
+    Declarations parse()
     {
-        std::vector<Class> classes;
+        Declarations read;
         while (token_.kind != Token::End) {
             if (isSign("#"))
                 skipPragma();
+            else if (isWord("instance"))
+                read.instances.push_back(parseInstance());
             else
-                add(classes, "class", [this] { return parseClass(); });
+                add(read.classes, "class", [this] { return parseClass(); });
         }
-        return classes;
-    }
-
-    std::vector<WrittenInstance> parseInstances()
-    {
-        std::vector<WrittenInstance> instances;
-        while (token_.kind != Token::End)
-            instances.push_back(parseInstance());
-        return instances;
+        return read;
     }
 
 private:
@@ -198,9 +189,12 @@ private:
 
     [[noreturn]] void expected(const std::string& what) const
     {
-        const bool quoted = token_.kind != Token::End;
-        scanner_.fail(token_.line,
-                      "expected " + what + ", found " + (quoted ? "\"" + token_.text + "\"" : token_.text));
+        scanner_.fail(token_.place, "expected " + what + ", found " + found(token_));
+    }
+
+    static std::string found(const Token& token)
+    {
+        return token.kind == Token::End ? token.text : '"' + cim::excerpt(token.text) + '"';
     }
 
     std::string take(Token::Kind kind, const char* what)
@@ -238,11 +232,11 @@ private:
     template <class Named, class Parse>
     void add(std::vector<Named>& list, const char* kind, Parse parseOne)
     {
-        const int line = token_.line;
+        const Place place = token_.place;
         Named read = parseOne();
         if (std::any_of(list.begin(), list.end(),
                         [&](const Named& other) { return sameName(other.name, read.name); }))
-            scanner_.fail(line, std::string("there is already a ") + kind + " " + read.name);
+            scanner_.fail(place, std::string("there is already a ") + kind + " " + read.name);
         list.push_back(std::move(read));
     }
 
@@ -281,11 +275,11 @@ private:
         result.className = take(Token::Name, "the name of the class");
         takeSign("{");
         while (!isSign("}")) {
-            const int line = token_.line;
+            const Place place = token_.place;
             const std::string name = take(Token::Name, "the name of the property");
             takeSign("=");
             if (!result.values.emplace(name, parseValue()).second)
-                scanner_.fail(line, "there is already a value of " + name);
+                scanner_.fail(place, "there is already a value of " + name);
             takeSign(";");
         }
         takeSign("}");
@@ -302,10 +296,10 @@ private:
         }
         result.isArray = takeSignIfThere("{");
         do {
-            const int line = token_.line;
+            const Place place = token_.place;
             const WrittenValue::Kind kind = parseElement(result.elements);
             if (result.elements.size() > 1 && kind != result.kind)
-                scanner_.fail(line, "the elements of the array are of different kinds");
+                scanner_.fail(place, "the elements of the array are of different kinds");
             result.kind = kind;
         } while (result.isArray && takeSignIfThere(","));
         if (result.isArray)
@@ -325,7 +319,7 @@ private:
         }
         if (!isWord("true") && !isWord("false"))
             expected("a value");
-        elements.push_back(lowered(take(Token::Name, "TRUE or FALSE")));
+        elements.push_back(cim::lowerCase(take(Token::Name, "TRUE or FALSE")));
         return WrittenValue::Flag;
     }
 
@@ -333,27 +327,29 @@ private:
     {
         Property result;
         result.qualifiers = parseQualifiers();
-        const int line = token_.line;
+        const Place place = token_.place;
         result.type = take(Token::Name, "the type of a property");
         result.isReference = isWord("ref");
         if (result.isReference)
             advance();
         else
-            result.type = intrinsicType(result.type, line);
+            result.type = intrinsicType(result.type, place);
         result.name = take(Token::Name, "the name of the property");
         if (!result.isReference && takeSignIfThere("[")) {
             takeSign("]");
             result.isArray = true;
         }
+        if (!result.isReference && takeSignIfThere("="))
+            result.defaultValue = parseValue();
         takeSign(";");
         return result;
     }
 
-    [[nodiscard]] std::string intrinsicType(const std::string& word, int line) const
+    [[nodiscard]] std::string intrinsicType(const std::string& word, Place place) const
     {
-        std::string type = lowered(word);
+        std::string type = cim::lowerCase(word);
         if (std::find(intrinsicTypes.begin(), intrinsicTypes.end(), type) == intrinsicTypes.end())
-            scanner_.fail(line, "expected the type of a property, found \"" + word + "\"");
+            scanner_.fail(place, "expected the type of a property, found \"" + cim::excerpt(word) + "\"");
         return type;
     }
 
@@ -397,7 +393,7 @@ private:
             qualifier.values = {take(Token::Number, "a number")};
         } else if (isWord("true") || isWord("false")) {
             qualifier.kind = Parameter::Flag;
-            qualifier.values = {lowered(take(Token::Name, "TRUE or FALSE"))};
+            qualifier.values = {cim::lowerCase(take(Token::Name, "TRUE or FALSE"))};
         } else {
             expected("the value of the qualifier");
         }
@@ -416,36 +412,20 @@ private:
     Token token_;
 };
 
-std::string readText(const std::string& fileName)
-{
-    const std::ifstream file(fileName, std::ios::binary);
-    if (!file || !std::filesystem::is_regular_file(fileName))
-        throw MofError(fileName + ": cannot be read");
-    std::ostringstream text;
-    text << file.rdbuf();
-    return text.str();
-}
-
 } // namespace
 
-std::vector<Class> readMof(const std::string& text, const std::string& fileName)
+Declarations readMof(const std::string& text, const std::string& fileName)
 {
     return Parser(text, fileName).parse();
 }
 
-std::vector<Class> readMofFile(const std::string& fileName)
+Declarations readMofFile(const std::string& fileName)
 {
-    return readMof(readText(fileName), fileName);
+    try {
+        return readMof(cim::RegularFile(fileName).read(maxMofLength), fileName);
+    } catch (const cim::FileError& error) {
+        throw MofError(cim::printable(fileName) + ": cannot be read: " + error.what());
+    }
 }
 
-std::vector<WrittenInstance> readMofInstances(const std::string& text, const std::string& fileName)
-{
-    return Parser(text, fileName).parseInstances();
-}
-
-std::vector<WrittenInstance> readMofInstancesFile(const std::string& fileName)
-{
-    return readMofInstances(readText(fileName), fileName);
-}
-
-} // namespace schema
+} // namespace cimhost::schema
