@@ -22,7 +22,7 @@ std::string readAll(int descriptor)
     std::string text;
     std::array<char, 4096> part{};
     ssize_t count = 0;
-    while ((count = read(descriptor, part.data(), part.size())) > 0 || (count < 0 && errno == EINTR))
+    while ((count = ::read(descriptor, part.data(), part.size())) > 0 || (count < 0 && errno == EINTR))
         if (count > 0)
             text.append(part.data(), static_cast<std::size_t>(count));
     return text;

@@ -214,7 +214,7 @@ std::string statesOf(const cim::Instance& instance)
 {
     const auto health = wordOf(instance, "HealthState");
     const auto alarm = wordOf(instance, "AlarmState");
-    const std::string alarmText = alarm ? "alarm " + std::string(*alarm) : "";
+    std::string alarmText = alarm ? "alarm " + std::string(*alarm) : "";
     if (!health)
         return alarmText;
     return std::string(*health) + (alarm ? ", " : "") + alarmText;
