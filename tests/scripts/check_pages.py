@@ -27,13 +27,14 @@ PROGRAMS = set("cimconfig cimhost cimmof cimserver export glimmark-register sfcb
 TESTED = {
     r"\./test\b": (".ci/run", "./test"),
     r"\S*cimhost (--inventory \S+ )?serve": ("tests/clients/check-run", "serve"),
-    r"wbemcli (-nl )?(ei|ein|gi|ain) ": ("tests/clients/wbemcli_test.py", "wbemcli"),
+    r"wbemcli (-nl )?(ei|ein|gi|ain|gc|ecn) ": ("tests/clients/wbemcli_test.py", "wbemcli"),
     r"kill %1": ("tests/clients/check-run", "kill"),
     r"CIMHOST=\S+ INVENTORIES=\S+ python3 tests/clients/load.py": ("tests/clients/CMakeLists.txt", "load.py"),
     r"cmake --preset rpm ": ("scripts/package", "rpm"),
     r"cpack ": ("scripts/package", "cpack"),
     r"cmake --preset release -DGLIMMARK_CMPI_INCLUDE_DIR=": ("tests/CMakeLists.txt", "CompilesWithOtherHeaders"),
     r"cmake -S . -B build && cmake --build build": ("tests/CheckInstallation.cmake", "--build ${maker}"),
+    r"cmake -S host -B build/host": ("host/CMakeLists.txt", "IsConfiguredAlone"),
     r"cmake --(build --)?preset release": ("scripts/build", "--preset"),
     r"DESTDIR=\S+ cmake --install ": ("tests/CheckInstallation.cmake", "--install"),
     r"g\+\+ .*pkg-config": ("tests/CheckInstallation.cmake", "-Wl,-soname,libtavro-instrumentation.so.1"),
@@ -53,6 +54,7 @@ TESTED = {
 
 # Commands that no test runs.
 EXCUSED = {
+    r"cmake --build build/host|build/host/bin/cimhost ": "builds a second cimhost, and asks a provider of the reader's own",
     r"\./run\b": "installs packages and builds; tests/scripts/build.bats has stand-ins for that",
     r"\.ci/run": "runs this",
     r"apt-get install|systemctl |dpkg ": "changes the machine, as root",
