@@ -6,6 +6,7 @@
 
 #include "Tavro/Locale.h"
 
+#include <HeldOverFork.h>
 #include <ReadFile.h>
 
 #include <MVLog/MVLogger.h>
@@ -72,6 +73,13 @@ private:
 // Set up at compile time and without destructors: any static object may ask for a text.
 std::mutex access; ///< guards `catalogues`
 Catalogues* catalogues = nullptr;
+
+/// Runs before anything that uses the library is set up, and after that of the log, which is asked for with the
+/// lock held: fork() takes the two locks in the same order.
+[[gnu::constructor]] void letChildrenRead()
+{
+    holdOverFork<access>();
+}
 
 /// Runs when the library is unloaded or, at the end of the process, after the static objects of all
 /// that use it are gone.
