@@ -38,7 +38,7 @@ int FileSink::open()
     file_ = std::move(file);
     device_ = status.st_dev;
     inode_ = status.st_ino;
-    writer_.emplace(file_.number(), path_);
+    writer_ = {};
     return 0;
 }
 
@@ -55,7 +55,8 @@ void FileSink::sink_it_(const spdlog::details::log_msg& message)
     formatter_->format(message, line);
 
     const int error = isMoved() ? open() : 0;
-    writer_->write({line.data(), line.size()});
+    if (const int lost = writer_.write(file_.number(), {line.data(), line.size()}); lost != 0)
+        throw spdlog::spdlog_ex("a log line is lost: cannot write to " + path_, lost);
     if (error != 0)
         throw spdlog::spdlog_ex("log lines go on into the file that was moved away: cannot open " + path_,
                                 error);
