@@ -42,9 +42,9 @@ spdlog::level::level_enum severityOf(int level)
 /// Hands a line to a sink. \throw spdlog::spdlog_ex when it cannot be written
 void log(spdlog::sinks::sink& sink, const char* channel, const Line& line)
 {
-    const std::string text = withControlCharactersEscaped(
-        fmt::format("{} {} {} {}() {}:{}: {}", line.level, channel, line.category, orUnknown(line.function),
-                    orUnknown(line.file), line.line, line.text));
+    const std::string text =
+        printable(fmt::format("{} {} {} {}() {}:{}: {}", line.level, channel, line.category,
+                              orUnknown(line.function), orUnknown(line.file), line.line, line.text));
     // Deliberate: the fields one by one. The constructors ask for the thread's number in a way that ends the process
     // where the memory has run out, and that answers a forked child with its parent's. Test:
     // Fork.aChildLogsItsOwnProcessAndThread, RealLibraries.

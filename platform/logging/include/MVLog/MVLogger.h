@@ -28,7 +28,8 @@
 namespace MVLog {
 
 /// Both functions may be called from any thread at any time, also before main and while static
-/// objects are destroyed. A line is written whole, with its control characters escaped. Nothing but
+/// objects are destroyed, and in a child of fork(). A line is written whole, with the characters escaped that drive a
+/// terminal or turn the direction of writing, and U+FFFD in the place of bytes that are not UTF-8. Nothing but
 /// std::bad_alloc is thrown: a line that cannot be written is lost, and the first such loss of a destination
 /// is complained of on standard error. A line below its channel's level costs a comparison.
 ///
