@@ -35,7 +35,7 @@ public:
     /// catalogue the first time it is asked for. Empty: there is none.
     const Messages& of(const std::string& language)
     {
-        const char* const named = std::getenv("TAVRO_CATALOGUES");
+        const char* const named = secure_getenv("TAVRO_CATALOGUES");
         const std::string directory = named != nullptr && *named != '\0' ? named : installed_;
         const std::string file = directory + '/' + language + "/LC_MESSAGES/tavro.mo";
         const auto found = byFile_.find(file);

@@ -28,9 +28,10 @@ FileSink::FileSink(const std::string& path) : path_(absolute(path))
 
 int FileSink::open()
 {
-    // A pipe that nobody reads is refused instead of waited for.
-    Tavro::Descriptor file(
-        ::open(path_.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC | O_NOCTTY | O_NONBLOCK, 0640));
+    // A pipe that nobody reads is refused instead of waited for. A symbolic link is not followed: in a folder where others
+    // may write, it would turn the broker's lines into a file of their choice.
+    Tavro::Descriptor file(::open(
+        path_.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC | O_NOCTTY | O_NONBLOCK | O_NOFOLLOW, 0640));
     struct stat status
     {};
     if (!file.isOpen() || fstat(file.number(), &status) != 0)
@@ -46,7 +47,7 @@ bool FileSink::isMoved() const
 {
     struct stat status
     {};
-    return stat(path_.c_str(), &status) != 0 || status.st_dev != device_ || status.st_ino != inode_;
+    return lstat(path_.c_str(), &status) != 0 || status.st_dev != device_ || status.st_ino != inode_;
 }
 
 void FileSink::sink_it_(const spdlog::details::log_msg& message)

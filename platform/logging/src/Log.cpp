@@ -147,7 +147,7 @@ void open()
 {
     if (theLog != nullptr)
         return;
-    Settings settings = readSettings([](const char* name) { return std::getenv(name); });
+    Settings settings = readSettings([](const char* name) { return secure_getenv(name); });
     auto opened = std::make_unique<Log>();
     opened->categories = std::move(settings.categories);
 

@@ -18,6 +18,9 @@
 /// A value that cannot be used, or an output that cannot be opened, is complained of once on standard
 /// error; the default holds in its place, for an output standard error. An empty variable counts as unset.
 ///
+/// No variable counts in a program that runs with more rights than its caller's (secure_getenv). A file's name may
+/// be no symbolic link.
+///
 /// A file that was moved away or removed is made anew at the next line. Lines beyond what a destination takes
 /// are lost.
 #ifndef MVLOG_MVLOGGER_H
