@@ -51,6 +51,7 @@ void* __libc_malloc(std::size_t size);
 void* __libc_calloc(std::size_t count, std::size_t size);
 void* __libc_realloc(void* memory, std::size_t size);
 
+// NOLINTBEGIN(readability-inconsistent-declaration-parameter-name): the C library's have names that are its own
 void* malloc(std::size_t size)
 {
     return Allocations::failsNow() ? nullptr : __libc_malloc(size);
@@ -65,4 +66,5 @@ void* realloc(void* memory, std::size_t size)
 {
     return Allocations::failsNow() ? nullptr : __libc_realloc(memory, size);
 }
+// NOLINTEND(readability-inconsistent-declaration-parameter-name)
 }

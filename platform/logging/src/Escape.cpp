@@ -1,5 +1,6 @@
 #include "Escape.h"
 
+#include <algorithm>
 #include <array>
 #include <cstddef>
 
@@ -55,10 +56,8 @@ bool isControl(char32_t code)
     // C0; DEL and C1; marks, ends of lines, embeddings and isolates, by which the direction of writing turns.
     static constexpr std::array ranges{Range{0, 0x1F},        Range{0x7F, 0x9F},     Range{0x61C, 0x61C},
                                        Range{0x200E, 0x200F}, Range{0x2028, 0x202E}, Range{0x2066, 0x2069}};
-    for (const auto& [first, last] : ranges)
-        if (code >= first && code <= last)
-            return true;
-    return false;
+    return std::any_of(ranges.begin(), ranges.end(),
+                       [code](const Range& range) { return code >= range.first && code <= range.last; });
 }
 
 std::string escapeOf(char32_t code)

@@ -87,7 +87,7 @@ int LineWriter::write(int descriptor, std::string_view line, std::size_t mostAtO
     const std::string text = (isTorn_ ? "\n" : "") + std::string(line);
     std::string_view rest = text;
     const Clock::time_point deadline =
-        Clock::now() + (isStuck_ ? longestWaitForAReader.zero() : longestWaitForAReader);
+        Clock::now() + (isStuck_ ? std::chrono::milliseconds::zero() : longestWaitForAReader);
     const int error = writeAll(descriptor, rest, mostAtOnce, deadline);
     if (rest.size() < text.size())
         isTorn_ = text[text.size() - rest.size() - 1] != '\n';
