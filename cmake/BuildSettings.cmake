@@ -66,8 +66,10 @@ include(CheckPIESupported)
 check_pie_supported()
 target_link_options(glimmark_settings INTERFACE -Wl,-z,relro -Wl,-z,now -Wl,-z,noexecstack -Wl,-z,text)
 
-# A return address that was overwritten, a stack that grew into other memory and a jump to where no
-# function begins end the process. Not every processor and compiler has all three.
+# A return address that was overwritten and a stack that grew into other memory end the process. cf-protection marks
+# where functions begin, for processors that watch jumps and returns: they do so only where every file of the process has
+# the note for it, the C library's start files too. Those of Debian 12 have none, so there it is of no effect. Not every
+# processor and compiler has all three.
 include(CheckCXXCompilerFlag)
 set(GLIMMARK_PROTECTIONS)
 foreach(protection IN ITEMS stack-protector-strong stack-clash-protection cf-protection)

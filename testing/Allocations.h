@@ -1,6 +1,9 @@
 /// \file
 /// Lets allocations of this process fail, and counts them: operator new of this executable stands before that
 /// of the run-time library, for the provider library too. All functions are about the calling thread alone.
+///
+/// With AllocationsOfC.cpp instead of Allocations.cpp those of C fail too, by which the loader allocates the variables
+/// that each thread has of its own; nothing is counted then.
 #ifndef TESTING_ALLOCATIONS_H
 #define TESTING_ALLOCATIONS_H
 

@@ -1,6 +1,5 @@
 #include "testing/Operations.h"
 
-#include "EntryPoints.h"
 #include "cim/Json.h"
 #include "cim/Values.h"
 
@@ -156,16 +155,6 @@ Operation associationCleanup(CreateAssociationMI create, const std::string& clas
 void PrintTo(const Operation& operation, std::ostream* stream)
 {
     *stream << operation.name;
-}
-
-EntryPoints libraryEntryPoints()
-{
-    return {&GlimmarkProfileProvider_Create_InstanceMI,
-            &GlimmarkCapabilitiesProvider_Create_InstanceMI,
-            &GlimmarkElementCapabilitiesProvider_Create_InstanceMI,
-            &GlimmarkElementCapabilitiesProvider_Create_AssociationMI,
-            &GlimmarkSystemDeviceProvider_Create_InstanceMI,
-            &GlimmarkSystemDeviceProvider_Create_AssociationMI};
 }
 
 std::vector<Operation> allOperations(const EntryPoints& of)

@@ -1,5 +1,6 @@
 # Holds a built shared object or executable to the hardening of cmake/BuildSettings.cmake, as the file shows it. Run as
-#   cmake -DFILE=FILE -DPROTECTIONS="NAME;..." -DFORTIFIED=BOOL -DREADELF=... -DNM=... -DLDD=... -P THIS
+#   cmake -DFILE=FILE -DPROTECTIONS="NAME;..." -DFORTIFIED=BOOL -DCOMPILER=... -DREADELF=... -DNM=... -DLDD=...
+#       -P THIS
 # PROTECTIONS: the compiler's, without the -f.  FORTIFIED: whether the C library's checking functions are in use.
 
 cmake_minimum_required(VERSION 3.20)
@@ -60,4 +61,25 @@ endforeach()
 string(REGEX MATCHALL "(^|\n)(sn?|f|)printf[@ ]" unchecked "${symbols}")
 if(FORTIFIED AND unchecked)
     message(SEND_ERROR "Not the checking functions:${unchecked}")
+endif()
+
+# The note that lets a processor watch jumps and returns is there if all that is linked has it. A file with the note and a
+# start file without it would end at its first call where they are watched.
+if("cf-protection" IN_LIST PROTECTIONS)
+    execute_process(COMMAND ${COMPILER} -print-file-name=crti.o OUTPUT_VARIABLE start OUTPUT_STRIP_TRAILING_WHITESPACE)
+    run_tool(notes ${READELF} --notes --wide ${FILE})
+    run_tool(start_notes ${READELF} --notes --wide ${start})
+    foreach(feature IBT SHSTK)
+        set(in_file OFF)
+        set(in_start OFF)
+        if(notes MATCHES "x86 feature:[^\n]*${feature}")
+            set(in_file ON)
+        endif()
+        if(start_notes MATCHES "x86 feature:[^\n]*${feature}")
+            set(in_start ON)
+        endif()
+        if(NOT in_file STREQUAL in_start)
+            message(SEND_ERROR "Watched jumps and returns, ${feature}: the file's note ${in_file}, the start files' ${in_start}")
+        endif()
+    endforeach()
 endif()

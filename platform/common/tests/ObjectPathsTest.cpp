@@ -2,6 +2,8 @@
 
 #include "FakePath.h"
 
+#include "testing/ForkUnderLoad.h"
+
 #include <cmath>
 #include <functional>
 #include <limits>
@@ -621,6 +623,17 @@ TEST(UnreadableObjectPaths, pathsWithUnreadableDatesEqualNothing)
             path.keys.back().data.value.dateTime = &dateTime.object;
         })) << label;
     }
+}
+
+TEST(ObjectPathsAndNames, childrenForkedAmongThreadsAskToo)
+{
+    constexpr int children = 300;
+    const Path path("TAVRO_Class");
+    const auto ask = [&path] {
+        Tavro::stripSpaces(Tavro::getSystemName());
+        Tavro::isObjPathsEqual(&path.object, &path.object, true);
+    };
+    EXPECT_EQ(Testing::childrenThatReturn(children, ask), children);
 }
 
 } // namespace

@@ -25,7 +25,7 @@ std::vector<std::string> namesIn(const std::string& list)
 
 std::vector<std::string> systemNames()
 {
-    if (const char* const list = std::getenv("TAVRO_COMPUTER_SYSTEMS"))
+    if (const char* const list = secure_getenv("TAVRO_COMPUTER_SYSTEMS"))
         return namesIn(list);
     return {getSystemName()};
 }

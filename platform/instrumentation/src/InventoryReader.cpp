@@ -23,6 +23,7 @@ using Json = nlohmann::json;
 constexpr unsigned int largestNumber = std::numeric_limits<unsigned int>::max();
 constexpr std::size_t longestNameShown = 64;
 constexpr std::size_t longestDetailShown = 200;
+constexpr std::size_t longestRun = 65536;
 
 struct Field
 {
@@ -85,6 +86,28 @@ std::string parserDetail(std::string message, const std::string& lastToken)
     if (message.rfind("parse error", 0) == 0)
         message.erase(0, message.find(": ") + 2);
     return shortened(message, longestDetailShown);
+}
+
+/// The parser copies a text, a number or blanks several times over, escaped too, for the message about a fault behind
+/// them: refuses those that would take many times the memory of the file.
+void refuseLongRuns(std::string_view text)
+{
+    bool isInText = false;
+    std::size_t begin = 0; // of the text, or of whatever stands between two texts, marks or both
+    for (std::size_t i = 0; i < text.size(); ++i) {
+        const char character = text[i];
+        if (character == '"' ||
+            (!isInText && std::string_view("{}[],:").find(character) != std::string_view::npos)) {
+            isInText = isInText != (character == '"');
+            begin = i + 1;
+        } else if (i - begin >= longestRun) {
+            throw InventoryError(lineAndColumn(text, begin + 1) +
+                                 ": expected JSON: a text, a number or blanks of more than " +
+                                 std::to_string(longestRun) + " bytes");
+        } else if (isInText && character == '\\') {
+            ++i; // a quote there ends nothing
+        }
+    }
 }
 
 /// Takes the file in as the parser comes along, and so stops at the first fault: what is nested where
@@ -313,8 +336,12 @@ private:
 
 Inventory readInventory(const std::string& json)
 {
+    refuseLongRuns(json);
     InventoryHandler handler(json);
     Json::sax_parse(json, &handler);
+    // Where a value may begin or the text end, a null character is the end for the parser.
+    if (const std::size_t null = json.find('\0'); null != std::string::npos)
+        throw InventoryError(lineAndColumn(json, null + 1) + ": expected JSON: a null character after it");
     return handler.takeInventory();
 }
 

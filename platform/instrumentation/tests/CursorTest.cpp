@@ -1,6 +1,7 @@
 #include <Tavro/Instrumentation.h>
 
 #include "testing/Environment.h"
+#include "testing/ForkUnderLoad.h"
 #include "testing/RecordedLog.h"
 #include "testing/TemporaryDirectory.h"
 
@@ -278,6 +279,12 @@ TEST_F(Cursor, cursorsOfSeveralThreadsDoNotMeet)
         });
     for (std::thread& thread : threads)
         thread.join();
+}
+
+TEST_F(Cursor, childrenForkedAmongThemReadToo)
+{
+    constexpr int children = 300;
+    EXPECT_EQ(Testing::childrenThatReturn(children, [] { descriptionsOf(36); }), children);
 }
 
 } // namespace

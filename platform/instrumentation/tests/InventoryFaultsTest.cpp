@@ -1,5 +1,6 @@
 #include <Tavro/Instrumentation.h>
 
+#include "testing/Allocations.h"
 #include "testing/Environment.h"
 #include "testing/RecordedLog.h"
 #include "testing/TemporaryDirectory.h"
@@ -183,6 +184,10 @@ INSTANTIATE_TEST_SUITE_P(
         Fault{"{\"nodes\":[{\"path\":\"\xC3\"", "line 1, column 21: expected JSON: "},
         Fault{"{\"nodes\":[{\"path\":\"\xED\xA0\x80\"", "line 1, column 21: expected JSON: "},
         Fault{std::string("{\"nodes\"\0:[]}", 13), "line 1, column 9: expected JSON: "},
+        Fault{std::string("{\"nodes\":[]}\0x", 14),
+              "line 1, column 13: expected JSON: a null character after it"},
+        Fault{std::string("{\"nodes\":[]}\n\0", 14),
+              "line 2, column 1: expected JSON: a null character after it"},
         Fault{"\xFE\xFF", "line 1, column 1: expected JSON: "}));
 
 TEST_F(InventoryFaults, theReportQuotesNoBytesThatAreNoUtf8)
@@ -198,6 +203,39 @@ TEST_F(InventoryFaults, theReportStaysShortWhateverTheFileHolds)
           R"({"nodes":[{")", R"({"nodes":[{"kind":")"})
         for (const char* const end : {"", "\"", "\":"})
             EXPECT_LT(faultIn(beginning + lots + end).size(), 500U) << beginning << end;
+}
+
+TEST_F(InventoryFaults, whatIsTooLongIsRefusedWhereItBegins)
+{
+    const std::string complaint = ": expected JSON: a text, a number or blanks of more than 65536 bytes";
+    const std::string longest(65536, ' ');
+    EXPECT_EQ(faultIn("{\n  \"nodes\": [" + longest + " ]}"), "line 2, column 13" + complaint);
+    EXPECT_EQ(faultIn("{\"nodes\":[{\"path\":\"" + longest + ' '), "line 1, column 20" + complaint);
+    EXPECT_EQ(faultIn("{\"nodes\":[]}" + longest + "\n"), "line 1, column 13" + complaint);
+    EXPECT_THAT(faultIn("{\"nodes\":[" + longest + "x"), StartsWith("line 1, column 11" + complaint));
+    EXPECT_THAT(faultIn("{\"nodes\":[" + longest + "]"),
+                StartsWith("line 1, column 65548: expected JSON: syntax"));
+    EXPECT_EQ(faultIn("{\"nodes\":[{\"path\":\"" + longest + "\"}]}"),
+              "/nodes/0: expected the field \"kind\", found none");
+}
+
+TEST_F(InventoryFaults, theReportTakesLittleMoreMemoryThanTheFile)
+{
+    const std::size_t size = 8UL * 1024 * 1024;
+    std::string escapes;
+    while (escapes.size() < size)
+        escapes += R"(\n)";
+    for (const std::string& content :
+         {'"' + escapes, std::string(size, '\n') + 'x', "{\"nodes\":[" + std::string(size, '\t') + 'x',
+          std::string(size, '9') + 'x', '"' + std::string(size, 'x'), std::string(size, 't'),
+          "{\"$schema\":\"" + std::string(size, 'x') + '\x01'}) {
+        inventory.set(directory.file("inventory.json", content));
+        Allocations::startCounting();
+        Tavro::Instrumentation();
+        const Allocations::Use use = Allocations::stopCounting();
+        EXPECT_LE(use.peak, static_cast<std::ptrdiff_t>(4 * size)) << content.substr(0, 20);
+        EXPECT_THAT(RecordedLog::take(), testing::SizeIs(1));
+    }
 }
 
 const std::string anInventory = R"(: expected an object with the field "nodes" or "sources", found )";

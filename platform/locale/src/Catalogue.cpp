@@ -6,6 +6,7 @@
 
 #include "Tavro/Locale.h"
 
+#include <HeldOverFork.h>
 #include <ReadFile.h>
 
 #include <MVLog/MVLogger.h>
@@ -34,7 +35,7 @@ public:
     /// catalogue the first time it is asked for. Empty: there is none.
     const Messages& of(const std::string& language)
     {
-        const char* const named = std::getenv("TAVRO_CATALOGUES");
+        const char* const named = secure_getenv("TAVRO_CATALOGUES");
         const std::string directory = named != nullptr && *named != '\0' ? named : installed_;
         const std::string file = directory + '/' + language + "/LC_MESSAGES/tavro.mo";
         const auto found = byFile_.find(file);
@@ -72,6 +73,13 @@ private:
 // Set up at compile time and without destructors: any static object may ask for a text.
 std::mutex access; ///< guards `catalogues`
 Catalogues* catalogues = nullptr;
+
+/// Runs before anything that uses the library is set up, and after that of the log, which is asked for with the
+/// lock held: fork() takes the two locks in the same order.
+[[gnu::constructor]] void letChildrenRead()
+{
+    holdOverFork<access>();
+}
 
 /// Runs when the library is unloaded or, at the end of the process, after the static objects of all
 /// that use it are gone.

@@ -14,7 +14,7 @@ constexpr std::string_view defaultLanguage = "en_US";
 std::string_view localeForMessages()
 {
     for (const char* const name : {"LC_ALL", "LC_MESSAGES", "LANG"}) {
-        const char* const value = std::getenv(name);
+        const char* const value = secure_getenv(name);
         if (value != nullptr && *value != '\0')
             return value;
     }

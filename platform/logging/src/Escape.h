@@ -8,8 +8,11 @@
 
 namespace MVLog {
 
-/// Control characters as \xHH: one line stays one line, and a terminal is sent no commands.
-std::string withControlCharactersEscaped(std::string_view text);
+/// The text with every character escaped that acts instead of being seen (control characters, ends of lines and
+/// paragraphs, those that turn the direction of writing), as MOF does, and U+FFFD in the place of each byte that is not
+/// UTF-8: one line stays one line and says what it seems to say, and a terminal is sent no commands. Backslashes stay
+/// as they are.
+std::string printable(std::string_view text);
 
 } // namespace MVLog
 

@@ -6,7 +6,6 @@
 #include "Descriptor.h"
 #include "LineWriter.h"
 
-#include <optional>
 #include <string>
 
 #include <spdlog/details/null_mutex.h>
@@ -40,7 +39,7 @@ private:
     Tavro::Descriptor file_;
     dev_t device_ = 0; ///< of the open file, as the next
     ino_t inode_ = 0;
-    std::optional<LineWriter> writer_;
+    LineWriter writer_;
 };
 
 } // namespace MVLog

@@ -45,8 +45,9 @@ public:
         const std::tm time = spdlog::details::os::localtime(spdlog::log_clock::to_time_t(message.time));
         fmt::format_to(std::back_inserter(datagram), "<{}>{} {:2} {:02}:{:02}:{:02} {}[{}]: {}",
                        LOG_DAEMON | severity(message.level), months.at(static_cast<std::size_t>(time.tm_mon)),
-                       time.tm_mday, time.tm_hour, time.tm_min, time.tm_sec, program_invocation_short_name,
-                       spdlog::details::os::pid(), viewOf(message.payload));
+                       time.tm_mday, time.tm_hour, time.tm_min, time.tm_sec,
+                       printable(program_invocation_short_name), spdlog::details::os::pid(),
+                       viewOf(message.payload));
     }
 
     [[nodiscard]] std::unique_ptr<spdlog::formatter> clone() const override { return syslogFormatter(); }
@@ -59,8 +60,7 @@ public:
     {
         // A value of one line stands behind its name, so no value may have a newline.
         const auto add = [&](const char* field, std::string_view value) {
-            fmt::format_to(std::back_inserter(datagram), "{}={}\n", field,
-                           withControlCharactersEscaped(value));
+            fmt::format_to(std::back_inserter(datagram), "{}={}\n", field, printable(value));
         };
         add("MESSAGE", viewOf(message.payload));
         add("PRIORITY", std::to_string(severity(message.level)));

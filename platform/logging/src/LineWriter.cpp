@@ -1,12 +1,14 @@
 #include "LineWriter.h"
 
+#include <algorithm>
 #include <cerrno>
+#include <chrono>
 #include <csignal>
-#include <cstddef>
 #include <ctime>
+#include <string>
 
-#include <spdlog/common.h>
-
+#include <poll.h>
+#include <sys/socket.h>
 #include <unistd.h>
 
 namespace MVLog {
@@ -44,33 +46,53 @@ private:
     sigset_t before_{};
 };
 
-/// Writes until all is written or an error ends it. \return how much was written; `error` is 0 if all
-std::size_t writeAll(int descriptor, std::string_view text, int& error)
+using Clock = std::chrono::steady_clock;
+constexpr std::chrono::milliseconds longestWaitForAReader{100};
+
+/// \return 0 once the descriptor can be written to or has failed, which writing then tells
+int waitUntilWritable(int descriptor, Clock::time_point deadline)
+{
+    const auto left = std::chrono::ceil<std::chrono::milliseconds>(deadline - Clock::now()).count();
+    pollfd wanted{descriptor, POLLOUT, 0};
+    return poll(&wanted, 1, static_cast<int>(std::max(left, decltype(left){0}))) != 0 ? 0 : EAGAIN;
+}
+
+/// A socket is not waited for, whatever it does for others.
+ssize_t writeSome(int descriptor, std::string_view text)
+{
+    const ssize_t sent = send(descriptor, text.data(), text.size(), MSG_DONTWAIT | MSG_NOSIGNAL);
+    return sent < 0 && errno == ENOTSOCK ? ::write(descriptor, text.data(), text.size()) : sent;
+}
+
+/// Writes until all is written or an error ends it. \return 0, or why the rest was not; `text` is then the rest
+int writeAll(int descriptor, std::string_view& text, std::size_t mostAtOnce, Clock::time_point deadline)
 {
     const WriteSignalsHeldBack guard;
-    std::size_t done = 0;
-    error = 0;
-    while (done < text.size() && error == 0) {
-        const ssize_t written = ::write(descriptor, text.data() + done, text.size() - done);
+    while (!text.empty()) {
+        if (const int error = waitUntilWritable(descriptor, deadline); error != 0)
+            return error;
+        const ssize_t written = writeSome(descriptor, text.substr(0, mostAtOnce));
         if (written >= 0)
-            done += static_cast<std::size_t>(written);
-        else if (errno != EINTR)
-            error = errno;
+            text.remove_prefix(static_cast<std::size_t>(written));
+        else if (errno != EINTR && (errno != EAGAIN || Clock::now() >= deadline))
+            return errno;
     }
-    return done;
+    return 0;
 }
 
 } // namespace
 
-void LineWriter::write(std::string_view line)
+int LineWriter::write(int descriptor, std::string_view line, std::size_t mostAtOnce)
 {
     const std::string text = (isTorn_ ? "\n" : "") + std::string(line);
-    int error = 0;
-    const std::size_t done = writeAll(descriptor_, text, error);
-    if (done > 0)
-        isTorn_ = text[done - 1] != '\n';
-    if (error != 0)
-        throw spdlog::spdlog_ex("a log line is lost: cannot write to " + name_, error);
+    std::string_view rest = text;
+    const Clock::time_point deadline =
+        Clock::now() + (isStuck_ ? std::chrono::milliseconds::zero() : longestWaitForAReader);
+    const int error = writeAll(descriptor, rest, mostAtOnce, deadline);
+    if (rest.size() < text.size())
+        isTorn_ = text[text.size() - rest.size() - 1] != '\n';
+    isStuck_ = error == EAGAIN;
+    return error;
 }
 
 } // namespace MVLog

@@ -7,6 +7,8 @@
 #include "Settings.h"
 #include "StandardErrorSink.h"
 
+#include <HeldOverFork.h>
+
 #include <cstdlib>
 #include <limits>
 #include <memory>
@@ -15,6 +17,8 @@
 #include <vector>
 
 #include <spdlog/fmt/fmt.h>
+
+#include <unistd.h>
 
 namespace MVLog {
 namespace {
@@ -38,13 +42,20 @@ spdlog::level::level_enum severityOf(int level)
 /// Hands a line to a sink. \throw spdlog::spdlog_ex when it cannot be written
 void log(spdlog::sinks::sink& sink, const char* channel, const Line& line)
 {
-    const std::string text = withControlCharactersEscaped(
-        fmt::format("{} {} {} {}() {}:{}: {}", line.level, channel, line.category, orUnknown(line.function),
-                    orUnknown(line.file), line.line, line.text));
-    sink.log({{orUnknown(line.file), line.line, orUnknown(line.function)},
-              line.category,
-              severityOf(line.level),
-              text});
+    const std::string text =
+        printable(fmt::format("{} {} {} {}() {}:{}: {}", line.level, channel, line.category,
+                              orUnknown(line.function), orUnknown(line.file), line.line, line.text));
+    // Deliberate: the fields one by one. The constructors ask for the thread's number in a way that ends the process
+    // where the memory has run out, and that answers a forked child with its parent's. Test:
+    // Fork.aChildLogsItsOwnProcessAndThread, RealLibraries.
+    spdlog::details::log_msg message;
+    message.logger_name = line.category;
+    message.level = severityOf(line.level);
+    message.time = spdlog::log_clock::now();
+    message.thread_id = static_cast<std::size_t>(gettid());
+    message.source = {orUnknown(line.file), line.line, orUnknown(line.function)};
+    message.payload = text;
+    sink.log(message);
 }
 
 /// Says on standard error what is wrong with the log itself.
@@ -125,12 +136,18 @@ struct Log
 std::mutex access; ///< guards the next two
 Log* theLog = nullptr;
 
+/// Runs before anything that uses the library is set up.
+[[gnu::constructor]] void letChildrenLog()
+{
+    Tavro::holdOverFork<access>();
+}
+
 /// Opens the log unless it is open. Needs `access`.
 void open()
 {
     if (theLog != nullptr)
         return;
-    Settings settings = readSettings([](const char* name) { return std::getenv(name); });
+    Settings settings = readSettings([](const char* name) { return secure_getenv(name); });
     auto opened = std::make_unique<Log>();
     opened->categories = std::move(settings.categories);
 

@@ -76,7 +76,7 @@ TEST_F(Daemons, syslogGetsSeverityTimeProgramAndText)
     EXPECT_THAT(daemon.take(),
                 ElementsAre(ContainsRegex("^<27>[JFMASOND][a-z][a-z] [ 123][0-9] [0-9]{2}:[0-9]{2}:[0-9]{2} "
                                           "mvlog-tests\\[[0-9]+\\]: 6000 log Mavrel\\.Test function\\(\\) "
-                                          "File\\.cpp:12: an\\\\x0Aerror$"),
+                                          "File\\.cpp:12: an\\\\nerror$"),
                             HasSubstr("<31>"), HasSubstr("<30>")));
 }
 

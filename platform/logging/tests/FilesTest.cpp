@@ -51,6 +51,31 @@ TEST_F(Files, oneThatIsReplacedIsFollowed)
     EXPECT_THAT(linesIn("log"), ElementsAre("made by the rotation", EndsWith(": after")));
 }
 
+TEST_F(Files, aSymbolicLinkIsNotFollowed)
+{
+    const std::string other = directory.file("other", "");
+    std::filesystem::create_symlink(other, directory.path("log"));
+    EXPECT_THAT(standardErrorOf([] { log(6000, "text"); }),
+                ElementsAre(HasSubstr("MVLOG_FILE: cannot open " + directory.path("log") +
+                                      ": Too many levels of symbolic links"),
+                            EndsWith(": text")));
+    EXPECT_THAT(linesIn("other"), IsEmpty());
+}
+
+TEST_F(Files, aSymbolicLinkThatTakesItsPlaceIsNotFollowed)
+{
+    const std::string other = directory.file("other", "");
+    EXPECT_THAT(standardErrorOf([&] {
+                    log(6000, "before");
+                    std::filesystem::rename(directory.path("log"), directory.path("log.1"));
+                    std::filesystem::create_symlink(other, directory.path("log"));
+                    log(6000, "after");
+                }),
+                ElementsAre(HasSubstr("log lines go on into the file that was moved away")));
+    EXPECT_THAT(linesIn("other"), IsEmpty());
+    EXPECT_THAT(linesIn("log.1"), ElementsAre(EndsWith(": before"), EndsWith(": after")));
+}
+
 TEST_F(Files, oneThatIsRemovedIsMadeAnew)
 {
     EXPECT_THAT(standardErrorOf([&] {

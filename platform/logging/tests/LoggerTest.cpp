@@ -1,10 +1,12 @@
 #include "LoggerTest.h"
 
 #include <algorithm>
+#include <cstring>
 #include <limits>
 #include <string>
 #include <thread>
 #include <type_traits>
+#include <utility>
 #include <vector>
 
 #include <gmock/gmock.h>
@@ -133,7 +135,7 @@ TEST_F(Logger, aComplaintIsOneLineWhateverTheEnvironmentHolds)
 {
     level.set("3000\n\x1B[31m");
     EXPECT_THAT(standardErrorOf([] { log(6000, "text"); }),
-                ElementsAre(HasSubstr("MVLOG_LEVEL is \"3000\\x0A\\x1B[31m\""), EndsWith(": text")));
+                ElementsAre(HasSubstr("MVLOG_LEVEL is \"3000\\n\\x001B[31m\""), EndsWith(": text")));
 }
 
 TEST_F(Logger, appendsToTheFileOfTheEnvironment)
@@ -203,7 +205,38 @@ TEST_F(Logger, survivesAClosedStandardError)
 TEST_F(Logger, escapesControlCharactersAndNothingElse)
 {
     EXPECT_THAT(standardErrorOf([] { log(6000, "a\nb\tc\0d\x7F \xC3\xA4 {} %v \\"s); }),
-                ElementsAre(EndsWith(": a\\x0Ab\\x09c\\x00d\\x7F \xC3\xA4 {} %v \\")));
+                ElementsAre(EndsWith(": a\\nb\\tc\\x0000d\\x007F \xC3\xA4 {} %v \\")));
+}
+
+TEST_F(Logger, escapesWhatDrivesATerminalOrMisleadsAReader)
+{
+    const std::vector<std::pair<std::string, std::string>> shown{
+        {"\x01\b\t\n\f\r\x1F ~\x7F", R"(\x0001\b\t\n\f\r\x001F ~\x007F)"},
+        {"\u0080\u0085\u009B\u009F\u00A0", "\\x0080\\x0085\\x009B\\x009F\u00A0"},
+        {"\u061B\u061C\u200D\u200E\u200F\u2010", "\u061B\\x061C\u200D\\x200E\\x200F\u2010"},
+        {"\u2027\u2028\u2029\u202A\u202E\u202F", "\u2027\\x2028\\x2029\\x202A\\x202E\u202F"},
+        {"\u2065\u2066\u2067\u2068\u2069\u206A", "\u2065\\x2066\\x2067\\x2068\\x2069\u206A"},
+        {"\u07FF\u0800\uD7FF\uE000\uFFFF\U00010000\U0010FFFF",
+         "\u07FF\u0800\uD7FF\uE000\uFFFF\U00010000\U0010FFFF"},
+    };
+    for (const auto& [text, line] : shown) {
+        EXPECT_THAT(standardErrorOf([&, text = text] { log(6000, text); }),
+                    ElementsAre(EndsWith(": " + line)));
+    }
+}
+
+TEST_F(Logger, putsAMarkInThePlaceOfEachByteThatIsNotUtf8)
+{
+    // Cut in the middle, nothing to go on with, one byte too long, too large, a surrogate, no beginning.
+    for (const char* const bytes :
+         {"\xC3", "\xE2\x80", "\xF0\x9F\x98", "\x80", "\xC0\xAF", "\xE0\x9F\xBF", "\xF0\x8F\xBF\xBF",
+          "\xF4\x90\x80\x80", "\xED\xA0\x80", "\xF8\x88\x80\x80\x80", "\xFF"}) {
+        std::string marks;
+        for (std::size_t i = 0; i < std::strlen(bytes); ++i)
+            marks += "\uFFFD";
+        EXPECT_THAT(standardErrorOf([&] { log(6000, bytes + "a"s + bytes); }),
+                    ElementsAre(EndsWith(": " + marks + "a" + marks)));
+    }
 }
 
 TEST_F(Logger, writesLongLinesWhole)

@@ -2,14 +2,21 @@
 
 #include "LoggerTest.h"
 
+#include "testing/WithoutPrivileges.h"
+
 #include <csignal>
+#include <cstdlib>
 #include <string>
+#include <thread>
+#include <vector>
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 #include <fcntl.h>
+#include <sys/socket.h>
 #include <sys/stat.h>
+#include <termios.h>
 #include <unistd.h>
 
 namespace {
@@ -91,7 +98,7 @@ TEST_F(Pipes, oneThatIsReadNoMoreIsComplainedOfOnce)
                 ElementsAre(HasSubstr("a log line is lost: cannot write to " + pipe + ": Broken pipe")));
 }
 
-TEST_F(Pipes, oneThatIsFullIsComplainedOfOnceAndNotWaitedFor)
+TEST_F(Pipes, oneThatIsFullIsComplainedOfOnce)
 {
     const std::string pipe = directory.path("pipe");
     ASSERT_EQ(mkfifo(pipe.c_str(), 0600), 0);
@@ -103,6 +110,86 @@ TEST_F(Pipes, oneThatIsFullIsComplainedOfOnceAndNotWaitedFor)
                     close(reader);
                 }),
                 ElementsAre(HasSubstr("Resource temporarily unavailable")));
+}
+
+/// 4,000 lines of two threads, more than any pipe or socket holds.
+void writeMuch()
+{
+    std::vector<std::thread> threads(2);
+    for (std::thread& thread : threads)
+        thread = std::thread([] {
+            for (int line = 0; line < 2000; ++line)
+                log(6000, std::string(1000, '.'));
+        });
+    for (std::thread& thread : threads)
+        thread.join();
+}
+
+/// Puts one end in the place of standard error and leaves the other to nobody; the descriptors stay open.
+void fill(int unread, int written)
+{
+    alarm(30); // in vain where lines are waited for without end
+    ASSERT_EQ(dup2(written, STDERR_FILENO), STDERR_FILENO);
+    writeMuch();
+
+    const int flags = fcntl(STDERR_FILENO, F_GETFL);
+    EXPECT_EQ(flags & O_NONBLOCK, 0) << "as others that write there want it";
+
+    std::string lines(8 * 1024 * 1024, '\0');
+    ssize_t size = 0;
+    ASSERT_EQ(fcntl(unread, F_SETFL, O_NONBLOCK), 0);
+    EXPECT_GT(read(unread, lines.data(), lines.size()), 0);
+    while ((size = read(unread, lines.data(), lines.size())) > 0)
+        ;
+    log(6000, "read again");
+    size = read(unread, lines.data(), lines.size());
+    ASSERT_GT(size, 0);
+    EXPECT_THAT(lines.substr(0, static_cast<std::size_t>(size)), HasSubstr(": read again\n"));
+}
+
+TEST_F(Pipes, anUnreadStandardErrorStopsNobody)
+{
+    standardErrorOf([] {
+        int ends[2] = {-1, -1};
+        ASSERT_EQ(pipe(ends), 0);
+        fill(ends[0], ends[1]);
+    });
+}
+
+TEST_F(Pipes, anUnreadStandardErrorOfAnotherUserStopsNobody)
+{
+    standardErrorOf([] {
+        int ends[2] = {-1, -1};
+        ASSERT_EQ(pipe(ends), 0);
+        const Testing::WithoutPrivileges nobody;
+        fill(ends[0], ends[1]);
+    });
+}
+
+TEST_F(Pipes, anUnreadSocketAsStandardErrorStopsNobody)
+{
+    standardErrorOf([] {
+        int ends[2] = {-1, -1};
+        ASSERT_EQ(socketpair(AF_UNIX, SOCK_STREAM, 0, ends), 0);
+        fill(ends[0], ends[1]);
+    });
+}
+
+TEST_F(Pipes, anUnreadTerminalAsStandardErrorStopsNobody)
+{
+    standardErrorOf([] {
+        const int terminal = posix_openpt(O_RDWR | O_NOCTTY);
+        ASSERT_GE(terminal, 0);
+        ASSERT_EQ(grantpt(terminal), 0);
+        ASSERT_EQ(unlockpt(terminal), 0);
+        const int shown = open(ptsname(terminal), O_RDWR | O_NOCTTY);
+        ASSERT_GE(shown, 0);
+        termios settings{};
+        ASSERT_EQ(tcgetattr(shown, &settings), 0);
+        cfmakeraw(&settings);
+        ASSERT_EQ(tcsetattr(shown, TCSANOW, &settings), 0);
+        fill(terminal, shown);
+    });
 }
 
 } // namespace

@@ -7,6 +7,9 @@
 #include <dlfcn.h>
 #include <gtest/gtest.h>
 
+#include <sys/wait.h>
+#include <unistd.h>
+
 namespace {
 
 using Testing::contentOf;
@@ -65,6 +68,20 @@ TEST(Unload, theLogFileIsClosed)
     const auto before = openFiles();
     loadLogUnload("text");
     EXPECT_EQ(openFiles(), before);
+}
+
+TEST(Unload, nothingOfItRunsInAForkAfterwards)
+{
+    const TemporaryDirectory directory;
+    const Environment file("MVLOG_FILE", directory.path("log"));
+    loadLogUnload("text");
+    ASSERT_FALSE(isLoaded());
+    const pid_t child = fork();
+    if (child == 0)
+        _exit(0);
+    int status = -1;
+    EXPECT_EQ(waitpid(child, &status, 0), child);
+    EXPECT_EQ(status, 0);
 }
 
 } // namespace

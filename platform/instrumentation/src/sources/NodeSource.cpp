@@ -16,7 +16,7 @@ void appendNodesOf(const std::vector<NodeSource>& sources, std::vector<Node>& no
 
 std::vector<Node> readNodes()
 {
-    const char* const variable = std::getenv("TAVRO_INVENTORY");
+    const char* const variable = secure_getenv("TAVRO_INVENTORY");
     const std::string inventory = variable == nullptr ? "" : variable;
     if (!inventory.empty() && inventory != "sysfs")
         return readNodesOfFile(inventory);

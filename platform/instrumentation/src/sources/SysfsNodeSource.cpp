@@ -11,7 +11,7 @@ namespace {
 
 std::string rootOfSysfs()
 {
-    const char* const root = std::getenv("TAVRO_SYSFS_ROOT");
+    const char* const root = secure_getenv("TAVRO_SYSFS_ROOT");
     return root == nullptr || *root == '\0' ? "/sys" : root;
 }
 

@@ -18,6 +18,9 @@
 /// A value that cannot be used, or an output that cannot be opened, is complained of once on standard
 /// error; the default holds in its place, for an output standard error. An empty variable counts as unset.
 ///
+/// No variable counts in a program that runs with more rights than its caller's (secure_getenv). A file's name may
+/// be no symbolic link.
+///
 /// A file that was moved away or removed is made anew at the next line. Lines beyond what a destination takes
 /// are lost.
 #ifndef MVLOG_MVLOGGER_H
@@ -28,7 +31,8 @@
 namespace MVLog {
 
 /// Both functions may be called from any thread at any time, also before main and while static
-/// objects are destroyed. A line is written whole, with its control characters escaped. Nothing but
+/// objects are destroyed, and in a child of fork(). A line is written whole, with the characters escaped that drive a
+/// terminal or turn the direction of writing, and U+FFFD in the place of bytes that are not UTF-8. Nothing but
 /// std::bad_alloc is thrown: a line that cannot be written is lost, and the first such loss of a destination
 /// is complained of on standard error. A line below its channel's level costs a comparison.
 ///
