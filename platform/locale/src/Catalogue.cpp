@@ -126,7 +126,10 @@ std::optional<std::wstring> findIn(const Messages& messages, const std::string& 
 std::wstring catalogueName(int library, const std::string& language)
 {
     // Names of languages are ASCII; of anything else no catalogue exists, whatever it widens to.
-    return std::to_wstring(library) + separator + std::wstring(language.begin(), language.end());
+    // Widened here, since std::to_wstring() takes a lock of the C library, which a forked child may never get.
+    const std::string number = std::to_string(library);
+    return std::wstring(number.begin(), number.end()) + separator +
+           std::wstring(language.begin(), language.end());
 }
 
 std::optional<std::wstring> findText(const std::wstring& catalogue, const std::wstring& messageId)
