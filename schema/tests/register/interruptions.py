@@ -4,9 +4,9 @@
                                 several questions alike, and where taking back fails, in a third of the calls
     interruptions.py --all      each signal at the beginning and at the end of each call, and at every millisecond
 
-What it claims: 0, as after a run that nobody disturbed; 3 and 4, as before; 5, otherwise, and the last lines say what is
-left; killed by a signal, as before. REGISTER is the program under test, SCHEMA the folder of its classes. The brokers'
-tools are the stand-ins beside this file.
+What it claims: 0, as after a run that nobody disturbed; 3 and 4, as before; 5, otherwise, and the last lines say what
+is left; killed by a signal, as before. REGISTER is the program under test, SCHEMA the folder of its classes. The
+brokers' tools are the stand-ins beside this file.
 """
 
 import argparse
@@ -36,7 +36,7 @@ Case = collections.namedtuple("Case", "name broker before arguments fail", defau
 CASES = [
     Case("SFCB, register", "sfcb", [], ["register"]),
     Case("SFCB, register without restart", "sfcb", [], ["--no-restart", "register"]),
-    Case("SFCB, register in the place of another namespace", "sfcb", ["--namespace", "root/other", "register"], ["register"]),
+    Case("SFCB, register for another namespace", "sfcb", ["register"], ["--namespace", "root/other", "register"]),
     Case("SFCB, unregister", "sfcb", ["register"], ["unregister"]),
     Case("SFCB, register, and no restart succeeds", "sfcb", [], ["register"], "1+ systemctl restart"),
     Case("OpenPegasus, register", "pegasus", [], ["register"]),
@@ -122,15 +122,16 @@ def told_to_be_left(complaints):
 def at_calls(machine, everything):
     """A signal in each call of a tool."""
     kinds = list(itertools.product(SIGNALS, ["begin", "end"]))
-    kept = [number for number, call in enumerate(machine.calls_made, 1) if everything or not asks_again(machine, number)]
-    for number in kept[::3 if machine.case.fail and not everything else 1]:
+    numbers = [number for number in range(1, len(machine.calls_made) + 1)
+               if everything or not asks_again(machine.calls_made[max(number - 2, 0):number])]
+    for number in numbers[::3 if machine.case.fail and not everything else 1]:
         for name, moment in kinds if everything else [kinds[number % len(kinds)]]:
             yield f"{name} at the {moment} of call {number}", machine.run(INTERRUPT_AT=f"{number} {name} {moment}")
 
 
-def asks_again(machine, number):
-    """Is this call one of several questions for a class, and not the first of them?"""
-    return all(call.startswith("cimcli gc") for call in machine.calls_made[max(number - 2, 0):number]) and number > 1
+def asks_again(calls):
+    """Is the last of two calls one of several questions for classes, and not the first of them?"""
+    return len(calls) == 2 and all(call.startswith("cimcli gc") for call in calls)
 
 
 def at_moments(machine, everything):
@@ -190,7 +191,8 @@ def main():
     for case in CASES:
         outcomes = collections.Counter()
         falsehoods += try_case(case, everything, outcomes)
-        print(f"{case.name:50}{sum(outcomes.values()):8}" + "".join(f"{outcomes[kind]:8}" for kind in kinds), flush=True)
+        numbers = [sum(outcomes.values())] + [outcomes[kind] for kind in kinds]
+        print(f"{case.name:50}" + "".join(f"{number:8}" for number in numbers), flush=True)
     print(*falsehoods, sep="\n", end="")
     sys.exit(1 if falsehoods else 0)
 
