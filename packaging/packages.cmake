@@ -120,8 +120,8 @@ endforeach()
 
 set(CPACK_RPM_COMPONENT_INSTALL ON)
 set(CPACK_RPM_FILE_NAME RPM-DEFAULT)
-# What glimmark-register runs; on Debian it is there always.
-set(CPACK_RPM_PROVIDER_PACKAGE_REQUIRES "coreutils, python3")
+# What glimmark-register runs, which on Debian is there always. Its interpreter rpm finds for itself.
+set(CPACK_RPM_PROVIDER_PACKAGE_REQUIRES coreutils)
 set(CPACK_RPM_SUPPORT-DEVELOPMENT_PACKAGE_REQUIRES
     "libtavro-instrumentation.so.1()(64bit), libtavro-common.so.1()(64bit), libtavro-locale.so.1()(64bit), libmvlog.so.1()(64bit)"
 )

@@ -84,7 +84,7 @@ support_libraries_of() {
 
 @test "the packages depend on what glimmark-register needs" {
     dpkg-deb -f "$PACKAGES"/glimmark-provider_*.deb Depends | tr , '\n' | grep -qx ' *python3:any'
-    for needed in python3 coreutils; do
+    for needed in /usr/bin/python3 coreutils; do
         rpm -qp --requires "$PACKAGES"/glimmark-provider-*.rpm | grep -qx "$needed"
     done
 }
