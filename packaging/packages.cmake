@@ -102,7 +102,8 @@ set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS ON)
 # The packages of the support libraries are named below: a dependency on a soname of theirs is met by another's too.
 set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS_PRIVATE_DIRS ${CMAKE_LIBRARY_OUTPUT_DIRECTORY})
 set(support_packages "libtavro-instrumentation1, libtavro-common1, libtavro-locale1, libmvlog1")
-set(CPACK_DEBIAN_PROVIDER_PACKAGE_DEPENDS "${support_packages}")
+# glimmark-register is a Python program.
+set(CPACK_DEBIAN_PROVIDER_PACKAGE_DEPENDS "${support_packages}, python3:any")
 set(CPACK_DEBIAN_PROVIDER_PACKAGE_SUGGESTS cimhost)
 set(CPACK_DEBIAN_COMPUTER-SYSTEM_PACKAGE_DEPENDS "libtavro-common1, libtavro-locale1")
 set(CPACK_DEBIAN_TAVRO-INSTRUMENTATION_PACKAGE_DEPENDS libmvlog1)
@@ -119,17 +120,16 @@ endforeach()
 
 set(CPACK_RPM_COMPONENT_INSTALL ON)
 set(CPACK_RPM_FILE_NAME RPM-DEFAULT)
+# What glimmark-register runs, which on Debian is there always. Its interpreter rpm finds for itself.
+set(CPACK_RPM_PROVIDER_PACKAGE_REQUIRES coreutils)
 set(CPACK_RPM_SUPPORT-DEVELOPMENT_PACKAGE_REQUIRES
     "libtavro-instrumentation.so.1()(64bit), libtavro-common.so.1()(64bit), libtavro-locale.so.1()(64bit), libmvlog.so.1()(64bit)"
 )
-# Folders of the distribution's.
+# Folders of the distribution's package filesystem.
 set(CPACK_RPM_EXCLUDE_FROM_AUTO_FILELIST_ADDITION
     /usr/libexec
     /usr/sbin
     /usr/share/locale
-    /usr/lib64/cmake
-    /usr/lib64/cmpi
-    /usr/lib64/pkgconfig
     /usr/share/man
     /usr/share/man/man1
     /usr/share/man/man8)

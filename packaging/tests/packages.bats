@@ -82,6 +82,27 @@ support_libraries_of() {
     done
 }
 
+@test "the packages depend on what glimmark-register needs" {
+    dpkg-deb -f "$PACKAGES"/glimmark-provider_*.deb Depends | tr , '\n' | grep -qx ' *python3:any'
+    for needed in /usr/bin/python3 coreutils; do
+        rpm -qp --requires "$PACKAGES"/glimmark-provider-*.rpm | grep -qx "$needed"
+    done
+}
+
+# The folders that the package filesystem of a distribution with RPM has.
+of_the_distribution='/usr(/(bin|sbin|include|lib64|share(/(doc|locale(/[^/]+(/LC_MESSAGES)?)?|man(/man.)?))?))?'
+
+@test "each RPM package owns the folders that its files are in" {
+    for package in "$PACKAGES"/*.rpm; do
+        rpm -qlp "$package" | sort >"$BATS_TEST_TMPDIR/owned"
+        grep -qx '/usr/share/doc/.*' "$BATS_TEST_TMPDIR/owned"
+        folders=$(sed -n 's|/[^/]*$||p' "$BATS_TEST_TMPDIR/owned" | sort -u |
+            grep -vxE "$of_the_distribution" | comm -23 - "$BATS_TEST_TMPDIR/owned")
+        echo "$package: $folders"
+        [ -z "$folders" ]
+    done
+}
+
 @test "every package says what it is" {
     for package in "$PACKAGES"/*.deb; do
         dpkg-deb -f "$package" Description | head -n 1

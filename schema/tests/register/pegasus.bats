@@ -184,6 +184,13 @@ END
     done
 }
 
+@test "a class that is put back otherwise than it was is told" {
+    register 0 register
+    echo older >"$BROKER/root/cimv2/class TAVRO_GlimmarkSystemDevice"
+    FAIL="2 cimcli dc" register 5 unregister
+    says "changed since: class TAVRO_GlimmarkSystemDevice in root/cimv2"
+}
+
 @test "an incomplete registration is told, and can be unregistered" {
     cp "$BROKER/root/cimv2/class CIM_AlarmDevice" "$BATS_TEST_TMPDIR/"
     register 0 register

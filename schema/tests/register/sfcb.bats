@@ -134,6 +134,39 @@ END
     is_as_remembered
 }
 
+@test "files that cannot be put back are kept" {
+    stage_an_older_version
+    printf '%s\n' '#!/usr/bin/env bash' '[[ "$*" != *" -- saved/"* ]] && exec /bin/cp "$@"' >"$BROKER/usr/sbin/cp"
+    chmod +x "$BROKER/usr/sbin/cp"
+    export FAIL="1 sfcbrepos -f"
+    run "$REGISTER" register
+    [ "$status" -eq 5 ]
+    says "not put back: what was staged in $stage; it is saved in "
+    says "not put back: the repository in $registered; it is saved in "
+    saved=$(sed -n 's/.*not put back: what was staged .* saved in //p' <<<"$output")
+    grep -qx "# older" "$saved/regs/glimmark.reg"
+    saved=$(sed -n 's/.*not put back: the repository .* saved in //p' <<<"$output")
+    grep -qx "made by a client" "$saved/repository/root/interop/subscriptions"
+}
+
+@test "one that waits for another can be interrupted" {
+    exec 9<"$BROKER/usr/sbin/sfcbstage"
+    flock 9
+    "$REGISTER" register >"$BATS_TEST_TMPDIR/said" 2>&1 3>&- 9<&- &
+    until grep -q "waiting for another glimmark-register" "$BATS_TEST_TMPDIR/said"; do sleep 0.01; done
+    kill -TERM $!
+    wait $! || status=$?
+    [ "$status" -eq 3 ]
+    is_as_remembered
+}
+
+@test "the broker's user can read what is staged" {
+    umask 077
+    register 0 register
+    [ "$(stat -c %a "$stage/regs/glimmark.reg" "$stage/mofs/root/cimv2/TAVRO_Glimmark.mof" | sort -u)" = 644 ]
+    grep -q TAVRO_Glimmark "$BROKER/running"
+}
+
 @test "files that are staged elsewhere are noticed" {
     STAGE_ELSEWHERE=$BATS_TEST_TMPDIR/elsewhere register 4 register
     says "--stage-dir names another directory"
@@ -163,6 +196,18 @@ END
     diff -r "$BROKER/registration" "$BATS_TEST_TMPDIR/registration"
     register 0 register
     register 0 status
+}
+
+@test "a link to a directory of the staging directory" {
+    mv "$stage/mofs/root" "$BROKER/root"
+    ln -s "$BROKER/root" "$stage/mofs/root"
+    ln -s ../root "$BROKER/root/itself"
+    remember_state
+    FAIL="1 sfcbrepos -f" register 4 register
+    is_as_remembered
+    register 0 register
+    register 0 unregister
+    [ -z "$(find "$BROKER/root" -name TAVRO_Glimmark.mof)" ]
 }
 
 @test "staged and not built is not registered" {
