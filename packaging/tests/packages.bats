@@ -90,7 +90,7 @@ support_libraries_of() {
 }
 
 # The folders that the package filesystem of a distribution with RPM has.
-of_the_distribution='/usr(/(bin|sbin|include|lib64|share(/(doc|locale(/[^/]+(/LC_MESSAGES)?)?|man(/man.)?))?))?'
+of_the_distribution='/usr(/(bin|sbin|include|lib64|libexec|share(/(doc|locale(/[^/]+(/LC_MESSAGES)?)?|man(/man.)?))?))?'
 
 @test "each RPM package owns the folders that its files are in" {
     for package in "$PACKAGES"/*.rpm; do
