@@ -27,6 +27,7 @@ std::optional<fs::path> findFile(const std::vector<std::string>& registrationFil
                                  const Surroundings& surroundings)
 {
     std::vector<fs::path> directories;
+    directories.reserve(registrationFiles.size() + 1);
     for (const std::string& file : registrationFiles)
         directories.push_back(fs::path(file).parent_path());
     if (const std::optional<fs::path> schema = findSchemaDirectory(surroundings))

@@ -120,6 +120,7 @@ std::vector<Column> columnsOf(const std::vector<std::string>& names,
 {
     const std::vector<std::string> identifiers = tellingKeyNames(pathsOf(instances));
     std::vector<Column> columns;
+    columns.reserve(names.size());
     for (const std::string& name : names)
         columns.push_back({name, kindOf(name, identifiers, instances)});
     return columns;

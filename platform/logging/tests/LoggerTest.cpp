@@ -214,7 +214,9 @@ TEST_F(Logger, escapesWhatDrivesATerminalOrMisleadsAReader)
         {"\x01\b\t\n\f\r\x1F ~\x7F", R"(\x0001\b\t\n\f\r\x001F ~\x007F)"},
         {"\u0080\u0085\u009B\u009F\u00A0", "\\x0080\\x0085\\x009B\\x009F\u00A0"},
         {"\u061B\u061C\u200D\u200E\u200F\u2010", "\u061B\\x061C\u200D\\x200E\\x200F\u2010"},
+        // NOLINTNEXTLINE(misc-misleading-bidirectional): they are what is escaped.
         {"\u2027\u2028\u2029\u202A\u202E\u202F", "\u2027\\x2028\\x2029\\x202A\\x202E\u202F"},
+        // NOLINTNEXTLINE(misc-misleading-bidirectional)
         {"\u2065\u2066\u2067\u2068\u2069\u206A", "\u2065\\x2066\\x2067\\x2068\\x2069\u206A"},
         {"\u07FF\u0800\uD7FF\uE000\uFFFF\U00010000\U0010FFFF",
          "\u07FF\u0800\uD7FF\uE000\uFFFF\U00010000\U0010FFFF"},
@@ -234,8 +236,11 @@ TEST_F(Logger, putsAMarkInThePlaceOfEachByteThatIsNotUtf8)
         std::string marks;
         for (std::size_t i = 0; i < std::strlen(bytes); ++i)
             marks += "\uFFFD";
-        EXPECT_THAT(standardErrorOf([&] { log(6000, bytes + "a"s + bytes); }),
-                    ElementsAre(EndsWith(": " + marks + "a" + marks)));
+        std::string text = bytes;
+        text.append("a").append(bytes);
+        std::string shown = ": " + marks;
+        shown.append("a").append(marks);
+        EXPECT_THAT(standardErrorOf([&] { log(6000, text); }), ElementsAre(EndsWith(shown)));
     }
 }
 

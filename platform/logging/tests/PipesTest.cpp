@@ -5,6 +5,7 @@
 #include "testing/WithoutPrivileges.h"
 
 #include <csignal>
+#include <cstddef>
 #include <cstdlib>
 #include <string>
 #include <thread>
@@ -135,7 +136,7 @@ void fill(int unread, int written)
     const int flags = fcntl(STDERR_FILENO, F_GETFL);
     EXPECT_EQ(flags & O_NONBLOCK, 0) << "as others that write there want it";
 
-    std::string lines(8 * 1024 * 1024, '\0');
+    std::string lines(std::size_t{8} * 1024 * 1024, '\0');
     ssize_t size = 0;
     ASSERT_EQ(fcntl(unread, F_SETFL, O_NONBLOCK), 0);
     EXPECT_GT(read(unread, lines.data(), lines.size()), 0);

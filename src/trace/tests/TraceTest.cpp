@@ -248,7 +248,7 @@ TEST_F(FunctionTraceTest, KeepsTheLinesOfThreadsApart)
             const std::string name(static_cast<std::size_t>(20 * (i + 1)), static_cast<char>('a' + i));
             for (int round = 0; round < rounds; ++round) {
                 const FunctionTrace flow(
-                    module, name.c_str(), [&] { return name; }, 1);
+                    module, name.c_str(), [&]() -> const std::string& { return name; }, 1);
                 flow.error(name.c_str(), 1);
             }
         });
