@@ -226,12 +226,14 @@ TEST_F(InventoryFaults, theReportTakesLittleMoreMemoryThanTheFile)
     while (escapes.size() < size)
         escapes += R"(\n)";
     for (const std::string& content :
-         {'"' + escapes, std::string(size, '\n') + 'x', "{\"nodes\":[" + std::string(size, '\t') + 'x',
+         {'"' + escapes, std::string(size, '\n') + 'x', R"({"nodes":[)" + std::string(size, '\t') + 'x',
           std::string(size, '9') + 'x', '"' + std::string(size, 'x'), std::string(size, 't'),
-          "{\"$schema\":\"" + std::string(size, 'x') + '\x01'}) {
+          R"({"$schema":")" + std::string(size, 'x') + '\x01'}) {
         inventory.set(directory.file("inventory.json", content));
         Allocations::startCounting();
-        Tavro::Instrumentation();
+        {
+            const Tavro::Instrumentation cursor;
+        }
         const Allocations::Use use = Allocations::stopCounting();
         EXPECT_LE(use.peak, static_cast<std::ptrdiff_t>(4 * size)) << content.substr(0, 20);
         EXPECT_THAT(RecordedLog::take(), testing::SizeIs(1));
