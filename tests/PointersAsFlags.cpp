@@ -1,12 +1,13 @@
-// Compiled by two tests only, which expect the compiler to refuse it: a pointer is no flag.
+// Two tests have the compiler refuse parts of this: a pointer is no flag.
 
 #include "Cmpi.h"
 
-void setWithoutType(const CMPIInstance* instance, const CMPIObjectPath* path, const void* pointer)
+void setWithoutType([[maybe_unused]] const CMPIInstance* instance,
+                    [[maybe_unused]] const CMPIObjectPath* path, [[maybe_unused]] const void* pointer)
 {
-#ifdef OF_A_KEY
+#if defined OF_A_KEY
     Tavro::GlimmarkProvider::Cmpi::addKey(path, "Key", pointer);
-#else
+#elif defined OF_A_PROPERTY
     Tavro::GlimmarkProvider::Cmpi::setProperty(instance, "Property", pointer);
 #endif
 }

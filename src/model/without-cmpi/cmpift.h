@@ -4,6 +4,6 @@
 #ifndef GLIMMARK_WITHOUT_CMPI_H
 #define GLIMMARK_WITHOUT_CMPI_H
 
-typedef struct _CMPIObjectPath CMPIObjectPath;
+using CMPIObjectPath = struct _CMPIObjectPath;
 
 #endif
