@@ -299,7 +299,7 @@ std::vector<std::string> namesOf(const cim::Instance& instance)
     return names;
 }
 
-std::vector<std::string> valuesOf(const std::vector<cim::ObjectPath>& paths, const std::string& key)
+std::vector<std::string> valuesOf(const cim::ObjectPaths& paths, const std::string& key)
 {
     std::vector<std::string> values;
     values.reserve(paths.size());
@@ -308,7 +308,7 @@ std::vector<std::string> valuesOf(const std::vector<cim::ObjectPath>& paths, con
     return values;
 }
 
-std::vector<std::string> valuesOf(const std::vector<cim::Instance>& instances, const std::string& property)
+std::vector<std::string> valuesOf(const cim::Instances& instances, const std::string& property)
 {
     std::vector<std::string> values;
     values.reserve(instances.size());

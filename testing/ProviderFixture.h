@@ -127,9 +127,8 @@ std::string valueOf(const cimhost::cim::Instance& instance, const std::string& p
 std::vector<std::string> namesOf(const cimhost::cim::Instance& instance);
 
 /// The values of one key of several paths.
-std::vector<std::string> valuesOf(const std::vector<cimhost::cim::ObjectPath>& paths, const std::string& key);
-std::vector<std::string> valuesOf(const std::vector<cimhost::cim::Instance>& instances,
-                                  const std::string& property);
+std::vector<std::string> valuesOf(const cimhost::cim::ObjectPaths& paths, const std::string& key);
+std::vector<std::string> valuesOf(const cimhost::cim::Instances& instances, const std::string& property);
 
 /// A property list as a broker hands it over, ended by a null pointer.
 class PropertyNames

@@ -56,7 +56,7 @@ std::string pairAmong(const Items& items)
            valueOf(referenceAmong(items, "PartComponent"), "DeviceID");
 }
 
-inline std::vector<std::string> pairsOf(const std::vector<cimhost::cim::ObjectPath>& paths)
+inline std::vector<std::string> pairsOf(const cimhost::cim::ObjectPaths& paths)
 {
     std::vector<std::string> pairs;
     pairs.reserve(paths.size());
@@ -65,7 +65,7 @@ inline std::vector<std::string> pairsOf(const std::vector<cimhost::cim::ObjectPa
     return pairs;
 }
 
-inline std::vector<std::string> pairsOf(const std::vector<cimhost::cim::Instance>& instances)
+inline std::vector<std::string> pairsOf(const cimhost::cim::Instances& instances)
 {
     std::vector<std::string> pairs;
     pairs.reserve(instances.size());

@@ -76,10 +76,8 @@ void append(cim::Answer& all, cim::Answer more)
 {
     if (all.status.code == CMPI_RC_OK)
         all.status = std::move(more.status);
-    all.paths.insert(all.paths.end(), std::make_move_iterator(more.paths.begin()),
-                     std::make_move_iterator(more.paths.end()));
-    all.instances.insert(all.instances.end(), std::make_move_iterator(more.instances.begin()),
-                         std::make_move_iterator(more.instances.end()));
+    all.paths.append(more.paths);
+    all.instances.append(more.instances);
 }
 
 /// The question as one for a class that derives from the one asked for.
@@ -173,13 +171,9 @@ void keepThoseOf(const std::string& superclass, const schema::Classes& classes, 
     const auto isOther = [&](const std::string& name) {
         return classes.find(name) != nullptr && !classes.isA(name, superclass);
     };
-    answer.paths.erase(std::remove_if(answer.paths.begin(), answer.paths.end(),
-                                      [&](const cim::ObjectPath& path) { return isOther(path.className); }),
-                       answer.paths.end());
-    answer.instances.erase(
-        std::remove_if(answer.instances.begin(), answer.instances.end(),
-                       [&](const cim::Instance& instance) { return isOther(instance.path.className); }),
-        answer.instances.end());
+    answer.paths.removeIf([&](const cim::ObjectPath& path) { return isOther(path.className); });
+    answer.instances.removeIf(
+        [&](const cim::Instance& instance) { return isOther(instance.path.className); });
 }
 
 /// Asks the providers of an association class, or all association providers when there is none.

@@ -47,14 +47,15 @@ bool passStatus(Call& call, const cim::Status& status)
 
 /// The objects of an answer as an enumeration of the caller's; null when the answer is an error.
 template <class Content>
-CMPIEnumeration* enumerate(Call& call, const cim::Status& status, std::vector<Content> objects, CMPIType type)
+CMPIEnumeration* enumerate(Call& call, const cim::Status& status, const cim::SharedList<Content>& objects,
+                           CMPIType type)
 {
     if (!passStatus(call, status))
         return nullptr;
     Scalars elements;
     elements.reserve(objects.size());
-    for (Content& object : objects)
-        elements.emplace_back(std::make_shared<const Content>(std::move(object)));
+    for (const auto& object : objects.shared())
+        elements.emplace_back(object.share());
     return call.make<EnumerationObject>(type, std::move(elements));
 }
 
@@ -66,8 +67,8 @@ CMPIEnumeration* enumeratePaths(const char* service, const CMPIBroker* broker, c
 {
     return serve(service, rc, static_cast<CMPIEnumeration*>(nullptr), [&](Call& call) {
         Broker& asked = called(call, broker, context);
-        cim::Answer answer = ask(asked, pathOf(call, path));
-        return enumerate(call, answer.status, std::move(answer.paths), CMPI_ref);
+        const cim::Answer answer = ask(asked, pathOf(call, path));
+        return enumerate(call, answer.status, answer.paths, CMPI_ref);
     });
 }
 
@@ -78,8 +79,8 @@ CMPIEnumeration* enumerateObjects(const char* service, const CMPIBroker* broker,
 {
     return serve(service, rc, static_cast<CMPIEnumeration*>(nullptr), [&](Call& call) {
         Broker& asked = called(call, broker, context);
-        cim::Answer answer = ask(asked, pathOf(call, path));
-        return enumerate(call, answer.status, std::move(answer.instances), CMPI_instance);
+        const cim::Answer answer = ask(asked, pathOf(call, path));
+        return enumerate(call, answer.status, answer.instances, CMPI_instance);
     });
 }
 
@@ -168,7 +169,7 @@ CMPIObjectPath* createInstance(const CMPIBroker* broker, const CMPIContext* cont
         const auto given = completed(call.use<InstanceObject>(instance, "the instance"));
         const cim::Answer answer = asked.createInstance(pathOf(call, classPath), *given);
         return passStatus(call, answer.status) && !answer.paths.empty()
-                   ? call.make<ObjectPathObject>(CopyOnWrite<cim::ObjectPath>(answer.paths.front()))
+                   ? call.make<ObjectPathObject>(answer.paths.shared().front())
                    : nullptr;
     });
 }
@@ -199,7 +200,7 @@ CMPIEnumeration* execQuery(const CMPIBroker* broker, const CMPIContext* context,
         Broker& asked = called(call, broker, context);
         cim::Answer answer = asked.execQuery(pathOf(call, classPath), call.text(query, "the query"),
                                              call.text(language, "the query language"));
-        return enumerate(call, answer.status, std::move(answer.instances), CMPI_instance);
+        return enumerate(call, answer.status, answer.instances, CMPI_instance);
     });
 }
 

@@ -29,7 +29,7 @@ CMPIObjectPath* newObjectPath(const CMPIBroker* broker, const char* nameSpace, c
         cim::ObjectPath path;
         path.nameSpace = nameSpace == nullptr ? "" : nameSpace;
         path.className = call.text(className, "the class name");
-        return call.make<ObjectPathObject>(CopyOnWrite<cim::ObjectPath>(std::move(path)));
+        return call.make<ObjectPathObject>(cim::CopyOnWrite<cim::ObjectPath>(std::move(path)));
     });
 }
 

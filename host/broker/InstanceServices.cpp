@@ -81,7 +81,7 @@ CMPIObjectPath* getObjectPath(const CMPIInstance* instance, CMPIStatus* rc)
 {
     return serve("CMPIInstanceFT.getObjectPath", rc, static_cast<CMPIObjectPath*>(nullptr), [&](Call& call) {
         const auto& content = call.use<InstanceObject>(instance, theInstance);
-        return call.make<ObjectPathObject>(CopyOnWrite<cim::ObjectPath>(completedPath(content)));
+        return call.make<ObjectPathObject>(cim::CopyOnWrite<cim::ObjectPath>(completedPath(content)));
     });
 }
 

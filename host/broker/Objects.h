@@ -4,9 +4,9 @@
 #ifndef CIMHOST_BROKER_OBJECTS_H
 #define CIMHOST_BROKER_OBJECTS_H
 
-#include "broker/CopyOnWrite.h"
 #include "broker/FunctionTables.h"
 #include "broker/Handle.h"
+#include "cim/CopyOnWrite.h"
 #include "cim/Model.h"
 
 #include <cstddef>
@@ -20,7 +20,7 @@ namespace cimhost {
 
 struct ObjectPathObject
 {
-    CopyOnWrite<cim::ObjectPath> path;
+    cim::CopyOnWrite<cim::ObjectPath> path;
 };
 
 /// An instance under construction. Its path is completed by the rule of `completed` whenever it is
@@ -30,7 +30,7 @@ struct InstanceObject
     explicit InstanceObject(cim::ObjectPath path) : content(cim::Instance{std::move(path), {}}) {}
     explicit InstanceObject(std::shared_ptr<const cim::Instance> shared) : content(std::move(shared)) {}
 
-    CopyOnWrite<cim::Instance> content;
+    cim::CopyOnWrite<cim::Instance> content;
     std::optional<std::vector<std::string>> wanted; ///< the property filter; nothing: every property
     std::vector<std::string> keyNames;              ///< the filter's key list
     /// Those that the class declares, kept by the broker's classes; null: it is not known, or has none.
@@ -86,8 +86,8 @@ struct ArgsObject
 /// What a provider has returned so far, as it was when it returned it.
 struct ResultObject
 {
-    std::vector<std::shared_ptr<const cim::ObjectPath>> paths;
-    std::vector<std::shared_ptr<const cim::Instance>> instances;
+    cim::ObjectPaths paths;
+    cim::Instances instances;
     int doneCount = 0;
 };
 

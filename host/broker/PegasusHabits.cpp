@@ -106,8 +106,8 @@ void keepOnlyWhatWasAskedFor(cim::Answer& answer, const OperationRequest& questi
 {
     if (!question.properties)
         return;
-    for (cim::Instance& instance : answer.instances)
-        keepOnly(instance.properties, *question.properties);
+    answer.instances.edit(
+        [&](cim::Instance& instance) { keepOnly(instance.properties, *question.properties); });
 }
 
 void handInTheHost(OperationRequest& question, const RegisteredClass& /*served*/)

@@ -66,7 +66,7 @@ const CMPIResult* Request::result()
 
 CMPIObjectPath* Request::path(const cim::ObjectPath& path)
 {
-    return make<ObjectPathObject>(implementation_->core, CopyOnWrite<cim::ObjectPath>(path));
+    return make<ObjectPathObject>(implementation_->core, cim::CopyOnWrite<cim::ObjectPath>(path));
 }
 
 CMPIInstance* Request::instance(const cim::Instance& instance)
@@ -86,12 +86,8 @@ cim::Answer Request::answer(const CMPIStatus& status) const
         });
     }
     const ResultObject& content = implementation_->content();
-    answer.paths.reserve(content.paths.size());
-    for (const auto& path : content.paths)
-        answer.paths.push_back(*path);
-    answer.instances.reserve(content.instances.size());
-    for (const auto& instance : content.instances)
-        answer.instances.push_back(*instance);
+    answer.paths = content.paths;
+    answer.instances = content.instances;
     return answer;
 }
 

@@ -45,7 +45,8 @@ CMPIStatus returnInstance(const CMPIResult* result, const CMPIInstance* instance
 {
     return perform("CMPIResultFT.returnInstance", [&](Call& call) {
         ResultObject& content = open(call, result);
-        content.instances.push_back(completed(call.use<InstanceObject>(instance, "the instance")));
+        content.instances.push_back(
+            cim::CopyOnWrite(completed(call.use<InstanceObject>(instance, "the instance"))));
     });
 }
 
@@ -53,7 +54,7 @@ CMPIStatus returnObjectPath(const CMPIResult* result, const CMPIObjectPath* path
 {
     return perform("CMPIResultFT.returnObjectPath", [&](Call& call) {
         ResultObject& content = open(call, result);
-        content.paths.push_back(call.use<ObjectPathObject>(path, "the object path").path.share());
+        content.paths.push_back(call.use<ObjectPathObject>(path, "the object path").path);
     });
 }
 

@@ -176,10 +176,7 @@ CMPIStatus returnWhatTheFilterAsksFor(const CMPIResult* result, const CMPIInstan
         const auto& wanted = call.use<InstanceObject>(instance, "the instance").wanted;
         if (!wanted)
             return;
-        auto& returned = call.use<ResultObject>(result, "the result").instances.back();
-        auto shown = std::make_shared<cim::Instance>(*returned);
-        keepOnly(shown->properties, *wanted);
-        returned = std::move(shown);
+        keepOnly(call.use<ResultObject>(result, "the result").instances.editBack().properties, *wanted);
     });
 }
 
@@ -228,12 +225,11 @@ cim::Value withoutHosts(cim::Value value)
 
 void referWithoutHosts(cim::Answer& answer, const OperationRequest& /*question*/)
 {
-    for (cim::ObjectPath& path : answer.paths)
-        dropHostsOfReferences(path.keys);
-    for (cim::Instance& instance : answer.instances) {
+    answer.paths.edit([](cim::ObjectPath& path) { dropHostsOfReferences(path.keys); });
+    answer.instances.edit([](cim::Instance& instance) {
         dropHostsOfReferences(instance.path.keys);
         dropHostsOfReferences(instance.properties);
-    }
+    });
 }
 
 } // namespace sfcb

@@ -77,7 +77,7 @@ EnvelopeOf<Object>* giveShared(Core& core, const Scalar& scalar)
     const auto* const held = std::get_if<std::shared_ptr<const Content>>(&scalar);
     if (held == nullptr || *held == nullptr)
         return nullptr;
-    return make<Object>(core, Object{CopyOnWrite<Content>(*held)});
+    return make<Object>(core, Object{cim::CopyOnWrite<Content>(*held)});
 }
 
 CMPIInstance* giveInstance(Core& core, const Scalar& scalar)

@@ -4,6 +4,8 @@
 #ifndef CIMHOST_CIM_MODEL_H
 #define CIMHOST_CIM_MODEL_H
 
+#include "cim/SharedList.h"
+
 #include <cmpidt.h>
 
 #include <cstdint>
@@ -70,13 +72,16 @@ struct Status
     std::optional<std::string> message; ///< the provider's own; nothing: it gave none
 };
 
+using ObjectPaths = SharedList<ObjectPath>;
+using Instances = SharedList<Instance>;
+
 /// What a request brought: the status, and the paths or instances that the provider returned, in
 /// its order. A null object that a provider returned is reported as misuse and left out here.
 struct Answer
 {
     Status status;
-    std::vector<ObjectPath> paths;
-    std::vector<Instance> instances;
+    ObjectPaths paths;
+    Instances instances;
 };
 
 /// Names of the properties wanted; nothing: all of them. An empty list: the keys only.

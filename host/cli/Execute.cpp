@@ -64,7 +64,7 @@ std::vector<std::string> missingProperties(const OperationRequest& request, cons
     return missing;
 }
 
-std::vector<std::string> propertyNames(const std::vector<cim::Instance>& instances)
+std::vector<std::string> propertyNames(const cim::Instances& instances)
 {
     std::vector<std::string> names;
     for (const cim::Instance& instance : instances)

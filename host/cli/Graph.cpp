@@ -82,7 +82,7 @@ bool namesByProperties(const cim::ObjectPath& reference, const cim::Instance& in
 class Nodes
 {
 public:
-    explicit Nodes(const std::vector<cim::Instance>& instances) : instances_(instances)
+    explicit Nodes(const cim::Instances& instances) : instances_(instances)
     {
         for (std::size_t index = 0; index < instances.size(); ++index)
             if (instances[index].path.keys.empty())
@@ -111,8 +111,8 @@ public:
         return found;
     }
 
-    [[nodiscard]] const std::vector<cim::Instance>& instances() const { return instances_; }
-    [[nodiscard]] const std::vector<cim::ObjectPath>& missing() const { return missing_; }
+    [[nodiscard]] const cim::Instances& instances() const { return instances_; }
+    [[nodiscard]] const cim::ObjectPaths& missing() const { return missing_; }
 
 private:
     [[nodiscard]] const cim::ObjectPath& pathOf(std::size_t index) const
@@ -120,8 +120,8 @@ private:
         return index < instances_.size() ? instances_[index].path : missing_[index - instances_.size()];
     }
 
-    const std::vector<cim::Instance>& instances_;
-    std::vector<cim::ObjectPath> missing_;
+    const cim::Instances& instances_;
+    cim::ObjectPaths missing_;
     std::unordered_map<std::string, std::vector<std::size_t>> byText_; ///< by cim::lookupText(), ascending
     std::vector<std::size_t> withoutKeys_;
 };

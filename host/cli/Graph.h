@@ -29,7 +29,7 @@ struct Picture
         End to;
     };
 
-    std::vector<cim::Instance> nodes;
+    cim::Instances nodes;
     std::vector<Edge> edges;
     std::vector<std::string> remarks; ///< what could not be shown, and why
 };

@@ -73,7 +73,7 @@ void addOnce(std::vector<std::string>& names, const std::string& name)
         names.push_back(name);
 }
 
-std::vector<std::string> keyNames(const std::vector<cim::ObjectPath>& paths)
+std::vector<std::string> keyNames(const cim::ObjectPaths& paths)
 {
     std::vector<std::string> names;
     for (const cim::ObjectPath& path : paths)
@@ -82,16 +82,16 @@ std::vector<std::string> keyNames(const std::vector<cim::ObjectPath>& paths)
     return names;
 }
 
-std::vector<cim::ObjectPath> pathsOf(const std::vector<cim::Instance>& instances)
+cim::ObjectPaths pathsOf(const cim::Instances& instances)
 {
-    std::vector<cim::ObjectPath> paths;
+    cim::ObjectPaths paths;
     std::transform(instances.begin(), instances.end(), std::back_inserter(paths),
                    [](const cim::Instance& instance) { return instance.path; });
     return paths;
 }
 
 /// Without the keys that only repeat the class and the system, where any other is left.
-std::vector<std::string> tellingKeyNames(const std::vector<cim::ObjectPath>& paths)
+std::vector<std::string> tellingKeyNames(const cim::ObjectPaths& paths)
 {
     static const std::vector<std::string> repeating{"CreationClassName", "SystemCreationClassName",
                                                     "SystemName"};
@@ -103,7 +103,7 @@ std::vector<std::string> tellingKeyNames(const std::vector<cim::ObjectPath>& pat
 }
 
 Column::Kind kindOf(const std::string& name, const std::vector<std::string>& identifiers,
-                    const std::vector<cim::Instance>& instances)
+                    const cim::Instances& instances)
 {
     if (contains(identifiers, name))
         return Column::identifier;
@@ -115,8 +115,7 @@ Column::Kind kindOf(const std::string& name, const std::vector<std::string>& ide
 }
 
 /// A column for each of the names.
-std::vector<Column> columnsOf(const std::vector<std::string>& names,
-                              const std::vector<cim::Instance>& instances)
+std::vector<Column> columnsOf(const std::vector<std::string>& names, const cim::Instances& instances)
 {
     const std::vector<std::string> identifiers = tellingKeyNames(pathsOf(instances));
     std::vector<Column> columns;
@@ -126,7 +125,7 @@ std::vector<Column> columnsOf(const std::vector<std::string>& names,
     return columns;
 }
 
-std::string columnsTable(const std::vector<Column>& columns, const std::vector<cim::Instance>& instances,
+std::string columnsTable(const std::vector<Column>& columns, const cim::Instances& instances,
                          std::size_t width)
 {
     std::vector<cim::Row> rows;
@@ -161,7 +160,7 @@ const std::vector<std::string>& nameNames()
 }
 
 /// Whether the property has another value in each of the instances.
-bool tellsApart(const std::string& property, const std::vector<cim::Instance>& instances)
+bool tellsApart(const std::string& property, const cim::Instances& instances)
 {
     std::set<std::string> values;
     for (const cim::Instance& instance : instances)
@@ -171,7 +170,7 @@ bool tellsApart(const std::string& property, const std::vector<cim::Instance>& i
     return values.size() == instances.size();
 }
 
-bool isAnywhere(const std::string& property, const std::vector<cim::Instance>& instances)
+bool isAnywhere(const std::string& property, const cim::Instances& instances)
 {
     return std::any_of(instances.begin(), instances.end(), [&](const cim::Instance& instance) {
         return cim::findProperty(instance, property) != nullptr;
@@ -180,7 +179,7 @@ bool isAnywhere(const std::string& property, const std::vector<cim::Instance>& i
 
 /// Name, states, then the keys if there is room; where no name tells the instances apart, keys, states, then
 /// the name.
-std::string summaryTable(const std::vector<cim::Instance>& instances, const std::vector<std::string>& states,
+std::string summaryTable(const cim::Instances& instances, const std::vector<std::string>& states,
                          std::size_t width)
 {
     const std::vector<std::string> keys = tellingKeyNames(pathsOf(instances));
@@ -209,7 +208,7 @@ bool hasWord(const cim::Property& property)
     });
 }
 
-std::vector<std::string> wordedProperties(const std::vector<cim::Instance>& instances)
+std::vector<std::string> wordedProperties(const cim::Instances& instances)
 {
     std::vector<std::string> names;
     for (const cim::Instance& instance : instances)
@@ -242,7 +241,7 @@ std::string block(const cim::Instance& instance)
 
 } // namespace
 
-std::string nameTable(const std::vector<cim::ObjectPath>& paths, std::size_t width)
+std::string nameTable(const cim::ObjectPaths& paths, std::size_t width)
 {
     if (paths.empty())
         return "No names.\n";
@@ -270,7 +269,7 @@ std::string nameTable(const std::vector<cim::ObjectPath>& paths, std::size_t wid
     return fittedTable(columns, rows, width);
 }
 
-std::string instanceTable(const std::vector<cim::Instance>& instances, const cim::PropertyList& properties,
+std::string instanceTable(const cim::Instances& instances, const cim::PropertyList& properties,
                           std::size_t width)
 {
     if (instances.empty())
@@ -286,7 +285,7 @@ std::string instanceTable(const std::vector<cim::Instance>& instances, const cim
     return instanceBlocks(instances);
 }
 
-std::string stateTable(const std::vector<cim::Instance>& instances, std::size_t width)
+std::string stateTable(const cim::Instances& instances, std::size_t width)
 {
     if (instances.empty())
         return "No instances.\n";
@@ -307,7 +306,7 @@ std::string valueText(std::string_view property, const cim::Value& value)
     return cellText(property, value, wordOnly);
 }
 
-std::string instanceBlocks(const std::vector<cim::Instance>& instances)
+std::string instanceBlocks(const cim::Instances& instances)
 {
     std::string text;
     for (const cim::Instance& instance : instances)

@@ -27,7 +27,7 @@ std::string text(const cim::Instance& instance)
 
 /// The objects one after the other, the separator between them.
 template <typename Object, typename Show>
-std::string joined(const std::vector<Object>& objects, const char* separator, Show show)
+std::string joined(const cim::SharedList<Object>& objects, const char* separator, Show show)
 {
     std::string result;
     for (const Object& object : objects)
@@ -36,7 +36,7 @@ std::string joined(const std::vector<Object>& objects, const char* separator, Sh
 }
 
 template <typename Object>
-cim::Json jsonList(const std::vector<Object>& objects)
+cim::Json jsonList(const cim::SharedList<Object>& objects)
 {
     cim::Json list = cim::Json::array();
     for (const Object& object : objects)
@@ -44,7 +44,7 @@ cim::Json jsonList(const std::vector<Object>& objects)
     return list;
 }
 
-std::string pathsText(const std::vector<cim::ObjectPath>& paths, Format format, std::size_t width)
+std::string pathsText(const cim::ObjectPaths& paths, Format format, std::size_t width)
 {
     if (format == Format::table)
         return nameTable(paths, width);
@@ -53,8 +53,8 @@ std::string pathsText(const std::vector<cim::ObjectPath>& paths, Format format, 
     return joined(paths, "", [](const cim::ObjectPath& path) { return text(path); });
 }
 
-std::string instancesText(const std::vector<cim::Instance>& instances, const OperationRequest& request,
-                          Format format, std::size_t width)
+std::string instancesText(const cim::Instances& instances, const OperationRequest& request, Format format,
+                          std::size_t width)
 {
     if (format == Format::mof)
         return joined(instances, "\n", [](const cim::Instance& instance) { return cim::mof(instance); });

@@ -22,14 +22,6 @@ std::string newContext()
     return context;
 }
 
-template <class Item>
-std::vector<Item> take(std::vector<Item>& items, std::size_t from, std::size_t most)
-{
-    const auto begin = items.begin() + static_cast<std::ptrdiff_t>(std::min(from, items.size()));
-    const auto end = begin + std::min(static_cast<std::ptrdiff_t>(most), items.end() - begin);
-    return {std::make_move_iterator(begin), std::make_move_iterator(end)};
-}
-
 /// An answer has either paths or instances.
 std::size_t sizeOf(const cim::Answer& answer)
 {
@@ -114,8 +106,8 @@ Reply Enumerations::nextPiece(Place place, std::uint32_t most)
 {
     Held& held = place->second;
     Reply piece;
-    piece.answer.paths = take(held.rest.paths, held.given, most);
-    piece.answer.instances = take(held.rest.instances, held.given, most);
+    piece.answer.paths = held.rest.paths.part(held.given, most);
+    piece.answer.instances = held.rest.instances.part(held.given, most);
     held.given += sizeOf(piece.answer);
     held.end = now_() + held.timeout;
     if (held.given < sizeOf(held.rest))

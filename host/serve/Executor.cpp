@@ -14,13 +14,13 @@ void dropAddedProperties(cim::Answer& answer, const std::string& className, cons
 {
     if (classes.find(className) == nullptr)
         return;
-    for (cim::Instance& instance : answer.instances)
-        instance.properties.erase(
-            std::remove_if(instance.properties.begin(), instance.properties.end(),
-                           [&](const cim::Property& property) {
-                               return classes.originOf(className, property.name).empty();
-                           }),
-            instance.properties.end());
+    const auto isAdded = [&](const cim::Property& property) {
+        return classes.originOf(className, property.name).empty();
+    };
+    answer.instances.edit([&](cim::Instance& instance) {
+        auto& properties = instance.properties;
+        properties.erase(std::remove_if(properties.begin(), properties.end(), isAdded), properties.end());
+    });
 }
 
 cim::Answer ask(const Question& question, Broker& broker)

@@ -136,7 +136,7 @@ Lines departures(const Instance& instance, const Class& declaration, const Class
     return lines;
 }
 
-Lines unusedValues(const std::vector<Instance>& instances, const Class& declaration)
+Lines unusedValues(const cimhost::cim::Instances& instances, const Class& declaration)
 {
     Lines lines;
     for (const Property& property : declaration.properties) {

@@ -25,8 +25,7 @@ std::vector<std::string> departures(const cimhost::cim::Instance& instance, cons
                                     const Classes& classes);
 
 /// The numbers of ValueMaps that no instance has, one line for each property and number.
-std::vector<std::string> unusedValues(const std::vector<cimhost::cim::Instance>& instances,
-                                      const Class& declaration);
+std::vector<std::string> unusedValues(const cimhost::cim::Instances& instances, const Class& declaration);
 
 } // namespace cimhost::schema
 

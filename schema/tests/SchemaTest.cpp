@@ -125,7 +125,7 @@ protected:
         inventory.set(INVENTORY_DIRECTORY "/" + fileName);
     }
 
-    std::vector<ObjectPath> paths()
+    cimhost::cim::ObjectPaths paths()
     {
         Answer answer = broker.enumerateInstanceNames(classPath());
         EXPECT_EQ(answer.status.code, CMPI_RC_OK) << answer.status.message.value_or("");
@@ -133,7 +133,7 @@ protected:
         return answer.paths;
     }
 
-    std::vector<Instance> instances()
+    cimhost::cim::Instances instances()
     {
         Answer answer = broker.enumerateInstances(classPath());
         EXPECT_EQ(answer.status.code, CMPI_RC_OK) << answer.status.message.value_or("");

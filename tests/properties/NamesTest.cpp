@@ -31,13 +31,12 @@ RC_GTEST_PROP(Names, ofSystemDevicesComeAgainForEverySystem, ())
     const auto systems = *Generators::computerSystems();
     Server server(*Generators::inventories(), systems);
     const Server::Paths instances = pathsOf(server.instances(Server::systemDevice));
-    const auto devices = static_cast<std::ptrdiff_t>(server.names(Server::glimmark).size());
+    const std::size_t devices = server.names(Server::glimmark).size();
     Server::Paths expected;
-    auto ofSystem = instances.begin();
-    for (std::size_t system = 0; system < systems.size(); ++system, ofSystem += devices)
+    for (std::size_t system = 0; system < systems.size(); ++system)
         for (std::size_t time = 0; time <= system; ++time)
-            expected.insert(expected.end(), ofSystem, ofSystem + devices);
-    RC_ASSERT(ofSystem == instances.end());
+            expected.append(instances.part(system * devices, devices));
+    RC_ASSERT(instances.size() == systems.size() * devices);
     RC_ASSERT(sameObjects(server.names(Server::systemDevice), expected));
 }
 

@@ -141,7 +141,6 @@ cim::ObjectPath endOf(const cim::Instance& association, const std::string& refer
 Server::Paths pathsOf(const Server::Instances& instances)
 {
     Server::Paths paths;
-    paths.reserve(instances.size());
     for (const cim::Instance& instance : instances)
         paths.push_back(instance.path);
     return paths;

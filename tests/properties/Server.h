@@ -24,8 +24,8 @@ void showValue(const Instance& instance, std::ostream& stream);
 class Server
 {
 public:
-    using Paths = std::vector<cimhost::cim::ObjectPath>;
-    using Instances = std::vector<cimhost::cim::Instance>;
+    using Paths = cimhost::cim::ObjectPaths;
+    using Instances = cimhost::cim::Instances;
     using Properties = cimhost::cim::PropertyList;
 
     static constexpr auto glimmark = "TAVRO_Glimmark";

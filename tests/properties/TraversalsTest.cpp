@@ -101,8 +101,7 @@ RC_GTEST_PROP(Traversals, ofSystemDevicesAgreeFromTheSystem, ())
         checkForms(server, system, fromSystem);
         checkEnds(server, system, fromSystem);
         checkWayBack(server, system, fromSystem, toSystem);
-        const Server::Paths references = server.referenceNames(system, referencesOf(fromSystem));
-        all.insert(all.end(), references.begin(), references.end());
+        all.append(server.referenceNames(system, referencesOf(fromSystem)));
     }
     RC_ASSERT(sameObjects(all, pathsOf(server.instances(Server::systemDevice))));
 }

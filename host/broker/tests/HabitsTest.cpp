@@ -265,8 +265,8 @@ TEST_F(Sfcb, TraversesFromInstancesOnly)
 
 TEST_F(Sfcb, RefersWithoutHosts)
 {
-    cim::Answer answer{{}, {pathWithReference()}, {{pathWithReference(), {}}}};
-    answer.instances[0].properties.push_back({"Of", pathWithReference().keys[0].value});
+    const cim::Property reference{"Of", pathWithReference().keys[0].value};
+    cim::Answer answer{{}, {pathWithReference()}, {{pathWithReference(), {reference}}}};
     shape(&sfcbHabits(), answer, OperationRequest());
     EXPECT_EQ(answer.paths[0].host, "near");
     EXPECT_EQ(referredTo(answer.paths[0].keys).host, "");

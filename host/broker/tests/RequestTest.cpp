@@ -56,6 +56,18 @@ TEST_F(RequestTest, CollectsWhatIsReturnedAsItWasThen)
     expectNoMisuse();
 }
 
+TEST_F(RequestTest, SharesWhatIsReturned)
+{
+    const CMPIResult* const result = request_.result();
+    result->ft->returnObjectPath(result, request_.path(thingPath("one")));
+    result->ft->returnInstance(result,
+                               mb()->eft->newInstance(mb(), request_.path(thingPath("two")), nullptr));
+    const cim::Answer answer = request_.answer({CMPI_RC_OK, nullptr});
+    const cim::Answer again = request_.answer({CMPI_RC_OK, nullptr});
+    EXPECT_EQ(&answer.paths.at(0), &again.paths.at(0));
+    EXPECT_EQ(&answer.instances.at(0), &again.instances.at(0));
+}
+
 TEST_F(RequestTest, KeepsResultsBesideAnErrorStatus)
 {
     const CMPIResult* const result = request_.result();

@@ -15,8 +15,7 @@ using testing::IsEmpty;
 
 namespace {
 
-std::vector<std::string> textsOf(const std::vector<cim::Instance>& before,
-                                 const std::vector<cim::Instance>& now)
+std::vector<std::string> textsOf(const cim::Instances& before, const cim::Instances& now)
 {
     std::vector<std::string> texts;
     for (const Change& change : changesBetween(before, now))

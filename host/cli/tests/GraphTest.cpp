@@ -33,7 +33,7 @@ cim::Instance link(cim::Value left, cim::Value right)
     return {{"", "root/cimv2", "CIM_Link", {}}, {{"Left", std::move(left)}, {"Right", std::move(right)}}};
 }
 
-std::string graphOf(const std::vector<cim::Instance>& instances)
+std::string graphOf(const cim::Instances& instances)
 {
     Picture picture;
     for (const cim::Instance& instance : instances)
@@ -222,7 +222,7 @@ std::size_t count(const std::string& text, const std::string& part)
 TEST(Dot, drawsManyNodesAndEdges)
 {
     constexpr std::size_t most = 20000;
-    std::vector<cim::Instance> instances;
+    cim::Instances instances;
     for (std::size_t i = 0; i < most; ++i) {
         const std::string id = std::to_string(i);
         instances.push_back(led(id, 5));

@@ -29,10 +29,10 @@ cim::Instance device(const std::string& id, std::uint64_t health, std::vector<Va
              {"Caption", cim::textValue("c")}}};
 }
 
-const std::vector<cim::Instance>& devices()
+const cim::Instances& devices()
 {
-    static const std::vector<cim::Instance> list{device("a", 5, {std::uint64_t{2}, std::uint64_t{11}}),
-                                                 device("b", 99, {std::uint64_t{3}})};
+    static const cim::Instances list{device("a", 5, {std::uint64_t{2}, std::uint64_t{11}}),
+                                     device("b", 99, {std::uint64_t{3}})};
     return list;
 }
 
@@ -47,8 +47,8 @@ TEST(InstanceTable, showsAlarmDevicesInWords)
 
 TEST(InstanceTable, showsTheKeysFirstWhereNoNameTellsTheInstancesApart)
 {
-    std::vector<cim::Instance> instances = devices();
-    instances[1].properties[1].value = instances[0].properties[1].value;
+    cim::Instances instances = devices();
+    instances.editBack().properties[1].value = instances[0].properties[1].value;
     EXPECT_EQ(instanceTable(instances, std::nullopt),
               "DeviceID  HealthState  OperationalStatus  AlarmState  Name\n"
               "--------  -----------  -----------------  ----------  -----\n"
@@ -58,8 +58,8 @@ TEST(InstanceTable, showsTheKeysFirstWhereNoNameTellsTheInstancesApart)
 
 TEST(InstanceTable, fitsTheTerminal)
 {
-    const std::vector<cim::Instance> instances{device("chassis-1/system-board-1/a", 5, {std::uint64_t{2}}),
-                                               device("chassis-1/system-board-1/b", 10, {std::uint64_t{3}})};
+    const cim::Instances instances{device("chassis-1/system-board-1/a", 5, {std::uint64_t{2}}),
+                                   device("chassis-1/system-board-1/b", 10, {std::uint64_t{3}})};
     const auto heading = [&](std::size_t width) {
         const std::string table = instanceTable(instances, std::nullopt, width);
         return table.substr(0, table.find('\n'));
@@ -107,7 +107,7 @@ TEST(InstanceTable, showsRepeatingKeysWhereNoOtherTellsTheInstancesApart)
 TEST(InstanceTable, showsOtherInstancesAsBlocks)
 {
     const cim::ObjectPath end{"", "", "CIM_Led", {{"N", cim::unsignedValue(1)}}};
-    const std::vector<cim::Instance> instances{
+    const cim::Instances instances{
         {{"", "root/cimv2", "CIM_Link", {}},
          {{"Left", cim::referenceValue(end)},
           {"AlarmState", cim::unsignedValue(2, CMPI_uint16)},
@@ -131,8 +131,9 @@ TEST(InstanceTable, showsOtherInstancesAsBlocks)
 
 TEST(InstanceTable, isNotForDevicesIfOneInstanceIsNone)
 {
-    std::vector<cim::Instance> instances = devices();
-    instances.back().properties.erase(instances.back().properties.begin() + 2); // HealthState
+    cim::Instances instances = devices();
+    std::vector<cim::Property>& properties = instances.editBack().properties;
+    properties.erase(properties.begin() + 2); // HealthState
     EXPECT_EQ(instanceTable(instances, std::nullopt), instanceBlocks(instances));
 }
 
@@ -145,7 +146,7 @@ TEST(InstanceTable, saysSoIfThereIsNothing)
 
 TEST(NameTable, hasAColumnForEachKey)
 {
-    const std::vector<cim::ObjectPath> paths{
+    const cim::ObjectPaths paths{
         {"srv", "root/cimv2", "CIM_A", {{"Name", cim::textValue("x")}, {"Number", cim::unsignedValue(1)}}},
         {"", "root/cimv2", "cim_a", {{"NUMBER", cim::unsignedValue(2)}}}};
     EXPECT_EQ(nameTable(paths), "Name  Number\n"

@@ -20,7 +20,7 @@ using testing::StartsWith;
 
 namespace {
 
-cim::Answer answerOf(std::vector<cim::Instance> instances)
+cim::Answer answerOf(cim::Instances instances)
 {
     return {{}, {}, std::move(instances)};
 }
@@ -88,7 +88,7 @@ TEST(View, takesMarksAwayAfterSomeAnswers)
 TEST(View, showsWhatIsMarkedOrNotWellWhereNotAllFit)
 {
     Watched watched;
-    std::vector<cim::Instance> lamps;
+    cim::Instances lamps;
     for (char name = 'a'; name <= 'z'; ++name)
         lamps.push_back(lamp(std::string(1, name), name == 'y' ? 25 : 5));
     watched.take(answerOf(lamps), "12:00");

@@ -15,7 +15,7 @@ namespace {
 
 using ByPath = std::map<std::string, const cim::Instance*>;
 
-ByPath byPath(const std::vector<cim::Instance>& instances)
+ByPath byPath(const cim::Instances& instances)
 {
     ByPath found;
     for (const cim::Instance& instance : instances)
@@ -80,8 +80,7 @@ std::string eventText(const Change& change)
 
 } // namespace
 
-std::vector<Change> changesBetween(const std::vector<cim::Instance>& before,
-                                   const std::vector<cim::Instance>& now)
+std::vector<Change> changesBetween(const cim::Instances& before, const cim::Instances& now)
 {
     const ByPath former = byPath(before);
     const ByPath present = byPath(now);

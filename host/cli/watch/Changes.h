@@ -31,8 +31,7 @@ struct Change
 /// What happened from one answer to the next: first what altered and appeared, in the order of the next
 /// answer and of an instance's properties; then what vanished, in the order of the first. Instances are the
 /// same by their paths, properties by their names.
-std::vector<Change> changesBetween(const std::vector<cim::Instance>& before,
-                                   const std::vector<cim::Instance>& now);
+std::vector<Change> changesBetween(const cim::Instances& before, const cim::Instances& now);
 
 /// The change in one line that may go to a terminal: the keys that tell the instance, and what happened.
 /// States are in words.

@@ -65,7 +65,7 @@ private:
     bool isWide_;
     std::string time_;
     std::string error_; ///< of the last answer; empty: it had none
-    std::vector<cim::Instance> instances_;
+    cim::Instances instances_;
     std::map<std::string, Mark> marks_; ///< by the look-up text of the path
     std::vector<Seen> recent_;          ///< the last changes, newest last
     std::vector<std::string> messages_; ///< the last ones, newest last

@@ -102,7 +102,7 @@ TEST_F(PulledEnumerations, EndWithTheLastItem)
 TEST_F(PulledEnumerations, HaveInstancesAsWell)
 {
     cim::Answer answer;
-    answer.instances.resize(3);
+    answer.instances = {{}, {}, {}};
     Question question = about(Step::open, "", 1);
     question.items = Items::instancesWithPaths;
     const Reply first = enumerations.open(question, answer);

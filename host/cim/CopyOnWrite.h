@@ -1,12 +1,12 @@
 /// \file
 /// A value that is copied by reference until somebody changes it.
-#ifndef CIMHOST_BROKER_COPYONWRITE_H
-#define CIMHOST_BROKER_COPYONWRITE_H
+#ifndef CIMHOST_CIM_COPYONWRITE_H
+#define CIMHOST_CIM_COPYONWRITE_H
 
 #include <memory>
 #include <utility>
 
-namespace cimhost {
+namespace cimhost::cim {
 
 /// Holds a T that others may share as unchangeable; changing it copies it first if anybody does.
 template <class T>
@@ -38,6 +38,6 @@ private:
     T* own_ = nullptr; ///< the value, when it was made here and may thus be changed here
 };
 
-} // namespace cimhost
+} // namespace cimhost::cim
 
 #endif
