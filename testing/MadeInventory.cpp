@@ -21,6 +21,7 @@ struct State
 std::mutex mutex;
 State state;
 std::atomic<int> cursors{0};
+std::atomic<int> selected{0};
 std::atomic<unsigned int> lastValue{0};
 
 } // namespace
@@ -41,6 +42,11 @@ void throwAt(std::optional<std::size_t> position, std::exception_ptr exception)
 int openCursors()
 {
     return cursors;
+}
+
+int selections()
+{
+    return selected;
 }
 
 unsigned int valueBeforeGetProperty()
@@ -81,6 +87,7 @@ Instrumentation::~Instrumentation()
 
 void Instrumentation::selectNode(NodeLexicon::NodeType kind)
 {
+    ++MadeInventory::selected;
     implementation_->kind = kind;
     implementation_->position = 0;
     implementation_->skipOthers();

@@ -29,6 +29,9 @@ void throwAt(std::optional<std::size_t> position, std::exception_ptr exception);
 /// Cursors made and not yet destroyed.
 int openCursors();
 
+/// How often a kind was selected, by all cursors: an inventory library may read the hardware each time.
+int selections();
+
 /// What a getProperty read into `value` before it was answered, at the last call.
 unsigned int valueBeforeGetProperty();
 

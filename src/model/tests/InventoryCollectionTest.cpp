@@ -169,6 +169,13 @@ TEST_F(InventoryCollection, OnlyIndicatorsAreCollectedInTheInventorysOrder)
     EXPECT_THAT(namesOf(collected), ElementsAre("c", "a", "b"));
 }
 
+TEST_F(InventoryCollection, SelectsTheIndicatorsOnce)
+{
+    const int before = MadeInventory::selections();
+    collect({{"a", "1"}, {"b", "2"}}, 0);
+    EXPECT_EQ(MadeInventory::selections(), before + 1);
+}
+
 TEST_F(InventoryCollection, DuplicatesAreKept)
 {
     EXPECT_THAT(collect({{"a", "p"}, {"a", "p"}}, 0), SizeIs(2));
