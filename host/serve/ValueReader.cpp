@@ -12,6 +12,7 @@
 #include <charconv>
 #include <limits>
 #include <optional>
+#include <set>
 
 namespace cimhost::serve {
 
@@ -199,12 +200,22 @@ cim::Value readAnyKeyValue(const Element& element)
     return element.name == "KEYVALUE" ? readKeyValue(element) : cim::referenceValue(readReference(element));
 }
 
-void readKey(const Element& element, cim::ObjectPath& path)
+/// Names that were given so far. Of thousands each is found in some steps, whatever they are: a client that knows
+/// how a hash is made would choose those that collide.
+using GivenNames = std::set<std::string>;
+
+/// Whether it was not there, in any letter case.
+bool add(GivenNames& given, const std::string& name)
+{
+    return given.insert(cim::lowerCase(name)).second;
+}
+
+void readKey(const Element& element, GivenNames& given, cim::ObjectPath& path)
 {
     const std::string& name = attribute(element, "NAME");
     if (name.empty())
         failAt(element, "an empty NAME", "the name of a key");
-    if (cim::findKey(path, name) != nullptr)
+    if (!add(given, name))
         throw ValueError(element, "the key " + cim::excerpt(name) + " again", "each key once");
     path.keys.push_back({name, readAnyKeyValue(onlyChild(element, {"KEYVALUE", "VALUE.REFERENCE"}))});
 }
@@ -314,11 +325,13 @@ private:
         return readScalar(item, type);
     }
 
-    /// An embedded instance is a document in the text, which counts as one level of depth.
+    /// An embedded instance is a document in the text, all of which is read once more: it counts as several
+    /// levels of depth.
     cim::Instance readEmbedded(const Element& item)
     {
         try {
-            const XmlLimits limits{limits_.depth > 1 ? limits_.depth - 1 : 1, limits_.elements};
+            XmlLimits limits = limits_;
+            limits.depth -= std::min(limits.depth, levelsOfEmbedded);
             const Element document = parseXml(textOf(item), limits, &isKnownElement);
             if (document.name != "INSTANCE")
                 throw ValueError(item, document.name, "an embedded INSTANCE");
@@ -327,6 +340,8 @@ private:
             throw ValueError(item, "text that is no embedded instance", error.what());
         }
     }
+
+    static constexpr std::size_t levelsOfEmbedded = 8;
 
     const XmlLimits& limits_;
 };
@@ -357,9 +372,10 @@ std::string readNameSpace(const Element& element)
 cim::ObjectPath readInstanceName(const Element& element)
 {
     cim::ObjectPath path{"", "", attribute(element, "CLASSNAME"), {}};
+    GivenNames given;
     for (const Element& key : childrenAmong(element, {"KEYBINDING", "KEYVALUE", "VALUE.REFERENCE"})) {
         if (key.name == "KEYBINDING")
-            readKey(key, path);
+            readKey(key, given, path);
         else if (element.children.size() == 1)
             path.keys.push_back({"", readAnyKeyValue(key)});
         else
@@ -395,12 +411,13 @@ cim::Instance readInstance(const Element& element, const XmlLimits& limits)
     cim::Instance instance;
     instance.path.className = attribute(element, "CLASSNAME");
     PropertyReader reader(limits);
+    GivenNames given;
     for (const Element& child :
          childrenAmong(element, {"QUALIFIER", "PROPERTY", "PROPERTY.ARRAY", "PROPERTY.REFERENCE"})) {
         if (child.name == "QUALIFIER")
             continue;
         const std::string& name = attribute(child, "NAME");
-        if (cim::findProperty(instance, name) != nullptr)
+        if (!add(given, name))
             throw ValueError(child, "the property " + cim::excerpt(name) + " again", "each property once");
         instance.properties.push_back({name, reader.read(child)});
     }

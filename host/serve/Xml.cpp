@@ -31,20 +31,14 @@ std::string place(int line, int column)
 /// Text in UTF-8 without null characters is all that XML can be; the library would guess at anything else.
 void requireText(std::string_view document)
 {
-    int line = 1;
-    int column = 1;
-    while (!document.empty()) {
-        const std::optional<char32_t> character = cim::takeCharacter(document);
+    for (std::string_view rest = document; !rest.empty();) {
+        const std::size_t position = document.size() - rest.size();
+        const std::optional<char32_t> character = cim::takeCharacter(rest);
         if (!character || *character == 0)
             throw RequestError(Fault::notWellFormed,
-                               place(line, column) + "found " +
+                               placeAt(document, position) + "found " +
                                    (character ? "a null character" : "a byte that is not UTF-8") +
                                    ", expected text in UTF-8");
-        ++column;
-        if (*character == '\n') {
-            ++line;
-            column = 1;
-        }
     }
 }
 
@@ -53,9 +47,8 @@ void requireText(std::string_view document)
 class Builder
 {
 public:
-    Builder(std::string_view document, const XmlLimits& limits, bool (*isKnown)(std::string_view))
-        : limits_(limits),
-          isKnown_(isKnown),
+    Builder(std::string_view document, bool (*isKnown)(std::string_view))
+        : isKnown_(isKnown),
           parser_(newParser(document), &xmlFreeParserCtxt)
     {}
 
@@ -137,13 +130,11 @@ private:
     void stopAt(const xmlError& error) const;
     [[noreturn]] void fail(Fault fault, const std::string& what) const;
 
-    XmlLimits limits_;
     bool (*isKnown_)(std::string_view);
     Element root_; ///< the document's element is its child
     /// From the root inwards. An element's children stay where they are while it is the innermost.
     std::vector<Element*> open_{&root_};
     std::size_t ignoredDepth_ = 0; ///< how many elements inwards of an unknown one, itself included
-    std::size_t count_ = 0;
     std::exception_ptr failure_;
     std::unique_ptr<xmlParserCtxt, decltype(&xmlFreeParserCtxt)> parser_;
 };
@@ -181,11 +172,6 @@ void Builder::checkEncoding() const
 
 void Builder::start(std::string name, int attributeCount, const xmlChar** attributes)
 {
-    if (++count_ > limits_.elements)
-        fail(Fault::tooLarge, "expected at most " + std::to_string(limits_.elements) + " elements");
-    if (open_.size() + ignoredDepth_ > limits_.depth)
-        fail(Fault::tooLarge,
-             "expected elements at most " + std::to_string(limits_.depth) + " deep in each other");
     if (ignoredDepth_ > 0 || !isKnown_(name)) {
         ++ignoredDepth_;
         return;
@@ -244,7 +230,8 @@ Element parseXml(std::string_view document, const XmlLimits& limits, bool (*isKn
     if (document.size() > std::numeric_limits<int>::max())
         throw RequestError(Fault::tooLarge, "expected a document of less than 2 GiB");
     requireText(document);
-    return Builder(document, limits, isKnown).build();
+    requireWithin(limits, document);
+    return Builder(document, isKnown).build();
 }
 
 } // namespace cimhost::serve

@@ -3,7 +3,8 @@
 #ifndef CIMHOST_SERVE_XML_H
 #define CIMHOST_SERVE_XML_H
 
-#include <cstddef>
+#include "serve/XmlLimits.h"
+
 #include <string>
 #include <string_view>
 #include <vector>
@@ -25,15 +26,8 @@ struct Element
     std::string text; ///< all that stands directly in it, references and CDATA sections resolved
 };
 
-/// What a document may have at most.
-struct XmlLimits
-{
-    std::size_t depth = 64;       ///< elements in each other; a reference in a reference takes four
-    std::size_t elements = 20000; ///< in the whole document
-};
-
-/// Reads a document in UTF-8. Nothing is read besides it, and no entity but XML's own five is known: a
-/// document type declaration ends the reading at once.
+/// Reads a document in UTF-8 that is within the limits. Nothing is read besides it, and no entity but XML's own
+/// five is known: a document type declaration ends the reading at once.
 /// \param isKnown  an element for which it is false is left out, with all that is in it
 /// \throws RequestError  notWellFormed, notValid or tooLarge; notLooselyValid when nothing is left
 Element parseXml(std::string_view document, const XmlLimits& limits, bool (*isKnown)(std::string_view name));

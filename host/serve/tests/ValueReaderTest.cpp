@@ -296,15 +296,27 @@ TEST(PropertyReader, boundsInstancesEmbeddedInEachOther)
             result += byte == '<' ? "&lt;" : byte == '&' ? "&amp;" : std::string(1, byte);
         return result;
     };
-    for (int depth = 0; depth < 6; ++depth)
-        document =
-            R"(<INSTANCE CLASSNAME="B"><PROPERTY NAME="P" TYPE="string" EmbeddedObject="instance"><VALUE>)" +
-            escaped(document) + "</VALUE></PROPERTY></INSTANCE>";
-    EXPECT_EQ(errorOf([&] { readInstance(elementOf(document), {10, 100}); }), "");
-    EXPECT_THAT(errorOf([&] {
-                    readInstance(elementOf(document), {6, 100});
-                }),
-                HasSubstr("deep in each other"));
+    const auto embed = [&](const std::string& inside) {
+        return R"(<INSTANCE CLASSNAME="B"><PROPERTY NAME="P" TYPE="string" EmbeddedObject="instance"><VALUE>)" +
+               escaped(inside) + "</VALUE></PROPERTY></INSTANCE>";
+    };
+    for (int depth = 0; depth < 7; ++depth)
+        document = embed(document);
+    EXPECT_EQ(errorOf([&] { readInstance(elementOf(document), {}); }), "");
+    EXPECT_THAT(errorOf([&] { readInstance(elementOf(embed(document)), {}); }), HasSubstr("deep in each other"));
+}
+
+TEST(PropertyReader, knowsEachOfManyNames)
+{
+    const auto instance = [](const std::string& last) {
+        std::string properties;
+        for (int i = 0; i < 19000; ++i)
+            properties += "<PROPERTY NAME=\"p" + std::to_string(i) + "\" TYPE=\"string\"/>";
+        return elementOf("<INSTANCE CLASSNAME=\"B\">" + properties + "<PROPERTY NAME=\"" + last +
+                         "\" TYPE=\"string\"/></INSTANCE>");
+    };
+    EXPECT_EQ(readInstance(instance("p19000"), {}).properties.size(), 19001U);
+    EXPECT_THAT(errorOf([&] { readInstance(instance("P7"), {}); }), HasSubstr("the property P7 again"));
 }
 
 } // namespace

@@ -147,14 +147,10 @@ TEST(Xml, isBoundedInElements)
     EXPECT_EQ(endingOf("<CIM>" + repeated("<X/>", 10) + "</CIM>", limits).fault, Fault::tooLarge);
 }
 
-TEST(Xml, takesLongAttributesAndManyOfThem)
+TEST(Xml, takesLongAttributes)
 {
     const std::string huge(500000, 'x');
     EXPECT_EQ(parse("<CIM A=\"" + huge + "\"/>").attributes[0].value, huge);
-    std::string many = "<CIM";
-    for (int i = 0; i < 5000; ++i)
-        many += " a" + std::to_string(i) + "=\"\"";
-    EXPECT_EQ(parse(many + "/>").attributes.size(), 5000U);
     // A name is no text: the library bounds it.
     EXPECT_EQ(endingOf("<" + huge + "/>").fault, Fault::notWellFormed);
 }

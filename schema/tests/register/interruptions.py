@@ -3,6 +3,7 @@
     interruptions.py            a signal in each call of a tool, in turn TERM, INT and HUP, one for several questions
                                 alike, and at some moments; where taking back fails, only in a third of the calls
     interruptions.py --all      each signal at the beginning and at the end of each call, and at every millisecond
+    interruptions.py --case TEXT   only the cases whose name contains TEXT, or one of several
 
 What it claims: 0, as after a run that nobody disturbed; 3 and 4, as before; 5, otherwise, and the last lines say what
 is left; killed by a signal, as before. REGISTER is the program under test, SCHEMA the folder of its classes. The
@@ -191,11 +192,16 @@ def try_case(case, everything, outcomes):
 def main():
     parser = argparse.ArgumentParser(description=__doc__, formatter_class=argparse.RawDescriptionHelpFormatter)
     parser.add_argument("--all", action="store_true")
-    everything = parser.parse_args().all
+    parser.add_argument("--case", nargs="+", default=[""])
+    options = parser.parse_args()
+    everything = options.all
+    cases = [case for case in CASES if any(part in case.name for part in options.case)]
+    if not cases:
+        parser.error(f"no case is named so; there are: {'; '.join(case.name for case in CASES)}")
     kinds = [0, 3, 4, 5, "killed", "false"]
     print(f"{'':50}{'moments':>8}" + "".join(f"{kind:>8}" for kind in kinds))
     falsehoods = []
-    for case in CASES:
+    for case in cases:
         outcomes = collections.Counter()
         falsehoods += try_case(case, everything, outcomes)
         numbers = [sum(outcomes.values())] + [outcomes[kind] for kind in kinds]
