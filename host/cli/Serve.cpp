@@ -38,6 +38,7 @@ ExitStatus serveUntilSignal(const Serve& command, Broker& broker, std::ostream& 
         return exitError;
     }
     err << "cimhost: listening on http://" << textOf(server->endpoint())
+        << (isEverywhere(server->endpoint()) ? ", on all addresses of this machine" : "")
         << ", for development only: no authentication, no encryption" << std::endl;
     signals.wait();
     err << "cimhost: ending" << std::endl;

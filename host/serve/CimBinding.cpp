@@ -209,13 +209,15 @@ std::optional<HttpResponse> CimBinding::refuse(const HttpRequest& request) const
         return std::nullopt;
     }
     std::size_t bytes = 0;
-    const char* const last = length->data() + length->size();
-    const auto [end, error] = std::from_chars(length->data(), last, bytes);
-    if (error == std::errc::result_out_of_range || bytes > limits_.bytes)
+    const auto [end, error] = std::from_chars(length->data(), length->data() + length->size(), bytes);
+    if (error != std::errc() || bytes > limits_.bytes) // it is a number, if not of 64 bits
         return tooLarge();
-    if (error != std::errc() || end != last)
-        return responseTo({400, "Content-Length: expected a decimal number", {}});
     return std::nullopt;
+}
+
+HttpResponse CimBinding::refused(const HttpError& error)
+{
+    return responseTo(error);
 }
 
 HttpResponse CimBinding::answer(const HttpRequest& request) const

@@ -31,12 +31,15 @@ public:
     CimBinding(Broker& broker, std::string hostName, const RequestLimits& limits = {});
 
     /// The refusal of a request whose body need not be waited for; nothing: read on.
-    /// \param request  without its body
+    /// \param request  without its body, with a head that is not refused by itself
     [[nodiscard]] std::optional<HttpResponse> refuse(const HttpRequest& request) const;
 
     /// The response to a whole request. Never fails: an error has its status. An error of HTTP has a
     /// body of plain text that says what is wrong, one of CIM is an ERROR in the response message.
     [[nodiscard]] HttpResponse answer(const HttpRequest& request) const;
+
+    /// The response to what HTTP alone refuses.
+    [[nodiscard]] static HttpResponse refused(const HttpError& error);
 
     /// The response to a body that turned out longer than the limit.
     [[nodiscard]] HttpResponse tooLarge() const;

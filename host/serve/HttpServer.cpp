@@ -1,7 +1,9 @@
 #include "serve/HttpServer.h"
 
 #include "serve/Deadlines.h"
+#include "serve/HeadRules.h"
 
+#include <atomic>
 #include <condition_variable>
 #include <mutex>
 #include <string_view>
@@ -51,13 +53,6 @@ int socketOf(MHD_Connection* connection)
     return MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CONNECTION_FD)->connect_fd;
 }
 
-MHD_Result send(MHD_Connection* connection, HttpResponse response)
-{
-    const unsigned int status = response.status;
-    const ResponsePointer made = makeResponse(std::move(response));
-    return made ? MHD_queue_response(connection, status, made.get()) : MHD_NO;
-}
-
 } // namespace
 
 class HttpServer::Implementation
@@ -73,6 +68,7 @@ public:
 
     ~Implementation()
     {
+        isEnding_ = true;
         close(MHD_quiesce_daemon(daemon_));
         waitForRequests();
         MHD_stop_daemon(daemon_);
@@ -100,8 +96,8 @@ private:
     }
 
     /// Called with the headers, then with each piece of the body, then once more.
-    static MHD_Result onRequest(void* self, MHD_Connection* connection, const char* /*url*/,
-                                const char* method, const char* /*version*/, const char* piece,
+    static MHD_Result onRequest(void* self, MHD_Connection* connection, const char* target,
+                                const char* method, const char* version, const char* piece,
                                 std::size_t* pieceSize, void** state)
     {
         auto& server = *static_cast<Implementation*>(self);
@@ -109,6 +105,8 @@ private:
             if (*state == nullptr) {
                 auto& exchange = *server.begin(state);
                 exchange.request.method = method;
+                exchange.request.target = target;
+                exchange.request.version = version;
                 return server.takeHeaders(connection, exchange);
             }
             auto& exchange = *static_cast<Exchange*>(*state);
@@ -166,11 +164,28 @@ private:
         allEnded_.wait_for(lock, limits_.farewell, [&] { return requests_ == 0; });
     }
 
+    /// Where a request is refused, what follows it cannot be told from its body: the connection is closed.
     MHD_Result takeHeaders(MHD_Connection* connection, Exchange& exchange) const
     {
         MHD_get_connection_values(connection, MHD_HEADER_KIND, &takeHeader, &exchange.request);
-        std::optional<HttpResponse> refusal = binding_.refuse(exchange.request);
-        return refusal ? send(connection, std::move(*refusal)) : MHD_YES;
+        std::optional<HttpResponse> refusal = refuse(exchange.request);
+        return refusal ? send(connection, std::move(*refusal), true) : MHD_YES;
+    }
+
+    [[nodiscard]] std::optional<HttpResponse> refuse(const HttpRequest& request) const
+    {
+        const std::optional<HttpError> refusal = refusalOf(request, isLoopback(endpoint()));
+        return refusal ? CimBinding::refused(*refusal) : binding_.refuse(request);
+    }
+
+    /// The last response of a connection says so, and those are that are sent while the server ends.
+    MHD_Result send(MHD_Connection* connection, HttpResponse response, bool isLast) const
+    {
+        if (isLast || isEnding_)
+            response.headers.push_back({"Connection", "close"});
+        const unsigned int status = response.status;
+        const ResponsePointer made = makeResponse(std::move(response));
+        return made ? MHD_queue_response(connection, status, made.get()) : MHD_NO;
     }
 
     /// What goes beyond the limit is not kept.
@@ -190,7 +205,7 @@ private:
         deadlines_.end(socket); // the broker may take its time
         HttpResponse response = exchange.isTooLarge ? binding_.tooLarge() : binding_.answer(exchange.request);
         deadlines_.begin(socket);
-        return send(connection, std::move(response));
+        return send(connection, std::move(response), false);
     }
 
     const CimBinding& binding_;
@@ -198,6 +213,7 @@ private:
     ListeningSocket socket_;
     std::mutex mutex_;
     std::condition_variable allEnded_;
+    std::atomic<bool> isEnding_ = false;
     int requests_ = 0; ///< those that are being read, answered or sent
     Deadlines deadlines_;
     MHD_Daemon* daemon_;

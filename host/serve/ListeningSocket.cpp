@@ -2,7 +2,9 @@
 
 #include "cim/Descriptor.h"
 #include "cim/Utf8.h"
+#include "serve/HeadRules.h"
 
+#include <array>
 #include <cerrno>
 #include <memory>
 #include <system_error>
@@ -32,6 +34,21 @@ std::uint16_t portOf(const sockaddr_storage& address)
                                                : reinterpret_cast<const sockaddr_in&>(address).sin_port);
 }
 
+std::string numbersOf(const sockaddr_storage& address, socklen_t length)
+{
+    std::array<char, NI_MAXHOST> numbers{};
+    return getnameinfo(reinterpret_cast<const sockaddr*>(&address), length, numbers.data(), numbers.size(), nullptr, 0,
+                       NI_NUMERICHOST) == 0
+               ? numbers.data()
+               : "";
+}
+
+std::string hostOf(const Endpoint& endpoint)
+{
+    const bool isIpv6 = endpoint.address.find(':') != std::string::npos;
+    return isIpv6 ? '[' + endpoint.address + ']' : endpoint.address;
+}
+
 } // namespace
 
 ListeningSocket listenAt(const Endpoint& endpoint)
@@ -56,13 +73,22 @@ ListeningSocket listenAt(const Endpoint& endpoint)
         listen(socket.number(), SOMAXCONN) != 0 ||
         getsockname(socket.number(), reinterpret_cast<sockaddr*>(&bound), &length) != 0)
         failWithErrno(endpoint);
-    return {socket.release(), {endpoint.address, portOf(bound)}};
+    return {socket.release(), {numbersOf(bound, length), portOf(bound)}};
+}
+
+bool isLoopback(const Endpoint& endpoint)
+{
+    return isLoopbackHost(hostOf(endpoint));
+}
+
+bool isEverywhere(const Endpoint& endpoint)
+{
+    return endpoint.address == "0.0.0.0" || endpoint.address == "::";
 }
 
 std::string textOf(const Endpoint& endpoint)
 {
-    const bool isIpv6 = endpoint.address.find(':') != std::string::npos;
-    return (isIpv6 ? '[' + endpoint.address + ']' : endpoint.address) + ':' + std::to_string(endpoint.port);
+    return hostOf(endpoint) + ':' + std::to_string(endpoint.port);
 }
 
 } // namespace cimhost::serve

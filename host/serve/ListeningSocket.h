@@ -11,7 +11,7 @@ namespace cimhost::serve {
 /// Where a server is to be found.
 struct Endpoint
 {
-    std::string address;    ///< IPv4 or IPv6, in numbers
+    std::string address;    ///< IPv4 or IPv6, in numbers; to be listened on also `*`: all that there are
     std::uint16_t port = 0; ///< 0: any that is free
 };
 
@@ -35,11 +35,17 @@ private:
 struct ListeningSocket
 {
     int descriptor; ///< the caller's to close
-    Endpoint endpoint;
+    Endpoint endpoint; ///< with the address in numbers
 };
 
 /// \throws ListenError
 ListeningSocket listenAt(const Endpoint& endpoint);
+
+/// Whether only this machine can connect to it.
+bool isLoopback(const Endpoint& endpoint);
+
+/// Whether it is on all addresses that this machine has, as `0.0.0.0` and `::` are.
+bool isEverywhere(const Endpoint& endpoint);
 
 /// As in a URL: `127.0.0.1:5988`, `[::1]:5988`.
 std::string textOf(const Endpoint& endpoint);

@@ -134,10 +134,6 @@ TEST_F(Binding, needsALengthWithinTheLimit)
         set("Content-Length", length);
         EXPECT_EQ(refusal(), 413U) << length;
     }
-    for (const char* length : {"", "x", "-1", "1x"}) {
-        set("Content-Length", length);
-        EXPECT_EQ(refusal(), 400U) << length;
-    }
     remove("Content-Length");
     EXPECT_EQ(refusal(), 411U);
     set("Transfer-Encoding", "chunked");

@@ -5,6 +5,7 @@
 #include "cim/Descriptor.h"
 #include "serve/tests/Messages.h"
 
+#include <future>
 #include <memory>
 #include <string>
 #include <system_error>
@@ -20,6 +21,7 @@
 
 using namespace cimhost;
 using namespace cimhost::serve;
+using testing::AllOf;
 using testing::EndsWith;
 using testing::HasSubstr;
 using testing::StartsWith;
@@ -69,6 +71,16 @@ public:
         return response;
     }
 
+    /// Waits for the response that says that the body is waited for.
+    void waitForContinue()
+    {
+        const std::string response = "HTTP/1.1 100 Continue\r\n\r\n";
+        while (received_.size() < response.size() && receiveMore()) {
+        }
+        ASSERT_EQ(received_.substr(0, response.size()), response);
+        received_.erase(0, response.size());
+    }
+
     /// Waits until the server closes the connection.
     bool isClosed()
     {
@@ -93,7 +105,7 @@ private:
 
 const std::string body = callOf("EnumerateInstanceNames", parameter("ClassName", className()));
 const std::string head =
-    "POST /cimom HTTP/1.1\r\nHost: here\r\nContent-Type: text/xml\r\nCIMOperation: MethodCall\r\n"
+    "POST /cimom HTTP/1.1\r\nHost: localhost\r\nContent-Type: text/xml\r\nCIMOperation: MethodCall\r\n"
     "CIMMethod: EnumerateInstanceNames\r\nCIMObject: root%2Fcimv2\r\n";
 
 std::string httpRequest(const std::string& content)
@@ -199,6 +211,68 @@ TEST_F(Server, refusesABodyBeforeItComes)
     expectServes();
 }
 
+TEST_F(Server, refusesByTheHeadAndCloses)
+{
+    start();
+    const std::string smuggled = httpRequest(body);
+    const std::string length = "Content-Length: " + std::to_string(smuggled.size()) + "\r\n";
+    const auto with = [](const std::string& host, const std::string& headers) {
+        return "POST /cimom HTTP/1.1\r\n" + host + headers + head.substr(head.find("Content-Type"));
+    };
+    const std::string local = "Host: localhost\r\n";
+    struct Case
+    {
+        std::string head;
+        const char* status;
+    };
+    const std::vector<Case> cases{
+        {with("Host: evil.example\r\n", length), "421"},
+        {with("", length), "400"},
+        {with(local + local, length), "400"},
+        {with(local, length + "Origin: http://evil.example\r\n"), "403"},
+        {with(local, "Content-Length: 0\r\n" + length), "400"},
+        {with(local, length + length), "400"},
+        {with(local, length + "Transfer-Encoding: chunked\r\n"), "400"},
+        {with(local, "Transfer-Encoding: chunked\r\n" + length), "400"},
+        {with(local, "Transfer-Encoding: gzip\r\n"), "501"},
+        {"M-" + with(local, "Content-Length: 0\r\n" + length), "400"},
+        {"GET /cimom HTTP/1.1\r\nHost: evil.example\r\n", "421"},
+        {"GET http://evil.example/cimom HTTP/1.1\r\nHost: localhost\r\n", "421"},
+    };
+    for (const Case& refused : cases) {
+        Connection connection(server->endpoint());
+        // What one reader takes for the body is another request for another.
+        connection.send(refused.head + "\r\n" + smuggled);
+        const std::string response = connection.receive();
+        EXPECT_THAT(response, StartsWith(std::string("HTTP/1.1 ") + refused.status + ' ')) << refused.head;
+        EXPECT_THAT(response, HasSubstr("Connection: close\r\n")) << refused.head;
+        EXPECT_EQ(connection.receive(), "") << "one answer alone: " << refused.head;
+    }
+    EXPECT_THAT(ask("POST /cimom HTTP/1.0\r\n" + head.substr(head.find("Content-Type")) +
+                    "Content-Length: " + std::to_string(body.size()) + "\r\n\r\n" + body),
+                HasSubstr("<ERROR CODE=\"3\"")) << "a client of HTTP/1.0 names no host";
+    expectServes();
+}
+
+TEST_F(Server, listensOnAllAddresses)
+{
+    for (const char* address : {"*", "0.0.0.0"}) {
+        server = std::make_unique<HttpServer>(Endpoint{address, 0}, binding);
+        EXPECT_EQ(server->endpoint().address, "0.0.0.0");
+        EXPECT_TRUE(isEverywhere(server->endpoint()));
+        EXPECT_FALSE(isLoopback(server->endpoint()));
+        std::string request = httpRequest(body);
+        request.replace(request.find("localhost"), 9, "any.example");
+        EXPECT_THAT(ask(request), HasSubstr("<ERROR CODE=\"3\"")) << "nobody knows what names lead here";
+    }
+    start();
+    EXPECT_FALSE(isEverywhere(server->endpoint()));
+    EXPECT_TRUE(isLoopback(server->endpoint()));
+    EXPECT_TRUE(isEverywhere({"::", 1}));
+    EXPECT_TRUE(isLoopback({"::1", 1}));
+    EXPECT_FALSE(isLoopback({"192.0.2.1", 1}));
+}
+
 TEST_F(Server, survivesWhatIsNoHttp)
 {
     start();
@@ -210,11 +284,11 @@ TEST_F(Server, survivesWhatIsNoHttp)
         "POST /cimom HTTP/9.9\r\n\r\n",
         "GET / HTTP/1.0\r\n\r\n",
         "POST / HTTP/1.1\r\nno colon\r\n\r\n",
-        "POST / HTTP/1.1\r\nHost: a\r\nContent-Length: -1\r\n\r\n",
-        "POST / HTTP/1.1\r\nHost: a\r\nContent-Length: 1\r\nContent-Length: 2\r\n\r\nab",
-        "POST / HTTP/1.1\r\nHost: a\r\nTransfer-Encoding: chunked\r\n\r\nzz\r\n",
-        "POST / HTTP/1.1\r\nHost: a\r\nTransfer-Encoding: gzip\r\n\r\nzz\r\n",
-        "POST / HTTP/1.1\r\n" + std::string(100000, 'a') + ": b\r\n\r\n",
+        "POST / HTTP/1.1\r\nHost: localhost\r\nContent-Length: -1\r\n\r\n",
+        "POST / HTTP/1.1\r\nHost: localhost\r\nContent-Length: 1\r\nContent-Length: 2\r\n\r\nab",
+        "POST / HTTP/1.1\r\nHost: localhost\r\nTransfer-Encoding: chunked\r\n\r\nzz\r\n",
+        "POST / HTTP/1.1\r\nHost: localhost\r\nTransfer-Encoding: gzip\r\n\r\nzz\r\n",
+        "POST / HTTP/1.1\r\nHost: localhost\r\n" + std::string(100000, 'a') + ": b\r\n\r\n",
         "POST /" + std::string(100000, 'a') + " HTTP/1.1\r\n\r\n",
         std::string(5, '\0') + "\xff\xfe\r\n\r\n",
         "\x16\x03\x01\x02 the beginning of TLS\r\n\r\n",
@@ -224,8 +298,8 @@ TEST_F(Server, survivesWhatIsNoHttp)
         connection.send(request);
         connection.send("\r\n\r\n");
     }
-    EXPECT_THAT(ask("GET / HTTP/1.1\r\nHost: a\r\n\r\n"), StartsWith("HTTP/1.1 405 "));
-    EXPECT_THAT(ask("POST / HTTP/1.1\r\n" + std::string(100000, 'a') + ": b\r\n\r\n"),
+    EXPECT_THAT(ask("GET / HTTP/1.1\r\nHost: localhost\r\n\r\n"), StartsWith("HTTP/1.1 405 "));
+    EXPECT_THAT(ask("POST / HTTP/1.1\r\nHost: localhost\r\n" + std::string(100000, 'a') + ": b\r\n\r\n"),
                 StartsWith("HTTP/1.1 431 "));
     expectServes();
 }
@@ -301,6 +375,44 @@ TEST_F(Server, answersWhatIsThereWhenItEnds)
     server.reset();
     EXPECT_TRUE(idle.isClosed());
     EXPECT_TRUE(busy.isClosed());
+}
+
+TEST_F(Server, tellsBusyClientsThatItEnds)
+{
+    ServerLimits limits;
+    limits.farewell = std::chrono::hours(1); // nothing but its clients' requests keeps it
+    start(limits);
+    Connection half(server->endpoint());
+    const std::string request = httpRequest(body);
+    half.send(head + "Expect: 100-continue\r\n" + request.substr(head.size(), request.size() - head.size() - 1));
+    half.waitForContinue(); // from now on its request is counted
+    std::vector<std::thread> clients;
+    std::vector<std::string> last(4);
+    std::vector<std::promise<void>> begun(last.size());
+    clients.reserve(last.size());
+    for (std::size_t client = 0; client < last.size(); ++client)
+        clients.emplace_back([&, client] {
+            Connection connection(server->endpoint());
+            // Another request as soon as one is answered, for as long as the connection is kept.
+            for (int i = 0;; ++i) {
+                connection.send(request);
+                const std::string response = connection.receive();
+                if (i == 0)
+                    begun[client].set_value();
+                if (response.empty())
+                    break;
+                last[client] = response;
+            }
+        });
+    for (std::promise<void>& each : begun)
+        each.get_future().wait();
+    std::thread ending([&] { server.reset(); });
+    for (std::thread& client : clients)
+        client.join();
+    half.send(request.substr(request.size() - 1));
+    EXPECT_THAT(half.receive(), AllOf(HasSubstr("200 OK"), HasSubstr("Connection: close\r\n")));
+    ending.join();
+    EXPECT_THAT(last, testing::Each(AllOf(HasSubstr("200 OK"), HasSubstr("Connection: close\r\n"))));
 }
 
 TEST_F(Server, answersManyClientsAtOnce)

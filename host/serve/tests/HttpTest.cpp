@@ -10,12 +10,12 @@ namespace {
 
 HttpRequest requestWith(const std::string& name, const std::string& value)
 {
-    return {"POST", {{name, value}}, ""};
+    return {"POST", "/", "HTTP/1.1", {{name, value}}, ""};
 }
 
 TEST(Http, findsHeadersWhateverTheirLetterCase)
 {
-    const HttpRequest request{"POST", {{"content-TYPE", "a"}, {"Content-Type", "b"}}, ""};
+    const HttpRequest request{"POST", "/", "HTTP/1.1", {{"content-TYPE", "a"}, {"Content-Type", "b"}}, ""};
     ASSERT_NE(findHeader(request, "Content-Type"), nullptr);
     EXPECT_EQ(*findHeader(request, "Content-Type"), "a");
     EXPECT_EQ(findHeader(request, "Content"), nullptr);
