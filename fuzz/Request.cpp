@@ -47,7 +47,7 @@ void checkResponse(const RequestMessage& message)
         answer.paths.push_back(request.target);
         answer.instances.push_back(request.instance);
     }
-    parse(writeResponse(message, reply, "here"));
+    parse(writeResponse(message, std::move(reply), "here").whole());
 }
 
 } // namespace

@@ -52,7 +52,7 @@ HttpError httpErrorOf(const RequestError& error)
 
 HttpResponse responseTo(const HttpError& error)
 {
-    HttpResponse response{error.status, error.headers, error.message + '\n'};
+    HttpResponse response{error.status, error.headers, Text(error.message + '\n')};
     response.headers.push_back({"Content-Type", "text/plain; charset=utf-8"});
     return response;
 }
@@ -196,7 +196,8 @@ std::vector<HeaderField> responseHeaders(const std::string& prefix)
 CimBinding::CimBinding(Broker& broker, std::string hostName, const RequestLimits& limits)
     : broker_(broker),
       hostName_(std::move(hostName)),
-      limits_(limits)
+      limits_(limits),
+      budget_(std::make_shared<TextBudget>(limits.answers))
 {}
 
 std::optional<HttpResponse> CimBinding::refuse(const HttpRequest& request) const
@@ -246,8 +247,9 @@ HttpResponse CimBinding::respond(const HttpRequest& request) const
     checkAccept(request);
     const RequestMessage message = readRequest(request.body, limits_.xml);
     checkMatch(request, prefix, message);
-    const Reply reply = execute(message, broker_, *enumerations_);
-    return {200, responseHeaders(prefix), writeResponse(message, reply, hostName_, broker_.classes())};
+    Reply reply = execute(message, broker_, *enumerations_);
+    return {200, responseHeaders(prefix),
+            writeResponse(message, std::move(reply), hostName_, broker_.classes(), budget_)};
 }
 
 } // namespace cimhost::serve

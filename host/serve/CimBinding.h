@@ -15,11 +15,12 @@
 
 namespace cimhost::serve {
 
-/// What a request may have at most.
+/// What a request may have at most, and what is kept for its answer.
 struct RequestLimits
 {
     std::size_t bytes = 1048576; ///< of the body
     XmlLimits xml;
+    std::size_t answers = 536870912; ///< bytes of all answers that their clients have not received yet
 };
 
 /// Answers requests by asking a broker. Safe to use from several threads at once.
@@ -52,6 +53,7 @@ private:
     Broker& broker_;
     std::string hostName_;
     RequestLimits limits_;
+    std::shared_ptr<TextBudget> budget_;
     std::unique_ptr<Enumerations> enumerations_ = std::make_unique<Enumerations>();
 };
 

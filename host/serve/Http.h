@@ -3,6 +3,8 @@
 #ifndef CIMHOST_SERVE_HTTP_H
 #define CIMHOST_SERVE_HTTP_H
 
+#include "serve/Text.h"
+
 #include <string>
 #include <string_view>
 #include <vector>
@@ -28,7 +30,7 @@ struct HttpResponse
 {
     unsigned int status = 0;
     std::vector<HeaderField> headers;
-    std::string body;
+    Text body;
 };
 
 /// A request that is answered by the rules of HTTP alone.

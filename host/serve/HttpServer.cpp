@@ -9,6 +9,7 @@
 #include <string_view>
 #include <utility>
 
+#include <malloc.h>
 #include <microhttpd.h>
 #include <unistd.h>
 
@@ -23,6 +24,8 @@ struct Exchange
     bool isTooLarge = false;
 };
 
+using ResponsePointer = std::unique_ptr<MHD_Response, decltype(&MHD_destroy_response)>;
+
 MHD_Result takeHeader(void* context, MHD_ValueKind /*kind*/, const char* name, const char* value)
 {
     auto& request = *static_cast<HttpRequest*>(context);
@@ -30,16 +33,32 @@ MHD_Result takeHeader(void* context, MHD_ValueKind /*kind*/, const char* name, c
     return MHD_YES;
 }
 
-using ResponsePointer = std::unique_ptr<MHD_Response, decltype(&MHD_destroy_response)>;
+/// A response while it goes out; the library asks for one piece after another.
+ssize_t readBody(void* body, std::uint64_t /*position*/, char* bytes, std::size_t most)
+{
+    const std::size_t count = static_cast<Text*>(body)->read(bytes, most);
+    return count > 0 ? static_cast<ssize_t>(count) : MHD_CONTENT_READER_END_OF_STREAM;
+}
+
+/// What a long answer took goes back to the system: the C library would keep it for a next one.
+void freeBody(void* owner)
+{
+    constexpr std::size_t isLong = 8388608;
+    const std::unique_ptr<Text> body(static_cast<Text*>(owner));
+    if (body->size() < isLong)
+        return;
+    *body = Text();
+    malloc_trim(0);
+}
 
 /// The library's response, which takes the body over.
 ResponsePointer makeResponse(HttpResponse response)
 {
-    auto body = std::make_unique<std::string>(std::move(response.body));
-    ResponsePointer result(MHD_create_response_from_buffer_with_free_callback_cls(
-                               body->size(), body->data(),
-                               [](void* owner) { delete static_cast<std::string*>(owner); }, body.get()),
-                           &MHD_destroy_response);
+    constexpr std::size_t blockSize = 65536;
+    auto body = std::make_unique<Text>(std::move(response.body));
+    ResponsePointer result(
+        MHD_create_response_from_callback(body->size(), blockSize, &readBody, body.get(), &freeBody),
+        &MHD_destroy_response);
     if (!result)
         return result;
     static_cast<void>(body.release()); // the callback's

@@ -7,6 +7,7 @@
 #include "serve/XmlWriter.h"
 
 #include <optional>
+#include <utility>
 
 namespace cimhost::serve {
 
@@ -26,7 +27,7 @@ cim::ObjectPath located(cim::ObjectPath path, const RequestMessage& request, con
 class BodyWriter
 {
 public:
-    BodyWriter(XmlWriter& xml, const RequestMessage& request, const Question& question, const Reply& reply,
+    BodyWriter(XmlWriter& xml, const RequestMessage& request, const Question& question, Reply& reply,
                const std::string& hostName, const schema::Classes& classes)
         : xml_(xml),
           request_(request),
@@ -55,6 +56,16 @@ public:
     }
 
 private:
+    /// Writes each, which then goes: its text takes less memory than it does.
+    template <class Item, class Write>
+    static void each(std::vector<Item>& items, const Write& write)
+    {
+        for (Item& item : items) {
+            write(item);
+            item = {};
+        }
+    }
+
     template <class Content>
     void returned(const Content& content)
     {
@@ -72,22 +83,23 @@ private:
         switch (operation) {
         case Operation::enumerateInstanceNames:
         case Operation::createInstance:
-            for (const cim::ObjectPath& path : answer_.paths)
-                writeInstanceName(xml_, path);
+            each(answer_.paths, [&](const cim::ObjectPath& path) { writeInstanceName(xml_, path); });
             break;
         case Operation::enumerateInstances:
-            for (const cim::Instance& instance : answer_.instances)
+            each(answer_.instances, [&](const cim::Instance& instance) {
                 xml_.element("VALUE.NAMEDINSTANCE", [&] {
                     writeInstanceName(xml_, instance.path);
                     writeInstance(xml_, instance, origins_);
                 });
+            });
             break;
         case Operation::getInstance:
             writeInstance(xml_, answer_.instances.front(), origins_);
             break;
         case Operation::execQuery:
-            for (const cim::Instance& instance : answer_.instances)
+            each(answer_.instances, [&](const cim::Instance& instance) {
                 xml_.element("VALUE.OBJECT", [&] { writeInstance(xml_, instance); });
+            });
             break;
         case Operation::associators:
         case Operation::references:
@@ -95,8 +107,9 @@ private:
             break;
         case Operation::associatorNames:
         case Operation::referenceNames:
-            for (const cim::ObjectPath& path : answer_.paths)
+            each(answer_.paths, [&](const cim::ObjectPath& path) {
                 xml_.element("OBJECTPATH", [&] { writePath(path); });
+            });
             break;
         default:
             break;
@@ -106,8 +119,7 @@ private:
     void writePiece()
     {
         returned([&] {
-            for (const cim::ObjectPath& path : answer_.paths)
-                writePath(path);
+            each(answer_.paths, [&](const cim::ObjectPath& path) { writePath(path); });
             writeInstancesWithPaths("VALUE.INSTANCEWITHPATH");
         });
         const auto writeOut = [&](const char* name, const char* type, const std::string& value) {
@@ -123,11 +135,12 @@ private:
 
     void writeInstancesWithPaths(const char* element)
     {
-        for (const cim::Instance& instance : answer_.instances)
+        each(answer_.instances, [&](const cim::Instance& instance) {
             xml_.element(element, [&] {
                 writePath(instance.path);
                 writeInstance(xml_, instance, origins_);
             });
+        });
     }
 
     void writePath(const cim::ObjectPath& path)
@@ -148,16 +161,16 @@ private:
     const RequestMessage& request_;
     const Question& question_;
     const Reply& reply_;
-    const cim::Answer& answer_;
+    cim::Answer& answer_;
     const std::string& hostName_;
     const schema::Classes* origins_;
 };
 
 /// The document around the body of a response.
 template <class Body>
-std::string messageWith(const RequestMessage& request, const Body& body)
+Text messageWith(const RequestMessage& request, std::shared_ptr<TextBudget> budget, const Body& body)
 {
-    XmlWriter xml;
+    XmlWriter xml{Text(std::move(budget))};
     xml.declaration();
     xml.element("CIM", [&] {
         xml.attribute("CIMVERSION", "2.0");
@@ -173,7 +186,7 @@ std::string messageWith(const RequestMessage& request, const Body& body)
             });
         });
     });
-    return xml.document();
+    return xml.take();
 }
 
 /// The codes of CIM's own are the first of CMPI, and those of enumerations in pieces.
@@ -183,12 +196,12 @@ bool isCimStatus(CMPIrc code)
            (code >= invalidEnumerationContext && code <= serverLimitsExceeded);
 }
 
-std::string writeError(const RequestMessage& request, const cim::Status& status)
+Text writeError(const RequestMessage& request, const cim::Status& status)
 {
     const bool isCims = isCimStatus(status.code);
     const std::string message =
         status.message.value_or(isCims ? std::string() : cim::statusName(status.code));
-    return messageWith(request, [&](XmlWriter& xml) {
+    return messageWith(request, nullptr, [&](XmlWriter& xml) {
         xml.element("ERROR", [&] {
             xml.attribute("CODE", std::to_string(isCims ? status.code : CMPI_RC_ERR_FAILED));
             if (!message.empty())
@@ -199,19 +212,21 @@ std::string writeError(const RequestMessage& request, const cim::Status& status)
 
 } // namespace
 
-std::string writeResponse(const RequestMessage& request, const Reply& reply, const std::string& hostName,
-                          const schema::Classes& classes)
+Text writeResponse(const RequestMessage& request, Reply reply, const std::string& hostName,
+                   const schema::Classes& classes, std::shared_ptr<TextBudget> budget)
 {
     const auto* const question = std::get_if<Question>(&request.content);
     if (reply.answer.status.code != CMPI_RC_OK || question == nullptr)
         return writeError(request, reply.answer.status);
     try {
-        return messageWith(request, [&](XmlWriter& xml) {
+        return messageWith(request, std::move(budget), [&](XmlWriter& xml) {
             BodyWriter(xml, request, *question, reply, hostName, classes).write();
         });
     } catch (const UnwritableError& error) {
         return writeError(request,
                           {CMPI_RC_ERR_FAILED, std::string("the provider returned ") + error.what()});
+    } catch (const TextTooLong& error) {
+        return writeError(request, {serverLimitsExceeded, error.what()});
     }
 }
 

@@ -4,6 +4,7 @@
 
 #include <new>
 #include <optional>
+#include <utility>
 
 #include <libxml/xmlwriter.h>
 
@@ -39,23 +40,18 @@ const xmlChar* xmlOf(const char* text)
     return reinterpret_cast<const xmlChar*>(text);
 }
 
-/// The library fails for want of memory only.
-void require(int written)
-{
-    if (written < 0)
-        throw std::bad_alloc();
-}
-
 } // namespace
 
-XmlWriter::XmlWriter() : buffer_(xmlBufferCreate(), &xmlBufferFree), writer_(nullptr, &xmlFreeTextWriter)
+XmlWriter::XmlWriter(Text text) : text_(std::move(text)), writer_(nullptr, &xmlFreeTextWriter)
 {
-    if (!buffer_)
+    xmlOutputBuffer* const output = xmlOutputBufferCreateIO(&append, nullptr, this, nullptr);
+    if (output == nullptr)
         throw std::bad_alloc();
-    xmlBufferSetAllocationScheme(buffer_.get(), XML_BUFFER_ALLOC_DOUBLEIT);
-    writer_.reset(xmlNewTextWriterMemory(buffer_.get(), 0));
-    if (!writer_)
-        throw std::bad_alloc();
+    writer_.reset(xmlNewTextWriter(output));
+    if (writer_)
+        return;
+    xmlOutputBufferClose(output);
+    throw std::bad_alloc();
 }
 
 XmlWriter::~XmlWriter() = default;
@@ -75,11 +71,33 @@ void XmlWriter::text(std::string_view text)
     require(xmlTextWriterWriteString(writer_.get(), xmlOf(allowed(text).c_str())));
 }
 
-std::string XmlWriter::document()
+Text XmlWriter::take()
 {
     require(xmlTextWriterFlush(writer_.get()));
-    return {reinterpret_cast<const char*>(xmlBufferContent(buffer_.get())),
-            static_cast<std::size_t>(xmlBufferLength(buffer_.get()))};
+    return std::move(text_);
+}
+
+int XmlWriter::append(void* self, const char* bytes, int count)
+{
+    auto& writer = *static_cast<XmlWriter*>(self);
+    if (writer.failure_)
+        return -1;
+    try {
+        writer.text_.append({bytes, static_cast<std::size_t>(count)});
+        return count;
+    } catch (...) {
+        writer.failure_ = std::current_exception();
+        return -1;
+    }
+}
+
+/// The library itself fails for want of memory only.
+void XmlWriter::require(int written) const
+{
+    if (failure_)
+        std::rethrow_exception(failure_);
+    if (written < 0)
+        throw std::bad_alloc();
 }
 
 void XmlWriter::start(const char* name)

@@ -56,17 +56,17 @@ protected:
     void expectAnswered()
     {
         const HttpResponse response = binding.answer(request);
-        EXPECT_EQ(response.status, 200U) << response.body;
-        EXPECT_THAT(response.body, HasSubstr("<ERROR CODE=\"3\""));
+        EXPECT_EQ(response.status, 200U) << response.body.whole();
+        EXPECT_THAT(response.body.whole(), HasSubstr("<ERROR CODE=\"3\""));
     }
 
     void expectError(unsigned int status, const std::string& cimError, const std::string& text)
     {
         const HttpResponse response = binding.answer(request);
-        EXPECT_EQ(response.status, status) << response.body;
-        EXPECT_EQ(headerOf(response, "CIMError"), cimError) << response.body;
+        EXPECT_EQ(response.status, status) << response.body.whole();
+        EXPECT_EQ(headerOf(response, "CIMError"), cimError) << response.body.whole();
         EXPECT_EQ(headerOf(response, "Content-Type"), "text/plain; charset=utf-8");
-        EXPECT_THAT(response.body, HasSubstr(text));
+        EXPECT_THAT(response.body.whole(), HasSubstr(text));
     }
 
     [[nodiscard]] unsigned int refusal() const
@@ -87,7 +87,7 @@ TEST_F(Binding, answersAnOperation)
     EXPECT_EQ(headerOf(response, "Content-Type"), "application/xml; charset=\"utf-8\"");
     EXPECT_EQ(headerOf(response, "CIMOperation"), "MethodResponse");
     EXPECT_THAT(
-        response.body,
+        response.body.whole(),
         HasSubstr("<IMETHODRESPONSE NAME=\"EnumerateInstanceNames\"><ERROR CODE=\"3\" DESCRIPTION=\"no "
                   "registration names the namespace root/cimv2\"></ERROR>"));
 }
@@ -262,7 +262,7 @@ TEST_F(Binding, answersAllStepsOfAnEnumeration)
           {"EnumerationCount", parameter("EnumerationContext", text("x")), "21"}}) {
         request.body = callOf(method, parameters);
         set("CIMMethod", method);
-        EXPECT_THAT(binding.answer(request).body, HasSubstr(std::string("<ERROR CODE=\"") + code + '"'))
+        EXPECT_THAT(binding.answer(request).body.whole(), HasSubstr(std::string("<ERROR CODE=\"") + code + '"'))
             << method;
     }
 }
@@ -271,14 +271,14 @@ TEST_F(Binding, answersWhatIsNotServedByAStatus)
 {
     request.body = callOf("CreateClass", "");
     set("CIMMethod", "CreateClass");
-    EXPECT_THAT(binding.answer(request).body,
+    EXPECT_THAT(binding.answer(request).body.whole(),
                 HasSubstr("<IMETHODRESPONSE NAME=\"CreateClass\"><ERROR CODE=\"7\""));
     request.body = messageWith(
         R"(<SIMPLEREQ><METHODCALL NAME="Reset"><LOCALCLASSPATH><LOCALNAMESPACEPATH><NAMESPACE NAME="a"/>)"
         R"(</LOCALNAMESPACEPATH><CLASSNAME NAME="CIM_A"/></LOCALCLASSPATH></METHODCALL></SIMPLEREQ>)");
     set("CIMMethod", "Reset");
     set("CIMObject", "a%3ACIM_A");
-    EXPECT_THAT(binding.answer(request).body, HasSubstr("<METHODRESPONSE NAME=\"Reset\"><ERROR CODE=\"7\""));
+    EXPECT_THAT(binding.answer(request).body.whole(), HasSubstr("<METHODRESPONSE NAME=\"Reset\"><ERROR CODE=\"7\""));
 }
 
 } // namespace

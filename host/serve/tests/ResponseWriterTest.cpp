@@ -32,7 +32,7 @@ RequestMessage requestFor(Operation operation)
 /// What stands inside of the response's method.
 std::string bodyOf(const RequestMessage& request, const Reply& reply, const schema::Classes& classes = {})
 {
-    const std::string document = writeResponse(request, reply, "here", classes);
+    const std::string document = writeResponse(request, reply, "here", classes).whole();
     const std::string before =
         "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\">"
         "<MESSAGE ID=\"7 &amp; &quot;8&quot;\" PROTOCOLVERSION=\"1.0\"><SIMPLERSP><IMETHODRESPONSE NAME=\"Method\">";
@@ -215,7 +215,7 @@ TEST(ResponseWriter, answersMethodsOfClassesInTheirOwnElement)
     const RequestMessage message{"1",   "1.0", "Reset",
                                  false, "a",   cim::Status{CMPI_RC_ERR_NOT_SUPPORTED, "no"}};
     EXPECT_THAT(
-        writeResponse(message, {{{CMPI_RC_ERR_NOT_SUPPORTED, "no"}, {}, {}}}, "here"),
+        writeResponse(message, {{{CMPI_RC_ERR_NOT_SUPPORTED, "no"}, {}, {}}}, "here").whole(),
         HasSubstr(
             "<METHODRESPONSE NAME=\"Reset\"><ERROR CODE=\"7\" DESCRIPTION=\"no\"></ERROR></METHODRESPONSE>"));
 }
