@@ -1,5 +1,6 @@
 #include "broker/Call.h"
 #include "broker/NamedValues.h"
+#include "broker/Scope.h"
 #include "broker/Tables.h"
 #include "broker/Values.h"
 
@@ -14,7 +15,7 @@ constexpr const char* theInstance = "the instance";
 
 bool passesFilter(const InstanceObject& instance, const std::string& name)
 {
-    return !instance.wanted || contains(*instance.wanted, name) || contains(instance.keyNames, name);
+    return !instance.wanted || instance.wanted->contains(name) || contains(instance.keyNames, name);
 }
 
 /// Keeps a property that does not pass the filter only as far as it identifies the instance.
@@ -95,7 +96,7 @@ CMPIStatus setPropertyFilter(const CMPIInstance* instance, const char** properti
             content.keyNames = takeNames(keyList);
         if (properties == nullptr)
             return;
-        content.wanted = takeNames(properties);
+        content.wanted = filterOf(call.core(), properties);
 
         auto& present = content.content.edit().properties;
         const auto dropped =

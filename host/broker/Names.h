@@ -8,7 +8,10 @@
 #include <algorithm>
 #include <string>
 #include <string_view>
+#include <utility>
 #include <vector>
+
+#include <strings.h>
 
 namespace cimhost {
 
@@ -35,12 +38,49 @@ inline bool contains(const std::vector<std::string>& names, std::string_view nam
                        [&](const std::string& listed) { return cim::sameName(listed, name); });
 }
 
+/// Names that are looked for in many places, such as those of a filter. A name is found in few steps, however many
+/// there are.
+class NameSet
+{
+public:
+    explicit NameSet(std::vector<std::string> names) : names_(std::move(names)), sorted_(names_.begin(), names_.end())
+    {
+        std::sort(sorted_.begin(), sorted_.end(), &isLess);
+    }
+    NameSet(const NameSet&) = delete;
+    NameSet& operator=(const NameSet&) = delete;
+
+    [[nodiscard]] bool contains(std::string_view name) const
+    {
+        return std::binary_search(sorted_.begin(), sorted_.end(), name, &isLess);
+    }
+
+    /// Whether it was made of these, which end with a null pointer.
+    [[nodiscard]] bool isOf(const char* const* names) const
+    {
+        for (const std::string& name : names_)
+            if (*names == nullptr || name != *names++)
+                return false;
+        return *names == nullptr;
+    }
+
+private:
+    static bool isLess(std::string_view a, std::string_view b)
+    {
+        const int order = strncasecmp(a.data(), b.data(), std::min(a.size(), b.size()));
+        return order != 0 ? order < 0 : a.size() < b.size();
+    }
+
+    std::vector<std::string> names_;       ///< as they were given
+    std::vector<std::string_view> sorted_; ///< the same
+};
+
 /// Drops the elements that have none of the names.
 template <class Named>
-void keepOnly(std::vector<Named>& list, const std::vector<std::string>& names)
+void keepOnly(std::vector<Named>& list, const NameSet& names)
 {
     list.erase(std::remove_if(list.begin(), list.end(),
-                              [&](const Named& item) { return !contains(names, item.name); }),
+                              [&](const Named& item) { return !names.contains(item.name); }),
                list.end());
 }
 

@@ -6,6 +6,7 @@
 
 #include "broker/FunctionTables.h"
 #include "broker/Handle.h"
+#include "broker/Names.h"
 #include "cim/CopyOnWrite.h"
 #include "cim/Model.h"
 
@@ -31,7 +32,7 @@ struct InstanceObject
     explicit InstanceObject(std::shared_ptr<const cim::Instance> shared) : content(std::move(shared)) {}
 
     cim::CopyOnWrite<cim::Instance> content;
-    std::optional<std::vector<std::string>> wanted; ///< the property filter; nothing: every property
+    std::shared_ptr<const NameSet> wanted; ///< the property filter; null: every property
     std::vector<std::string> keyNames;              ///< the filter's key list
     /// Those that the class declares, kept by the broker's classes; null: it is not known, or has none.
     const std::vector<std::string>* classKeys = nullptr;

@@ -106,8 +106,8 @@ void keepOnlyWhatWasAskedFor(cim::Answer& answer, const OperationRequest& questi
 {
     if (!question.properties)
         return;
-    answer.instances.edit(
-        [&](cim::Instance& instance) { keepOnly(instance.properties, *question.properties); });
+    const NameSet asked(*question.properties);
+    answer.instances.edit([&](cim::Instance& instance) { keepOnly(instance.properties, asked); });
 }
 
 void handInTheHost(OperationRequest& question, const RegisteredClass& /*served*/)

@@ -1,5 +1,7 @@
 #include "broker/Scope.h"
 
+#include "broker/Call.h"
+
 namespace cimhost {
 
 namespace {
@@ -22,6 +24,13 @@ Scope::~Scope()
     current = outer_;
 }
 
+std::shared_ptr<const NameSet> Scope::filterOf(const char* const* names)
+{
+    if (!lastFilter_ || !lastFilter_->isOf(names))
+        lastFilter_ = std::make_shared<const NameSet>(takeNames(names));
+    return lastFilter_;
+}
+
 Scope* Scope::outer() const
 {
     return firstOf(core_, outer_);
@@ -42,6 +51,12 @@ Scope* Scope::firstOf(const Core& core, Scope* scope)
 Core* Scope::currentCore()
 {
     return current == nullptr ? nullptr : &current->core_;
+}
+
+std::shared_ptr<const NameSet> filterOf(Core& core, const char* const* names)
+{
+    Scope* const scope = Scope::innermost(core);
+    return scope != nullptr ? scope->filterOf(names) : std::make_shared<const NameSet>(takeNames(names));
 }
 
 OutsideScopes::OutsideScopes() : suspended_(current)

@@ -4,6 +4,7 @@
 #define CIMHOST_BROKER_SCOPE_H
 
 #include "broker/Core.h"
+#include "broker/Names.h"
 #include "broker/ObjectStore.h"
 #include "broker/Objects.h"
 
@@ -24,6 +25,8 @@ public:
     Scope& operator=(const Scope&) = delete;
 
     ObjectStore& store() { return store_; }
+    /// The names of a list that ends with a null pointer. Instances of a request have the same filter, mostly.
+    std::shared_ptr<const NameSet> filterOf(const char* const* names);
     /// The next scope around this one for the same broker; null when there is none.
     [[nodiscard]] Scope* outer() const;
     /// How many scopes of any broker this one is nested in.
@@ -44,6 +47,7 @@ private:
     Scope* outer_;
     int depth_;
     ObjectStore store_;
+    std::shared_ptr<const NameSet> lastFilter_; ///< null: there was none
 };
 
 /// While it exists, its thread is in no scope: what is made then lasts as long as the broker.
@@ -74,6 +78,10 @@ Handle& makeObject(Core& core, std::unique_ptr<Object> content)
     Scope* const scope = Scope::innermost(core);
     return scope != nullptr ? scope->store().add(std::move(content)) : makeLasting(core, std::move(content));
 }
+
+/// The names of a list that ends with a null pointer, shared within this thread's scope where they are the same as
+/// those before.
+std::shared_ptr<const NameSet> filterOf(Core& core, const char* const* names);
 
 /// The envelope of an object of that kind.
 template <class Object>

@@ -197,7 +197,9 @@ CimBinding::CimBinding(Broker& broker, std::string hostName, const RequestLimits
     : broker_(broker),
       hostName_(std::move(hostName)),
       limits_(limits),
-      budget_(std::make_shared<TextBudget>(limits.answers))
+      lists_(broker.classes(), broker.registration()),
+      budget_(std::make_shared<TextBudget>(limits.answers)),
+      slots_(std::make_unique<Slots>(limits.atOnce))
 {}
 
 std::optional<HttpResponse> CimBinding::refuse(const HttpRequest& request) const
@@ -245,8 +247,13 @@ HttpResponse CimBinding::respond(const HttpRequest& request) const
     checkOperation(request, prefix);
     checkContent(request);
     checkAccept(request);
-    const RequestMessage message = readRequest(request.body, limits_.xml);
+    RequestMessage message = readRequest(request.body, limits_.xml);
     checkMatch(request, prefix, message);
+    if (auto* const question = std::get_if<Question>(&message.content))
+        lists_.shorten(question->request.properties);
+    const std::optional<Slots::Taken> slot = slots_->take(limits_.waiting);
+    if (!slot)
+        throw HttpError{503, "too many requests are being answered, try again", {{"Retry-After", "10"}}};
     Reply reply = execute(message, broker_, *enumerations_);
     return {200, responseHeaders(prefix),
             writeResponse(message, std::move(reply), hostName_, broker_.classes(), budget_)};

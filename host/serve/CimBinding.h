@@ -6,8 +6,11 @@
 #include "broker/Broker.h"
 #include "serve/Enumerations.h"
 #include "serve/Http.h"
+#include "serve/PropertyLists.h"
+#include "serve/Slots.h"
 #include "serve/Xml.h"
 
+#include <chrono>
 #include <cstddef>
 #include <memory>
 #include <optional>
@@ -20,6 +23,8 @@ struct RequestLimits
 {
     std::size_t bytes = 1048576; ///< of the body
     XmlLimits xml;
+    unsigned int atOnce = 8;                 ///< requests that providers are asked for
+    std::chrono::milliseconds waiting{60000}; ///< for others to be answered
     std::size_t answers = 536870912; ///< bytes of all answers that their clients have not received yet
 };
 
@@ -53,7 +58,9 @@ private:
     Broker& broker_;
     std::string hostName_;
     RequestLimits limits_;
+    PropertyLists lists_;
     std::shared_ptr<TextBudget> budget_;
+    std::unique_ptr<Slots> slots_;
     std::unique_ptr<Enumerations> enumerations_ = std::make_unique<Enumerations>();
 };
 

@@ -49,6 +49,7 @@ Reply Enumerations::open(const Question& question, cim::Answer answer)
 {
     const std::lock_guard<std::mutex> lock(mutex_);
     requireRoom(); // others may have been opened since the check
+    requireRoomFor(sizeOf(answer) - std::min<std::size_t>(question.mostItems, sizeOf(answer)));
     Held held{question.request.target.nameSpace, question.items, limits_.usual, {}, std::move(answer)};
     if (question.timeout)
         held.timeout = std::chrono::seconds(*question.timeout);
@@ -91,6 +92,16 @@ void Enumerations::requireRoom()
                          std::to_string(limits_.open) + " enumerations are open, which is the most");
 }
 
+void Enumerations::requireRoomFor(std::size_t items)
+{
+    for (const auto& [context, held] : held_)
+        items += sizeOf(held.rest) - held.given;
+    if (items > limits_.items)
+        throw ValueError(serverLimitsExceeded, "the enumerations that are open would have " + std::to_string(items) +
+                                                   " items left, expected at most " +
+                                                   std::to_string(limits_.items));
+}
+
 Enumerations::Place Enumerations::find(const Question& question)
 {
     giveUpForgotten();
@@ -106,8 +117,8 @@ Reply Enumerations::nextPiece(Place place, std::uint32_t most)
 {
     Held& held = place->second;
     Reply piece;
-    piece.answer.paths = held.rest.paths.part(held.given, most);
-    piece.answer.instances = held.rest.instances.part(held.given, most);
+    piece.answer.paths = held.rest.paths.take(held.given, most);
+    piece.answer.instances = held.rest.instances.take(held.given, most);
     held.given += sizeOf(piece.answer);
     held.end = now_() + held.timeout;
     if (held.given < sizeOf(held.rest))

@@ -18,6 +18,7 @@ namespace cimhost::serve {
 struct EnumerationLimits
 {
     std::size_t open = 64;          ///< enumerations at once
+    std::size_t items = 262144;     ///< held for all of them together
     std::chrono::seconds usual{60}; ///< how long one waits for its client that did not say
     std::chrono::seconds longest{300};
 };
@@ -64,6 +65,7 @@ private:
     // All with the mutex held.
     void giveUpForgotten();
     void requireRoom();
+    void requireRoomFor(std::size_t items);
     Place find(const Question& question);
     Reply nextPiece(Place place, std::uint32_t most);
 

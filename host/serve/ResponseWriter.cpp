@@ -38,6 +38,7 @@ public:
           origins_(question.includeClassOrigin.value_or(false) ? &classes : nullptr)
     {}
 
+    /// What has been written goes: its text takes less memory than it does.
     void write()
     {
         switch (question_.step) {
@@ -56,16 +57,6 @@ public:
     }
 
 private:
-    /// Writes each, which then goes: its text takes less memory than it does.
-    template <class Item, class Write>
-    static void each(std::vector<Item>& items, const Write& write)
-    {
-        for (Item& item : items) {
-            write(item);
-            item = {};
-        }
-    }
-
     template <class Content>
     void returned(const Content& content)
     {
@@ -83,10 +74,10 @@ private:
         switch (operation) {
         case Operation::enumerateInstanceNames:
         case Operation::createInstance:
-            each(answer_.paths, [&](const cim::ObjectPath& path) { writeInstanceName(xml_, path); });
+            answer_.paths.drain([&](const cim::ObjectPath& path) { writeInstanceName(xml_, path); });
             break;
         case Operation::enumerateInstances:
-            each(answer_.instances, [&](const cim::Instance& instance) {
+            answer_.instances.drain([&](const cim::Instance& instance) {
                 xml_.element("VALUE.NAMEDINSTANCE", [&] {
                     writeInstanceName(xml_, instance.path);
                     writeInstance(xml_, instance, origins_);
@@ -97,7 +88,7 @@ private:
             writeInstance(xml_, answer_.instances.front(), origins_);
             break;
         case Operation::execQuery:
-            each(answer_.instances, [&](const cim::Instance& instance) {
+            answer_.instances.drain([&](const cim::Instance& instance) {
                 xml_.element("VALUE.OBJECT", [&] { writeInstance(xml_, instance); });
             });
             break;
@@ -107,7 +98,7 @@ private:
             break;
         case Operation::associatorNames:
         case Operation::referenceNames:
-            each(answer_.paths, [&](const cim::ObjectPath& path) {
+            answer_.paths.drain([&](const cim::ObjectPath& path) {
                 xml_.element("OBJECTPATH", [&] { writePath(path); });
             });
             break;
@@ -119,7 +110,7 @@ private:
     void writePiece()
     {
         returned([&] {
-            each(answer_.paths, [&](const cim::ObjectPath& path) { writePath(path); });
+            answer_.paths.drain([&](const cim::ObjectPath& path) { writePath(path); });
             writeInstancesWithPaths("VALUE.INSTANCEWITHPATH");
         });
         const auto writeOut = [&](const char* name, const char* type, const std::string& value) {
@@ -135,7 +126,7 @@ private:
 
     void writeInstancesWithPaths(const char* element)
     {
-        each(answer_.instances, [&](const cim::Instance& instance) {
+        answer_.instances.drain([&](const cim::Instance& instance) {
             xml_.element(element, [&] {
                 writePath(instance.path);
                 writeInstance(xml_, instance, origins_);

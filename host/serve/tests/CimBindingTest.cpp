@@ -267,6 +267,16 @@ TEST_F(Binding, answersAllStepsOfAnEnumeration)
     }
 }
 
+TEST_F(Binding, answersSoManyAtOnce)
+{
+    RequestLimits limits;
+    limits.atOnce = 0;
+    limits.waiting = std::chrono::milliseconds(1);
+    const HttpResponse response = CimBinding(broker, "here", limits).answer(request);
+    EXPECT_EQ(response.status, 503U);
+    EXPECT_EQ(headerOf(response, "Retry-After"), "10");
+}
+
 TEST_F(Binding, answersWhatIsNotServedByAStatus)
 {
     request.body = callOf("CreateClass", "");

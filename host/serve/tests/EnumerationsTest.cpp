@@ -76,7 +76,7 @@ protected:
     }
 
     Enumerations::Clock::time_point now{};
-    Enumerations enumerations{{2, std::chrono::seconds(60), std::chrono::seconds(300)},
+    Enumerations enumerations{{2, 100, std::chrono::seconds(60), std::chrono::seconds(300)},
                               [this] { return now; }};
 };
 
@@ -141,6 +141,16 @@ TEST_F(PulledEnumerations, AreLimitedInNumber)
     EXPECT_EQ(codeOf([&] { open(2); }), serverLimitsExceeded);
     EXPECT_EQ(pull(first, 2), "0 1 .");
     EXPECT_NE(open(2), "");
+}
+
+TEST_F(PulledEnumerations, AreLimitedInWhatTheyHold)
+{
+    const std::string first = open(6, 1); // five are left
+    EXPECT_NE(first, "");
+    EXPECT_EQ(codeOf([&] { open(96); }), serverLimitsExceeded);
+    EXPECT_EQ(open(96, 96), "") << "nothing is held";
+    EXPECT_EQ(pull(first, 1), "1 ");
+    EXPECT_NE(open(96), "");
 }
 
 TEST_F(PulledEnumerations, AreGivenUpWhenTheirClientLeavesThem)
