@@ -77,18 +77,18 @@ Text XmlWriter::take()
     return std::move(text_);
 }
 
+/// A failure is told to the caller of the next function: the library would write about it to standard error.
 int XmlWriter::append(void* self, const char* bytes, int count)
 {
     auto& writer = *static_cast<XmlWriter*>(self);
     if (writer.failure_)
-        return -1;
+        return count;
     try {
         writer.text_.append({bytes, static_cast<std::size_t>(count)});
-        return count;
     } catch (...) {
         writer.failure_ = std::current_exception();
-        return -1;
     }
+    return count;
 }
 
 /// The library itself fails for want of memory only.
