@@ -41,15 +41,22 @@ public:
 
     /// The elements as they are shared.
     [[nodiscard]] const std::vector<CopyOnWrite<T>>& shared() const { return elements_; }
+    /// At most that many, from that index on; none behind the end.
+    [[nodiscard]] SharedList part(std::size_t from, std::size_t most) const
+    {
+        SharedList taken;
+        const auto begin = elements_.begin() + static_cast<std::ptrdiff_t>(std::min(from, size()));
+        const auto left = static_cast<std::size_t>(elements_.end() - begin);
+        taken.elements_.assign(begin, begin + static_cast<std::ptrdiff_t>(std::min(most, left)));
+        return taken;
+    }
     /// At most that many, from that index on, which the list lets go of: they are not to be read from it any more.
     /// None behind the end.
     SharedList take(std::size_t from, std::size_t most)
     {
         SharedList taken;
-        const auto begin = elements_.begin() + static_cast<std::ptrdiff_t>(std::min(from, size()));
-        const auto left = static_cast<std::size_t>(elements_.end() - begin);
-        const auto end = begin + static_cast<std::ptrdiff_t>(std::min(most, left));
-        taken.elements_.assign(std::make_move_iterator(begin), std::make_move_iterator(end));
+        for (; from < size() && taken.size() < most; ++from)
+            taken.elements_.push_back(std::move(elements_[from]));
         return taken;
     }
     /// \param use  called with each element, which goes then; the list is empty at the end

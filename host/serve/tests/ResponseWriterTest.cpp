@@ -224,14 +224,14 @@ TEST(ResponseWriter, refusesWhatTheBudgetDoesNotHold)
 {
     Reply reply;
     const cim::Instance instance{{"", "", "CIM_A", {}}, {{"P", cim::textValue(std::string(50000, 'x'))}}};
-    reply.answer.instances.assign(4, instance);
+    reply.answer.instances = {instance, instance, instance, instance};
     const RequestMessage request = requestFor(Operation::enumerateInstances);
     const auto budget = std::make_shared<TextBudget>(150000);
     EXPECT_THAT(writeResponse(request, reply, "here", {}, budget).whole(),
                 HasSubstr("<ERROR CODE=\"27\" DESCRIPTION=\"the answers that are being given take all"));
     EXPECT_TRUE(budget->take(150000)) << "nothing is kept of it";
     budget->giveBack(150000);
-    reply.answer.instances.resize(2);
+    reply.answer.instances = {instance, instance};
     EXPECT_THAT(writeResponse(request, reply, "here", {}, budget).whole(), HasSubstr("</IRETURNVALUE>"));
 }
 
