@@ -1,5 +1,6 @@
 // Request messages of CIM-XML: read, or refused with a line that may go to a terminal. What is read is
-// answered, and an instance that was read is written so that it is read again as the same.
+// answered, and an instance that was read is written so that it is read again as the same. What a document has is
+// counted before it is read as what is found in it.
 
 #include "FuzzTarget.h"
 
@@ -11,17 +12,65 @@
 #include "serve/ValueReader.h"
 #include "serve/ValueWriter.h"
 
+#include <algorithm>
+#include <string>
+#include <utility>
+
 using namespace cimhost;
 using namespace cimhost::serve;
 
 namespace {
 
 /// Enough for what is inside of any message.
-constexpr XmlLimits wide{1000, 1000000};
+constexpr XmlLimits wide{1000, 1000000, 1000000, 1000000, 1000000};
 
 Element parse(const std::string& document)
 {
     return parseXml(document, wide, &isKnownElement);
+}
+
+/// What was found in an element, itself included.
+XmlLimits countsOf(const Element& element)
+{
+    XmlLimits counts{1, 1, element.attributes.size(), element.attributes.size(), 0};
+    for (const Element& child : element.children) {
+        const XmlLimits inside = countsOf(child);
+        counts.depth = std::max(counts.depth, inside.depth + 1);
+        counts.elements += inside.elements;
+        counts.attributes += inside.attributes;
+        counts.attributesOfElement = std::max(counts.attributesOfElement, inside.attributesOfElement);
+    }
+    return counts;
+}
+
+bool isWithin(const XmlLimits& limits, std::string_view document)
+{
+    try {
+        requireWithin(limits, document);
+        return true;
+    } catch (const RequestError& error) {
+        Fuzz::require(error.fault() == Fault::tooLarge, "it is refused for its size alone");
+        return false;
+    }
+}
+
+/// With a limit that is too small by one it is refused. Names with a prefix are counted and not found.
+void checkCounts(const std::string& document)
+{
+    const XmlLimits counts =
+        countsOf(parseXml(document, wide, [](std::string_view /*name*/) { return true; }));
+    XmlLimits exact = wide;
+    exact.depth = counts.depth;
+    exact.elements = counts.elements;
+    Fuzz::require(isWithin(exact, document), "no more elements are counted than there are");
+    for (std::size_t XmlLimits::*limit : {&XmlLimits::depth, &XmlLimits::elements, &XmlLimits::attributes,
+                                          &XmlLimits::attributesOfElement}) {
+        XmlLimits narrow = wide;
+        if (counts.*limit == 0)
+            continue;
+        narrow.*limit = counts.*limit - 1;
+        Fuzz::require(!isWithin(narrow, document), "nothing is there that is not counted");
+    }
 }
 
 void checkRoundTrip(cim::Instance instance)
@@ -54,6 +103,11 @@ void checkResponse(const RequestMessage& message)
 
 int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size)
 {
+    try {
+        checkCounts(Fuzz::textOf(data, size));
+    } catch (const RequestError&) {
+        // It is no document.
+    }
     try {
         const RequestMessage message = readRequest(Fuzz::textOf(data, size));
         checkResponse(message);
