@@ -43,14 +43,16 @@ int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size)
     const HttpRequest request = requestOf(Fuzz::textOf(data, size));
     for (const bool isLocal : {false, true}) {
         if (const std::optional<HttpError> refusal = refusalOf(request, isLocal)) {
-            Fuzz::require(refusal->status >= 400 && refusal->status < 600, "a refusal has a status of errors");
+            Fuzz::require(refusal->status >= 400 && refusal->status < 600,
+                          "a refusal has a status of errors");
             Fuzz::require(cim::printable(refusal->message) == refusal->message, "it may go to a terminal");
             continue;
         }
         Fuzz::require(countOf(request, "Content-Length") + countOf(request, "Transfer-Encoding") <= 1,
                       "there is one length");
         Fuzz::require(countOf(request, "Origin") == 0, "it comes of no page");
-        Fuzz::require(countOf(request, "Host") == 1 || (countOf(request, "Host") == 0 && request.version == "HTTP/1.0"),
+        Fuzz::require(countOf(request, "Host") == 1 ||
+                          (countOf(request, "Host") == 0 && request.version == "HTTP/1.0"),
                       "there is one host");
         const std::string* const host = findHeader(request, "Host");
         if (isLocal && host != nullptr)

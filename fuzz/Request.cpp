@@ -63,8 +63,8 @@ void checkCounts(const std::string& document)
     exact.depth = counts.depth;
     exact.elements = counts.elements;
     Fuzz::require(isWithin(exact, document), "no more elements are counted than there are");
-    for (std::size_t XmlLimits::*limit : {&XmlLimits::depth, &XmlLimits::elements, &XmlLimits::attributes,
-                                          &XmlLimits::attributesOfElement}) {
+    for (std::size_t XmlLimits::*limit :
+         {&XmlLimits::depth, &XmlLimits::elements, &XmlLimits::attributes, &XmlLimits::attributesOfElement}) {
         XmlLimits narrow = wide;
         if (counts.*limit == 0)
             continue;

@@ -43,7 +43,9 @@ inline bool contains(const std::vector<std::string>& names, std::string_view nam
 class NameSet
 {
 public:
-    explicit NameSet(std::vector<std::string> names) : names_(std::move(names)), sorted_(names_.begin(), names_.end())
+    explicit NameSet(std::vector<std::string> names)
+        : names_(std::move(names)),
+          sorted_(names_.begin(), names_.end())
     {
         std::sort(sorted_.begin(), sorted_.end(), &isLess);
     }

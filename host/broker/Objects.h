@@ -33,7 +33,7 @@ struct InstanceObject
 
     cim::CopyOnWrite<cim::Instance> content;
     std::shared_ptr<const NameSet> wanted; ///< the property filter; null: every property
-    std::vector<std::string> keyNames;              ///< the filter's key list
+    std::vector<std::string> keyNames;     ///< the filter's key list
     /// Those that the class declares, kept by the broker's classes; null: it is not known, or has none.
     const std::vector<std::string>* classKeys = nullptr;
     /// References that the filter keeps out of the properties; they still identify the instance.

@@ -6,6 +6,7 @@
 
 #include <array>
 #include <csignal>
+#include <cstdlib>
 #include <optional>
 #include <ostream>
 #include <string>
@@ -42,6 +43,10 @@ ExitStatus serveUntilSignal(const Serve& command, Broker& broker, std::ostream& 
         << ", for development only: no authentication, no encryption" << std::endl;
     signals.wait();
     err << "cimhost: ending" << std::endl;
+    if (!server->finish()) {
+        err << "cimhost: a provider has not answered in time" << std::endl;
+        std::_Exit(exitError); // ending in order would wait for it
+    }
     return exitAnswered;
 }
 

@@ -23,7 +23,7 @@ struct RequestLimits
 {
     std::size_t bytes = 1048576; ///< of the body
     XmlLimits xml;
-    unsigned int atOnce = 8;                 ///< requests that providers are asked for
+    unsigned int atOnce = 8;                  ///< requests that providers are asked for
     std::chrono::milliseconds waiting{60000}; ///< for others to be answered
     std::size_t answers = 536870912; ///< bytes of all answers that their clients have not received yet
 };

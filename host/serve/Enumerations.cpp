@@ -97,8 +97,8 @@ void Enumerations::requireRoomFor(std::size_t items)
     for (const auto& [context, held] : held_)
         items += sizeOf(held.rest) - held.given;
     if (items > limits_.items)
-        throw ValueError(serverLimitsExceeded, "the enumerations that are open would have " + std::to_string(items) +
-                                                   " items left, expected at most " +
+        throw ValueError(serverLimitsExceeded, "the enumerations that are open would have " +
+                                                   std::to_string(items) + " items left, expected at most " +
                                                    std::to_string(limits_.items));
 }
 

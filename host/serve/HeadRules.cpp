@@ -74,8 +74,9 @@ std::string_view hostOf(std::string_view authority)
         return authority;
     const std::string_view host = authority.substr(0, authority[end] == ']' ? end + 1 : end);
     const std::string_view port = authority.substr(host.size());
-    return port.empty() || port == ":" || (port.front() == ':' && isNumber(port.substr(1))) ? host
-                                                                                            : std::string_view();
+    return port.empty() || port == ":" || (port.front() == ':' && isNumber(port.substr(1)))
+               ? host
+               : std::string_view();
 }
 
 /// The authority of a target such as http://a:1/cimom, which goes before that of Host; nothing: the target has none.
@@ -134,7 +135,8 @@ bool isLoopbackHost(std::string_view host)
     in_addr four{};
     in6_addr six{};
     if (!isBracketed)
-        return inet_pton(AF_INET, address.c_str(), &four) == 1 && (ntohl(four.s_addr) >> 24U) == IN_LOOPBACKNET;
+        return inet_pton(AF_INET, address.c_str(), &four) == 1 &&
+               (ntohl(four.s_addr) >> 24U) == IN_LOOPBACKNET;
     return inet_pton(AF_INET6, address.c_str(), &six) == 1 &&
            (IN6_IS_ADDR_LOOPBACK(&six) || (IN6_IS_ADDR_V4MAPPED(&six) && six.s6_addr[12] == IN_LOOPBACKNET));
 }

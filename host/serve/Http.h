@@ -20,8 +20,8 @@ struct HeaderField
 struct HttpRequest
 {
     std::string method;
-    std::string target;  ///< such as /cimom
-    std::string version; ///< such as HTTP/1.1
+    std::string target;               ///< such as /cimom
+    std::string version;              ///< such as HTTP/1.1
     std::vector<HeaderField> headers; ///< a name may stand there several times
     std::string body;
 };

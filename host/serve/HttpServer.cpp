@@ -87,14 +87,21 @@ public:
 
     ~Implementation()
     {
-        isEnding_ = true;
-        close(MHD_quiesce_daemon(daemon_));
-        waitForRequests();
+        finish();
         MHD_stop_daemon(daemon_);
     }
 
     Implementation(const Implementation&) = delete;
     Implementation& operator=(const Implementation&) = delete;
+
+    bool finish()
+    {
+        if (!isEnding_.exchange(true))
+            close(MHD_quiesce_daemon(daemon_));
+        std::unique_lock<std::mutex> lock(mutex_);
+        allEnded_.wait_for(lock, limits_.farewell, [&] { return requests_ == 0; });
+        return asked_ == 0;
+    }
 
     [[nodiscard]] const Endpoint& endpoint() const { return socket_.endpoint; }
 
@@ -177,12 +184,6 @@ private:
             allEnded_.notify_all();
     }
 
-    void waitForRequests()
-    {
-        std::unique_lock<std::mutex> lock(mutex_);
-        allEnded_.wait_for(lock, limits_.farewell, [&] { return requests_ == 0; });
-    }
-
     /// Where a request is refused, what follows it cannot be told from its body: the connection is closed.
     MHD_Result takeHeaders(MHD_Connection* connection, Exchange& exchange) const
     {
@@ -222,7 +223,9 @@ private:
     {
         const int socket = socketOf(connection);
         deadlines_.end(socket); // the broker may take its time
+        ++asked_;
         HttpResponse response = exchange.isTooLarge ? binding_.tooLarge() : binding_.answer(exchange.request);
+        --asked_;
         deadlines_.begin(socket);
         return send(connection, std::move(response), false);
     }
@@ -233,7 +236,8 @@ private:
     std::mutex mutex_;
     std::condition_variable allEnded_;
     std::atomic<bool> isEnding_ = false;
-    int requests_ = 0; ///< those that are being read, answered or sent
+    std::atomic<int> asked_ = 0; ///< requests that the binding is asked for
+    int requests_ = 0;           ///< those that are being read, answered or sent
     Deadlines deadlines_;
     MHD_Daemon* daemon_;
 };
@@ -243,6 +247,11 @@ HttpServer::HttpServer(const Endpoint& endpoint, const CimBinding& binding, cons
 {}
 
 HttpServer::~HttpServer() = default;
+
+bool HttpServer::finish()
+{
+    return implementation_->finish();
+}
 
 const Endpoint& HttpServer::endpoint() const
 {

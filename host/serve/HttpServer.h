@@ -30,10 +30,14 @@ public:
     /// \param binding  outlives this object
     /// \throws ListenError
     HttpServer(const Endpoint& endpoint, const CimBinding& binding, const ServerLimits& limits = {});
-    /// Takes no more connections, lets the requests that are there be answered, and ends.
+    /// Finishes and ends. A provider that is still being asked is waited for, however long it takes.
     ~HttpServer();
     HttpServer(const HttpServer&) = delete;
     HttpServer& operator=(const HttpServer&) = delete;
+
+    /// Takes no more connections, and lets the requests that are there be answered within the time of the limits.
+    /// \return whether no provider is being asked any more
+    bool finish();
 
     /// Where it listens, with the port that was found free if any was asked for.
     [[nodiscard]] const Endpoint& endpoint() const;

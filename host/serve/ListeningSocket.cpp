@@ -37,8 +37,8 @@ std::uint16_t portOf(const sockaddr_storage& address)
 std::string numbersOf(const sockaddr_storage& address, socklen_t length)
 {
     std::array<char, NI_MAXHOST> numbers{};
-    return getnameinfo(reinterpret_cast<const sockaddr*>(&address), length, numbers.data(), numbers.size(), nullptr, 0,
-                       NI_NUMERICHOST) == 0
+    return getnameinfo(reinterpret_cast<const sockaddr*>(&address), length, numbers.data(), numbers.size(),
+                       nullptr, 0, NI_NUMERICHOST) == 0
                ? numbers.data()
                : "";
 }

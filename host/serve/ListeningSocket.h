@@ -34,7 +34,7 @@ private:
 /// A socket that waits for connections, and where it does.
 struct ListeningSocket
 {
-    int descriptor; ///< the caller's to close
+    int descriptor;    ///< the caller's to close
     Endpoint endpoint; ///< with the address in numbers
 };
 

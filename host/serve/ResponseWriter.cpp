@@ -98,9 +98,8 @@ private:
             break;
         case Operation::associatorNames:
         case Operation::referenceNames:
-            answer_.paths.drain([&](const cim::ObjectPath& path) {
-                xml_.element("OBJECTPATH", [&] { writePath(path); });
-            });
+            answer_.paths.drain(
+                [&](const cim::ObjectPath& path) { xml_.element("OBJECTPATH", [&] { writePath(path); }); });
             break;
         default:
             break;

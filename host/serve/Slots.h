@@ -21,7 +21,11 @@ public:
     {
     public:
         explicit Taken(Slots& slots) : slots_(&slots) {}
-        ~Taken() { if (slots_ != nullptr) slots_->giveBack(); }
+        ~Taken()
+        {
+            if (slots_ != nullptr)
+                slots_->giveBack();
+        }
         Taken(Taken&& other) noexcept : slots_(std::exchange(other.slots_, nullptr)) {}
         Taken(const Taken&) = delete;
         Taken& operator=(const Taken&) = delete;

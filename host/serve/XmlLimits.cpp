@@ -26,7 +26,8 @@ public:
 
     void count()
     {
-        for (position_ = document_.find('<'); position_ < document_.size(); position_ = document_.find('<', position_))
+        for (position_ = document_.find('<'); position_ < document_.size();
+             position_ = document_.find('<', position_))
             if (!skipOpaque())
                 takeTag();
     }
@@ -135,8 +136,8 @@ std::string placeAt(std::string_view document, std::size_t position)
     const auto line = 1 + std::count(before.begin(), before.end(), '\n');
     const std::size_t lineStart = before.rfind('\n') + 1; // 0 in the first line
     const auto isCharacter = [](char byte) { return (static_cast<unsigned char>(byte) & 0xC0) != 0x80; };
-    const auto column = 1 + std::count_if(before.begin() + static_cast<std::ptrdiff_t>(lineStart), before.end(),
-                                          isCharacter);
+    const auto column =
+        1 + std::count_if(before.begin() + static_cast<std::ptrdiff_t>(lineStart), before.end(), isCharacter);
     return "line " + std::to_string(line) + ", column " + std::to_string(column) + ": ";
 }
 

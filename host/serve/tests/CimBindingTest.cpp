@@ -262,7 +262,8 @@ TEST_F(Binding, answersAllStepsOfAnEnumeration)
           {"EnumerationCount", parameter("EnumerationContext", text("x")), "21"}}) {
         request.body = callOf(method, parameters);
         set("CIMMethod", method);
-        EXPECT_THAT(binding.answer(request).body.whole(), HasSubstr(std::string("<ERROR CODE=\"") + code + '"'))
+        EXPECT_THAT(binding.answer(request).body.whole(),
+                    HasSubstr(std::string("<ERROR CODE=\"") + code + '"'))
             << method;
     }
 }
@@ -288,7 +289,8 @@ TEST_F(Binding, answersWhatIsNotServedByAStatus)
         R"(</LOCALNAMESPACEPATH><CLASSNAME NAME="CIM_A"/></LOCALCLASSPATH></METHODCALL></SIMPLEREQ>)");
     set("CIMMethod", "Reset");
     set("CIMObject", "a%3ACIM_A");
-    EXPECT_THAT(binding.answer(request).body.whole(), HasSubstr("<METHODRESPONSE NAME=\"Reset\"><ERROR CODE=\"7\""));
+    EXPECT_THAT(binding.answer(request).body.whole(),
+                HasSubstr("<METHODRESPONSE NAME=\"Reset\"><ERROR CODE=\"7\""));
 }
 
 } // namespace

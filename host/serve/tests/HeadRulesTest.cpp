@@ -57,12 +57,13 @@ TEST_F(Head, needNotNameOneInHttp10)
 
 TEST_F(Head, namesALoopbackHostWhereOnlyThisMachineConnects)
 {
-    for (const char* host : {"localhost", "LocalHost:5988", "localhost.", "127.0.0.1", "127.0.0.1:5988", "127.1.2.3:1",
-                             "[::1]", "[::1]:5988", "[::ffff:127.0.0.1]:5988", "localhost:"})
+    for (const char* host : {"localhost", "LocalHost:5988", "localhost.", "127.0.0.1", "127.0.0.1:5988",
+                             "127.1.2.3:1", "[::1]", "[::1]:5988", "[::ffff:127.0.0.1]:5988", "localhost:"})
         EXPECT_EQ(refusalOfHost(host), 0U) << host;
-    for (const char* host : {"evil.example", "evil.example:5988", "", "localhost.evil.example", "127.0.0.1.evil.example",
-                             "128.0.0.1", "0.0.0.0", "127.1", "2130706433", "[::2]", "[::]", "[::1", "::1", "localhost:a",
-                             "127.0.0.1:5988:1", "[::1]a", "[127.0.0.1]", "user@localhost", "localhost@evil.example"})
+    for (const char* host :
+         {"evil.example", "evil.example:5988", "", "localhost.evil.example", "127.0.0.1.evil.example",
+          "128.0.0.1", "0.0.0.0", "127.1", "2130706433", "[::2]", "[::]", "[::1", "::1", "localhost:a",
+          "127.0.0.1:5988:1", "[::1]a", "[127.0.0.1]", "user@localhost", "localhost@evil.example"})
         EXPECT_NE(refusalOfHost(host), 0U) << host;
     EXPECT_EQ(refusalOfHost("evil.example"), 421U);
     EXPECT_EQ(refusalOfHost("evil.example:5988", false), 0U) << "an address that has names of its own";
@@ -72,7 +73,8 @@ TEST_F(Head, namesALoopbackHostWhereOnlyThisMachineConnects)
 
 TEST_F(Head, namesItInTheTargetToo)
 {
-    for (const char* target : {"http://evil.example/cimom", "HTTP://evil.example:5988", "http://a@evil.example/"}) {
+    for (const char* target :
+         {"http://evil.example/cimom", "HTTP://evil.example:5988", "http://a@evil.example/"}) {
         request.target = target;
         EXPECT_NE(refusalOfHost("localhost"), 0U) << target;
     }

@@ -250,7 +250,8 @@ TEST_F(Server, refusesByTheHeadAndCloses)
     }
     EXPECT_THAT(ask("POST /cimom HTTP/1.0\r\n" + head.substr(head.find("Content-Type")) +
                     "Content-Length: " + std::to_string(body.size()) + "\r\n\r\n" + body),
-                HasSubstr("<ERROR CODE=\"3\"")) << "a client of HTTP/1.0 names no host";
+                HasSubstr("<ERROR CODE=\"3\""))
+        << "a client of HTTP/1.0 names no host";
     expectServes();
 }
 
@@ -377,6 +378,29 @@ TEST_F(Server, answersWhatIsThereWhenItEnds)
     EXPECT_TRUE(busy.isClosed());
 }
 
+TEST_F(Server, saysWhetherAProviderIsStillAsked)
+{
+    RequestLimits requests;
+    requests.atOnce = 0; // all wait for others, as they do for a provider
+    requests.waiting = std::chrono::seconds(1);
+    const CimBinding waiting(broker, "here", requests);
+    ServerLimits limits;
+    limits.farewell = std::chrono::seconds(0);
+    HttpServer busy({"127.0.0.1", 0}, waiting, limits);
+    Connection connection(busy.endpoint());
+    connection.send(head + "Expect: 100-continue\r\nContent-Length: " + std::to_string(body.size()) +
+                    "\r\n\r\n");
+    connection.waitForContinue();
+    EXPECT_TRUE(busy.finish()) << "it is being read";
+    connection.send(body);
+    auto response = std::async(std::launch::async, [&] { return connection.receive(); });
+    bool isAsked = false;
+    while (!isAsked && response.wait_for(std::chrono::milliseconds(1)) == std::future_status::timeout)
+        isAsked = !busy.finish();
+    EXPECT_TRUE(isAsked);
+    EXPECT_THAT(response.get(), StartsWith("HTTP/1.1 503 "));
+}
+
 TEST_F(Server, tellsBusyClientsThatItEnds)
 {
     ServerLimits limits;
@@ -384,7 +408,8 @@ TEST_F(Server, tellsBusyClientsThatItEnds)
     start(limits);
     Connection half(server->endpoint());
     const std::string request = httpRequest(body);
-    half.send(head + "Expect: 100-continue\r\n" + request.substr(head.size(), request.size() - head.size() - 1));
+    half.send(head + "Expect: 100-continue\r\n" +
+              request.substr(head.size(), request.size() - head.size() - 1));
     half.waitForContinue(); // from now on its request is counted
     std::vector<std::thread> clients;
     std::vector<std::string> last(4);

@@ -20,7 +20,8 @@ namespace {
 std::vector<std::string> shortened(cim::PropertyList list, const std::string& served = "A")
 {
     const schema::Classes classes(
-        schema::readMof("class A { string Name; string Caption; }; class B : A { string Size; };", "a.mof").classes);
+        schema::readMof("class A { string Name; string Caption; }; class B : A { string Size; };", "a.mof")
+            .classes);
     Registration registration;
     registration.classes.push_back({served, "P", "L", true, false, {}});
     PropertyLists(classes, registration).shorten(list);

@@ -303,7 +303,8 @@ TEST(PropertyReader, boundsInstancesEmbeddedInEachOther)
     for (int depth = 0; depth < 7; ++depth)
         document = embed(document);
     EXPECT_EQ(errorOf([&] { readInstance(elementOf(document), {}); }), "");
-    EXPECT_THAT(errorOf([&] { readInstance(elementOf(embed(document)), {}); }), HasSubstr("deep in each other"));
+    EXPECT_THAT(errorOf([&] { readInstance(elementOf(embed(document)), {}); }),
+                HasSubstr("deep in each other"));
 }
 
 TEST(PropertyReader, knowsEachOfManyNames)

@@ -53,15 +53,17 @@ void expectJustEnough(const std::string& document, std::size_t XmlLimits::*limit
 
 TEST(Limits, countElements)
 {
-    for (const char* document : {"<CIM><CIM/><CIM ></CIM ><X A='>'/></CIM>", "<CIM><CIM A=\"/>\"></CIM><X/><X /></CIM>",
-                                 "<?xml version=\"1.0\"?><!-- <a> --><CIM><?p <b>?><X/><X/><X/><![CDATA[<c>]]></CIM>"})
+    for (const char* document :
+         {"<CIM><CIM/><CIM ></CIM ><X A='>'/></CIM>", "<CIM><CIM A=\"/>\"></CIM><X/><X /></CIM>",
+          "<?xml version=\"1.0\"?><!-- <a> --><CIM><?p <b>?><X/><X/><X/><![CDATA[<c>]]></CIM>"})
         expectJustEnough(document, &XmlLimits::elements, 4);
 }
 
 TEST(Limits, countHowDeepElementsAre)
 {
-    for (const char* document : {"<CIM><CIM/><CIM><X/></CIM></CIM>", "<CIM><CIM A='/'><X/></CIM><CIM/></CIM>",
-                                 "<CIM><!-- <CIM> --><CIM><?p <CIM>?><X/></CIM><![CDATA[<CIM><CIM><CIM>]]></CIM>"})
+    for (const char* document :
+         {"<CIM><CIM/><CIM><X/></CIM></CIM>", "<CIM><CIM A='/'><X/></CIM><CIM/></CIM>",
+          "<CIM><!-- <CIM> --><CIM><?p <CIM>?><X/></CIM><![CDATA[<CIM><CIM><CIM>]]></CIM>"})
         expectJustEnough(document, &XmlLimits::depth, 3);
 }
 
@@ -73,14 +75,17 @@ TEST(Limits, countAttributes)
 
 TEST(Limits, countNamespaces)
 {
-    expectJustEnough("<CIM xmlns='a'><a:X xmlns:a='xmlns'><X/></a:X><X xmlns='b'/></CIM>", &XmlLimits::namespaces, 2);
-    expectJustEnough("<CIM>xmlns<X xmlns='a' /><X xmlns='a'></X><X A='' xmlns:b='a'/></CIM>", &XmlLimits::namespaces, 1);
+    expectJustEnough("<CIM xmlns='a'><a:X xmlns:a='xmlns'><X/></a:X><X xmlns='b'/></CIM>",
+                     &XmlLimits::namespaces, 2);
+    expectJustEnough("<CIM>xmlns<X xmlns='a' /><X xmlns='a'></X><X A='' xmlns:b='a'/></CIM>",
+                     &XmlLimits::namespaces, 1);
 }
 
 TEST(Limits, areThose)
 {
     EXPECT_EQ(refusalOf("<A" + numbered(100, " a", "=''") + "/>"), "");
-    EXPECT_THAT(refusalOf("<A" + numbered(101, " a", "=''") + "/>"), EndsWith("at most 100 attributes of an element"));
+    EXPECT_THAT(refusalOf("<A" + numbered(101, " a", "=''") + "/>"),
+                EndsWith("at most 100 attributes of an element"));
     std::string elements;
     for (int i = 0; i < 600; ++i)
         elements += "<A" + numbered(100, " a", "=''") + "/>";
@@ -98,8 +103,10 @@ TEST(Limits, areThose)
 TEST(Limits, holdForWhatIsNotWellFormed)
 {
     // The parser stops at each of these; what stands behind it is counted or not.
-    for (const char* document : {"", "<", "<a", "<a b", "<a b='", "<a b=\"x", "</", "</a></a></a><b>", "<!", "<!-", "<!--",
-                                 "<!--->", "<![CDATA[", "<?", "<?x", ">", "/>", "<>", "</>", "<a/", "=", "<=", "<a='", "<a =/>"})
+    for (const char* document :
+         {"",   "<",   "<a",   "<a b",   "<a b='",    "<a b=\"x", "</",   "</a></a></a><b>",
+          "<!", "<!-", "<!--", "<!--->", "<![CDATA[", "<?",       "<?x",  ">",
+          "/>", "<>",  "</>",  "<a/",    "=",         "<=",       "<a='", "<a =/>"})
         EXPECT_EQ(refusalOf(document), "") << document;
     EXPECT_EQ(refusalOf("<a " + std::string(50, '=') + ">"), "");
     EXPECT_NE(refusalOf("<a " + std::string(101, '=')), "");
