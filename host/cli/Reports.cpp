@@ -2,7 +2,9 @@
 
 #include "cim/Utf8.h"
 
+#include <cstddef>
 #include <ostream>
+#include <set>
 #include <string>
 
 namespace cimhost::cli {
@@ -47,12 +49,32 @@ void writeLine(std::ostream& err, const std::string& heading, const std::string&
     err << ": " << cim::printable(text) << '\n';
 }
 
+/// Lines that were said. A provider that makes a mistake makes it at each object, and at each request.
+class SaidLines
+{
+public:
+    /// Whether it is to be said: it was not, and not too many others were.
+    bool add(const std::string& line) { return said_.size() < most && said_.insert(line).second; }
+    [[nodiscard]] bool isFull() const { return said_.size() == most; }
+
+private:
+    static constexpr std::size_t most = 1000;
+
+    std::set<std::string> said_;
+};
+
 } // namespace
 
 Listeners reportTo(std::ostream& err, bool trace)
 {
     Listeners listeners;
-    listeners.misuse = [&err](const std::string& text) { writeLine(err, "provider misuse", "", text); };
+    listeners.misuse = [&err, said = SaidLines()](const std::string& text) mutable {
+        if (!said.add(text))
+            return;
+        writeLine(err, "provider misuse", "", text);
+        if (said.isFull())
+            writeLine(err, "provider misuse", "", "no more is told of it");
+    };
     if (trace) {
         listeners.trace = [&err](const TraceRecord& record) {
             writeLine(err, "trace " + levelName(record.level), record.component, record.text);

@@ -10,7 +10,7 @@
 namespace cimhost::cli {
 
 /// Listeners that write to `err`, which must outlive the broker: misuse always, traces and log
-/// messages if asked for. Each is one line.
+/// messages if asked for. Each is one line; the same misuse is said once.
 Listeners reportTo(std::ostream& err, bool trace);
 
 } // namespace cimhost::cli

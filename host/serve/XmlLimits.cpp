@@ -3,6 +3,7 @@
 #include "serve/Fault.h"
 
 #include <algorithm>
+#include <iterator>
 #include <string>
 #include <vector>
 
@@ -46,13 +47,14 @@ private:
 
     bool skipOpaque()
     {
-        for (const Opaque& opaque : opaques)
-            if (isAt(opaque.begin)) {
-                position_ += opaque.begin.size();
-                skipBehind(opaque.end);
-                return true;
-            }
-        return false;
+        const auto* const opaque =
+            std::find_if(std::begin(opaques), std::end(opaques),
+                         [&](const Opaque& candidate) { return isAt(candidate.begin); });
+        if (opaque == std::end(opaques))
+            return false;
+        position_ += opaque->begin.size();
+        skipBehind(opaque->end);
+        return true;
     }
 
     void takeTag()

@@ -19,6 +19,27 @@ TEST(Reports, showMisuseAlways)
     EXPECT_FALSE(listeners.log);
 }
 
+TEST(Reports, showAMisuseOnce)
+{
+    std::ostringstream err;
+    const Listeners listeners = reportTo(err, false);
+    for (int i = 0; i < 3; ++i)
+        for (const char* line : {"a", "b"})
+            listeners.misuse(line);
+    EXPECT_EQ(err.str(), "cimhost: provider misuse: a\ncimhost: provider misuse: b\n");
+}
+
+TEST(Reports, showSomeMisusesOnly)
+{
+    std::ostringstream err;
+    const Listeners listeners = reportTo(err, false);
+    for (int i = 0; i < 2000; ++i)
+        listeners.misuse(std::to_string(i));
+    const std::string end =
+        "cimhost: provider misuse: 999\ncimhost: provider misuse: no more is told of it\n";
+    EXPECT_EQ(err.str().substr(err.str().size() - end.size()), end);
+}
+
 TEST(Reports, showTracesByLevelAndComponent)
 {
     std::ostringstream err;
