@@ -33,8 +33,8 @@ def operation(method, parameters, count_of, count):
     return Case(method, message, headers, 200, count_of, count)
 
 
-def hostile(name, message, status, text):
-    return Case(name, message, call("GetInstance", "")[1], status, text, 1)
+def hostile(name, message, status, text, **headers):
+    return Case(name, message, {**call("GetInstance", "")[1], **headers}, status, text, 1)
 
 
 # The inventory has 13 indicators.
@@ -57,6 +57,9 @@ CASES = [
     hostile("an entity bomb", BOMB, 400, "found a document type declaration"),
     hostile("deep nesting", b"<CIM>" * 2000, 413, "deep in each other"),
     hostile("many elements", b"<CIM>" + b"<VALUE/>" * 20000 + b"</CIM>", 413, "at most 20000 elements"),
+    hostile("many attributes", b"<CIM" + b" a=''" * 150000 + b"/>", 413, "at most 100 attributes of an element"),
+    hostile("a page in a browser", call("GetInstance", "")[0], 403, "Origin", Origin="http://evil.example"),
+    hostile("another host's name", call("GetInstance", "")[0], 421, "Host", Host="evil.example"),
     hostile("a huge attribute", b'<CIM CIMVERSION="' + b"x" * 100000 + b'"/>', 501, "expected 2.x"),
     hostile("another encoding", "<CIM/>".encode("utf-16"), 400, "not UTF-8"),
     hostile("half a message", call("GetInstance", "")[0][:-20], 400, "well-formed"),
