@@ -10,6 +10,7 @@
 #include <stdexcept>
 #include <string>
 #include <string_view>
+#include <utility>
 
 namespace cimhost::serve {
 
@@ -40,7 +41,7 @@ class Text
 public:
     /// \param budget  what it takes of; null: as much as there is memory
     explicit Text(std::shared_ptr<TextBudget> budget = nullptr) : budget_(std::move(budget)) {}
-    Text(std::string text); // NOLINT(google-explicit-constructor,hicpp-explicit-conversions): a text is one
+    explicit Text(std::string text);
     ~Text();
     Text(Text&& other) noexcept;
     Text& operator=(Text&& other) noexcept;

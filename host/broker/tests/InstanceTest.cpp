@@ -104,6 +104,24 @@ TEST_F(InstanceTest, DropsWhatTheFilterDoesNotName)
     expectNoMisuse();
 }
 
+TEST_F(InstanceTest, HasAFilterOfItsOwn)
+{
+    // A provider has one list for its instances, and may change it between two of them.
+    const char* list[] = {"First", "Second", nullptr};
+    CMPIInstance* const others[] = {mb()->eft->newInstance(mb(), newPath(), nullptr),
+                                    mb()->eft->newInstance(mb(), newPath(), nullptr)};
+    EXPECT_EQ(ft_.setPropertyFilter(instance_, list, nullptr), CMPI_RC_OK);
+    EXPECT_EQ(ft_.setPropertyFilter(others[0], list, nullptr), CMPI_RC_OK);
+    list[1] = nullptr;
+    EXPECT_EQ(ft_.setPropertyFilter(others[1], list, nullptr), CMPI_RC_OK);
+    for (CMPIInstance* const instance : {instance_, others[0], others[1]})
+        for (const char* name : {"first", "second", "third"})
+            setText(name, "x", instance);
+    EXPECT_THAT(propertyNames(), ElementsAre("first", "second"));
+    EXPECT_EQ(read(others[0])->properties.size(), 2U);
+    EXPECT_EQ(read(others[1])->properties.size(), 1U);
+}
+
 TEST_F(InstanceTest, FiltersWhatIsThereAlready)
 {
     setText("Other", "2");

@@ -312,9 +312,9 @@ TEST(PropertyReader, knowsEachOfManyNames)
     const auto instance = [](const std::string& last) {
         std::string properties;
         for (int i = 0; i < 19000; ++i)
-            properties += "<PROPERTY NAME=\"p" + std::to_string(i) + "\" TYPE=\"string\"/>";
-        return elementOf("<INSTANCE CLASSNAME=\"B\">" + properties + "<PROPERTY NAME=\"" + last +
-                         "\" TYPE=\"string\"/></INSTANCE>");
+            properties += R"(<PROPERTY NAME="p)" + std::to_string(i) + R"(" TYPE="string"/>)";
+        return elementOf(R"(<INSTANCE CLASSNAME="B">)" + properties + R"(<PROPERTY NAME=")" + last +
+                         R"(" TYPE="string"/></INSTANCE>)");
     };
     EXPECT_EQ(readInstance(instance("p19000"), {}).properties.size(), 19001U);
     EXPECT_THAT(errorOf([&] { readInstance(instance("P7"), {}); }), HasSubstr("the property P7 again"));

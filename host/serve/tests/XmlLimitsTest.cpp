@@ -36,7 +36,7 @@ std::string numbered(int count, const std::string& name, const std::string& rest
 {
     std::string all;
     for (int i = 0; i < count; ++i)
-        all += name + std::to_string(i) + rest;
+        all.append(name).append(std::to_string(i)).append(rest);
     return all;
 }
 
