@@ -12,7 +12,8 @@ function(add_support_library name alias)
     target_link_libraries(${name} PRIVATE glimmark::settings)
 
     set(exports ${CMAKE_CURRENT_SOURCE_DIR}/exports.map)
-    target_link_options(${name} PRIVATE LINKER:--version-script=${exports})
+    # What is exported stays the library's own for its own calls, whatever else the process has loaded.
+    target_link_options(${name} PRIVATE LINKER:--version-script=${exports} LINKER:-Bsymbolic)
     # The support libraries lie side by side, in the build tree as where they are installed.
     set_target_properties(
         ${name}

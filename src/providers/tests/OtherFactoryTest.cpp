@@ -1,6 +1,7 @@
 // What the operations make of answers that the factory of today never gives: instances beside a result other
 // than 0, instances of another class, lists with null pointers. Functions of the factory stand here in the
-// place of the library's, whose calls the loader binds to those of the executable.
+// place of the library's: in the build of it that this program is run with, the loader binds the library's calls
+// to those of the executable.
 
 #include "GlimmarkFactory.h"
 #include "testing/Operations.h"

@@ -1,0 +1,30 @@
+# No library leaves it to the loader which of its own functions and tables it uses. Run as
+#   cmake "-DLIBRARIES=FILE;..." -DREADELF=... -DNM=... -P THIS
+
+cmake_minimum_required(VERSION 3.20)
+include(${CMAKE_CURRENT_LIST_DIR}/../../cmake/RunTool.cmake)
+
+foreach(library IN LISTS LIBRARIES)
+    run_tool(symbols ${NM} --dynamic --defined-only --format=posix ${library})
+    string(REGEX MATCHALL "[^ \n]+ [A-Za-z] [^\n]*" own "${symbols}")
+    list(TRANSFORM own REPLACE "[ @].*" "")
+    if(NOT own)
+        message(SEND_ERROR "${library} exports nothing:\n${symbols}")
+    endif()
+    run_tool(relocations ${READELF} --relocs --wide ${library})
+    # Offset, info, type, the symbol's value and its name.
+    string(REGEX MATCHALL "\n[0-9a-f]+ +[0-9a-f]+ +R_[A-Z0-9_]+ +[0-9a-f]+ [^\n]*" named "${relocations}")
+    if(NOT named)
+        message(SEND_ERROR "${library} needs nothing by its name:\n${relocations}")
+    endif()
+    list(TRANSFORM named REPLACE ".*R_[A-Z0-9_]+ +[0-9a-f]+ +([^ @]+).*" "\\1")
+    set(left)
+    foreach(name IN LISTS named)
+        if(name IN_LIST own)
+            list(APPEND left ${name})
+        endif()
+    endforeach()
+    if(left)
+        message(SEND_ERROR "${library} leaves to the loader which it uses: ${left}")
+    endif()
+endforeach()
