@@ -120,3 +120,9 @@ if(GLIMMARK_COVERAGE)
     add_compile_options(--coverage -O0)
     add_link_options(--coverage)
 endif()
+
+# What is shared with others is compared with its description, types included (scripts/check-interface): it is compiled
+# with all debug information. link against glimmark::described.
+add_library(glimmark_described INTERFACE)
+add_library(glimmark::described ALIAS glimmark_described)
+target_compile_options(glimmark_described INTERFACE $<$<CONFIG:RelWithDebInfo>:-g>)

@@ -9,7 +9,7 @@ function(add_support_library name alias)
     target_include_directories(
         ${name} PUBLIC $<BUILD_INTERFACE:${CMAKE_CURRENT_SOURCE_DIR}/include>
                        $<INSTALL_INTERFACE:${CMAKE_INSTALL_INCLUDEDIR}>)
-    target_link_libraries(${name} PRIVATE glimmark::settings)
+    target_link_libraries(${name} PRIVATE glimmark::settings glimmark::described)
 
     set(exports ${CMAKE_CURRENT_SOURCE_DIR}/exports.map)
     # What is exported stays the library's own for its own calls, whatever else the process has loaded.
