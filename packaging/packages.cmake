@@ -12,13 +12,17 @@ set(GLIMMARK_PACKAGES
 # SECTION is Debian's.
 function(glimmark_package component name section summary description)
     string(TOUPPER ${component} key)
+    # A phrase on Debian, a headline elsewhere.
+    string(SUBSTRING ${summary} 0 1 initial)
+    string(SUBSTRING ${summary} 1 -1 rest)
+    string(TOUPPER ${initial} initial)
     foreach(
         setting
         "DEBIAN_${key}_PACKAGE_NAME|${name}"
         "DEBIAN_${key}_PACKAGE_SECTION|${section}"
         "DEBIAN_${key}_DESCRIPTION|${summary}\n${description}"
         "RPM_${key}_PACKAGE_NAME|${name}"
-        "RPM_${key}_PACKAGE_SUMMARY|${summary}"
+        "RPM_${key}_PACKAGE_SUMMARY|${initial}${rest}"
         "RPM_${key}_PACKAGE_DESCRIPTION|${description}")
         string(REGEX MATCH "^[^|]*" variable "${setting}")
         string(REGEX REPLACE "^[^|]*[|]" "" value "${setting}")
@@ -114,8 +118,13 @@ foreach(library tavro-instrumentation tavro-common tavro-locale mvlog)
     # Without a version: a package that stands for this one has none.
     file(WRITE ${CMAKE_CURRENT_BINARY_DIR}/${library}/shlibs "lib${library} 1 lib${library}1\n")
     string(TOUPPER ${library} component)
-    set(CPACK_DEBIAN_${component}_PACKAGE_CONTROL_EXTRA ${CMAKE_CURRENT_SOURCE_DIR}/triggers
-                                                        ${CMAKE_CURRENT_BINARY_DIR}/${library}/shlibs)
+    # The trigger runs ldconfig. CPack brings scripts that run it too, unless there are others: these do not exist, and
+    # so none comes along.
+    set(CPACK_DEBIAN_${component}_PACKAGE_CONTROL_EXTRA
+        ${CMAKE_CURRENT_SOURCE_DIR}/triggers ${CMAKE_CURRENT_BINARY_DIR}/${library}/shlibs
+        ${CMAKE_CURRENT_BINARY_DIR}/none/postinst ${CMAKE_CURRENT_BINARY_DIR}/none/postrm)
+    set(CPACK_RPM_${component}_POST_INSTALL_SCRIPT_FILE ${CMAKE_CURRENT_SOURCE_DIR}/ldconfig)
+    set(CPACK_RPM_${component}_POST_UNINSTALL_SCRIPT_FILE ${CMAKE_CURRENT_SOURCE_DIR}/ldconfig)
 endforeach()
 
 set(CPACK_RPM_COMPONENT_INSTALL ON)
@@ -133,15 +142,21 @@ set(CPACK_RPM_EXCLUDE_FROM_AUTO_FILELIST_ADDITION
     /usr/share/man
     /usr/share/man/man1
     /usr/share/man/man8)
+# A file of one language is installed where that language is.
 get_property(languages GLOBAL PROPERTY GLIMMARK_LANGUAGES)
 foreach(language IN LISTS languages)
+    list(APPEND CPACK_RPM_TAVRO-LOCALE_USER_FILELIST
+         "%lang(${language}) ${CMAKE_INSTALL_FULL_LOCALEDIR}/${language}/LC_MESSAGES/tavro.mo")
     list(APPEND CPACK_RPM_EXCLUDE_FROM_AUTO_FILELIST_ADDITION /usr/share/locale/${language}
          /usr/share/locale/${language}/LC_MESSAGES)
 endforeach()
 set(CPACK_RPM_PACKAGE_LICENSE "All rights reserved")
-# Without the machine, the folder and the hour of the build.
+set(CPACK_RPM_SUPPORT-DEVELOPMENT_PACKAGE_GROUP Development/Libraries)
+# Without the machine, the folder and the hour of the build; files as CMake has stripped them, which are Debian's too.
 set(CPACK_RPM_SPEC_MORE_DEFINE
-    "%define _buildhost localhost
+    "%define packager ${CPACK_PACKAGE_CONTACT}
+%define _buildhost localhost
+%define __brp_strip_comment_note %{nil}
 %define use_source_date_epoch_as_buildtime 1
 %define clamp_mtime_to_source_date_epoch 1
 %define _build_id_links none")

@@ -140,6 +140,29 @@ of_the_distribution='/usr(/(bin|sbin|include|lib64|libexec|share(/(doc|locale(/[
     [[ $output == *"classes of $TREE/usr/share/glimmark-provider/schema"* ]]
 }
 
+@test "every program that a person calls has a manual page" {
+    local programs=0 file name
+    for file in "$RPM_TREE"/usr/bin/* "$RPM_TREE"/usr/sbin/*; do
+        name=${file##*/}
+        [ -e "$RPM_TREE/usr/share/man/man1/$name.1.gz" ] || [ -e "$RPM_TREE/usr/share/man/man8/$name.8.gz" ]
+        programs=$((programs + 1))
+    done
+    [ "$programs" -ge 2 ]
+}
+
+@test "the support libraries' packages tell the loader, and bring no script on Debian" {
+    for library in tavro-instrumentation tavro-common tavro-locale mvlog; do
+        [ "$(dpkg-deb -I "$PACKAGES/lib${library}1"_*.deb triggers)" = "activate-noawait ldconfig" ]
+        [ "$(dpkg-deb --ctrl-tarfile "$PACKAGES/lib${library}1"_*.deb | tar -t | grep -cE 'post(inst|rm)')" -eq 0 ]
+        [ "$(rpm -qp --qf '%{POSTIN}\n%{POSTUN}' "$PACKAGES/lib${library}1"-*.rpm | grep -cx /sbin/ldconfig)" -eq 2 ]
+    done
+}
+
+@test "the RPM package says of each catalogue which language it is" {
+    diff <(rpm -qp --qf '[%{FILELANGS} %{FILENAMES}\n]' "$PACKAGES"/libtavro-locale1-*.rpm | grep '\.mo$' | cut -d' ' -f1) \
+        <(cd "$RPM_TREE/usr/share/locale" && ls)
+}
+
 # Programs and libraries in a tree.
 binaries() { find "$1" -type f \( -name '*.so*' -o -path '*/bin/*' \); }
 
