@@ -31,10 +31,12 @@ if(dynamic MATCHES "TEXTREL")
 endif()
 
 # No symbol is missing from what it is linked with.
-run_tool(relocations ${LDD} -r ${FILE})
-string(REGEX MATCHALL "undefined symbol: [^\n]*" undefined "${relocations}")
-if(undefined)
-    message(SEND_ERROR "Missing in its libraries: ${undefined}")
+if(LDD)
+    run_tool(relocations ${LDD} -r ${FILE})
+    string(REGEX MATCHALL "undefined symbol: [^\n]*" undefined "${relocations}")
+    if(undefined)
+        message(SEND_ERROR "Missing in its libraries: ${undefined}")
+    endif()
 endif()
 
 # Stacks are watched. The debug information says what each source was compiled with, for one compiler; the sanitizers'

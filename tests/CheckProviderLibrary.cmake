@@ -18,7 +18,7 @@ foreach(library IN LISTS support)
 endforeach()
 list(REMOVE_ITEM needed ${support})
 list(FILTER needed EXCLUDE REGEX
-     "^(libstdc\\+\\+|libgcc_s|libc|libm|libdl|libpthread|ld-linux-x86-64|libasan|libubsan|libtsan)\\.so\\.[0-9]+$")
+     "^(libstdc\\+\\+|libgcc_s|libc|libm|libdl|libpthread|ld-linux[a-z0-9-]*|ld64|libasan|libubsan|libtsan)\\.so\\.[0-9]+$")
 if(needed)
     message(SEND_ERROR "Linked with what it should not be: ${needed}")
 endif()

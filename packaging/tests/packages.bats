@@ -163,6 +163,23 @@ of_the_distribution='/usr(/(bin|sbin|include|lib64|libexec|share(/(doc|locale(/[
         <(cd "$RPM_TREE/usr/share/locale" && ls)
 }
 
+# Names in a bill of materials.
+billed() { python3 -c 'import json, sys; print(*(one["name"] for one in json.load(open(sys.argv[1]))["packages"]), sep="\n")' "$1" | sort; }
+
+@test "each package has a bill of what it loads" {
+    for package in "$PACKAGES"/*.deb; do
+        missing=$(dpkg-deb -f "$package" Depends | tr , '\n' | sed -nE 's/^ *([a-z0-9+.-]+).*/\1/p' | sed 's|-fmt9$||' | grep -v python3 |
+            sort -u | comm -23 - <(billed "$package.spdx.json"))
+        echo "$package: $missing"
+        [ -z "$missing" ] || [[ $package == */libtavro-dev_* ]]
+    done
+    for package in "$PACKAGES"/*.rpm; do
+        name=$(rpm -qp --qf '%{NAME}' "$package")
+        [[ $name == libtavro-devel ]] || diff <(billed "$PACKAGES/$name"_*.deb.spdx.json) <(billed "$package.spdx.json")
+    done
+    billed "$PACKAGES"/libtavro-instrumentation1_*.spdx.json | grep -qx nlohmann-json3-dev
+}
+
 # Programs and libraries in a tree.
 binaries() { find "$1" -type f \( -name '*.so*' -o -path '*/bin/*' \); }
 

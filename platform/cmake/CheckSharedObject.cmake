@@ -13,7 +13,7 @@ endif()
 
 string(REGEX MATCHALL "Shared library: \\[[^]]*\\]" found "${dynamic}")
 string(REGEX REPLACE "Shared library: \\[([^]]*)\\]" "\\1" needed "${found}")
-list(FILTER needed EXCLUDE REGEX "^(libstdc\\+\\+|libgcc_s|libc|libm|libasan|libubsan|libtsan|ld-linux.*)\\.so\\.")
+list(FILTER needed EXCLUDE REGEX "^(libstdc\\+\\+|libgcc_s|libc|libm|libasan|libubsan|libtsan|ld-linux.*|ld64)\\.so\\.")
 foreach(pattern IN LISTS NEEDED)
     set(matching ${needed})
     list(FILTER matching INCLUDE REGEX "^${pattern}$")

@@ -42,7 +42,19 @@ is_of_the_changelog() {
     is_of_the_commit
 }
 
-@test "a released archive: of the changelog" { is_of_the_changelog; }
+@test "an archive that tells no commit: of the changelog" { is_of_the_changelog; }
+
+@test "a released archive: of the commit" {
+    cp "$SOURCE/packaging/commit-date" "$project/packaging/"
+    cp "$SOURCE/.gitattributes" "$project/"
+    export GIT_COMMITTER_DATE="@1000000000 +0000"
+    commit_all "$project"
+    git -C "$project" archive --prefix=released/ HEAD | tar -x -C "$BATS_TEST_TMPDIR"
+    project=$BATS_TEST_TMPDIR/released
+    run -0 --separate-stderr "$project/scripts/package" --date
+    [ "$output" = 1000000000 ]
+    [ -z "$stderr" ]
+}
 
 @test "a released archive in a repository of something else: of the changelog" {
     commit_all "$BATS_TEST_TMPDIR/around"
