@@ -10,8 +10,8 @@
 
 namespace {
 
-int run(const std::string& mode, const std::string& neighbour, const std::string& file, const std::string& caller,
-        const std::string& function)
+int run(const std::string& mode, const std::string& neighbour, const std::string& file,
+        const std::string& caller, const std::string& function)
 {
     loadBeside(neighbour, file, mode);
     void* const calls = load(caller, RTLD_NOW | RTLD_LOCAL | RTLD_DEEPBIND);
