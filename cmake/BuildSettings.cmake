@@ -1,5 +1,9 @@
 # What every target of the project is built with: link against glimmark::settings.
 
+if(CMAKE_SIZEOF_VOID_P LESS 8)
+    message(FATAL_ERROR "This is a compiler for 32 bits, which are not supported: nothing was tried there. Expected 64.")
+endif()
+
 set(CMAKE_CXX_STANDARD 17)
 set(CMAKE_CXX_STANDARD_REQUIRED ON)
 set(CMAKE_CXX_EXTENSIONS OFF)

@@ -15,10 +15,10 @@ setup() {
 
 # refuses WHAT...: words of the message
 refuses() {
-    run -1 --separate-stderr "$project/scripts/release" --check 1.2.3
+    run -1 "$project/scripts/release" --check 1.2.3
     local word
     for word in "$@"; do
-        [[ $stderr == *"$word"* ]]
+        [[ $output == *"$word"* ]]
     done
 }
 
