@@ -28,4 +28,7 @@ set(CMAKE_FIND_ROOT_PATH_MODE_PACKAGE ONLY)
 set(ENV{PKG_CONFIG_SYSROOT_DIR} ${root})
 set(ENV{PKG_CONFIG_LIBDIR} ${root}/usr/lib/${CMAKE_LIBRARY_ARCHITECTURE}/pkgconfig:${root}/usr/share/pkgconfig)
 
+set(CMAKE_INSTALL_LIBDIR
+    lib/${CMAKE_LIBRARY_ARCHITECTURE}
+    CACHE PATH "Where libraries are installed, relative to the prefix")
 set(CPACK_DEBIAN_PACKAGE_ARCHITECTURE ${GLIMMARK_CROSS})

@@ -105,6 +105,11 @@ set(CPACK_DEBIAN_COMPRESSION_TYPE xz)
 set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS ON)
 # The packages of the support libraries are named below: a dependency on a soname of theirs is met by another's too.
 set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS_PRIVATE_DIRS ${CMAKE_LIBRARY_OUTPUT_DIRECTORY})
+# Those of another architecture lie apart.
+if(CMAKE_CROSSCOMPILING)
+    list(APPEND CPACK_DEBIAN_PACKAGE_SHLIBDEPS_PRIVATE_DIRS ${CMAKE_SYSROOT}/lib/${CMAKE_LIBRARY_ARCHITECTURE}
+         ${CMAKE_SYSROOT}/usr/lib/${CMAKE_LIBRARY_ARCHITECTURE})
+endif()
 set(support_packages "libtavro-instrumentation1, libtavro-common1, libtavro-locale1, libmvlog1")
 # glimmark-register is a Python program.
 set(CPACK_DEBIAN_PROVIDER_PACKAGE_DEPENDS "${support_packages}, python3:any")
