@@ -30,5 +30,5 @@ set(ENV{PKG_CONFIG_LIBDIR} ${root}/usr/lib/${CMAKE_LIBRARY_ARCHITECTURE}/pkgconf
 
 set(CMAKE_INSTALL_LIBDIR
     lib/${CMAKE_LIBRARY_ARCHITECTURE}
-    CACHE PATH "Where libraries are installed, relative to the prefix")
+    CACHE STRING "Where libraries are installed, relative to the prefix")
 set(CPACK_DEBIAN_PACKAGE_ARCHITECTURE ${GLIMMARK_CROSS})
