@@ -1,10 +1,10 @@
 // Runs operations for callgrind, which counts the instructions of each run apart; count_instructions.py starts this
-// program and says what it counted. Takes two files: what to run, as a regular expression for the operations' names, and
-// the numbers of indicators.
+// program and says what was counted.
 //
 //   bench-instructions [--floor] NAMES INDICATORS...
 //
-// --floor: replays each operation's tape too. Without callgrind nothing is counted.
+// NAMES is a regular expression for the operations' names. --floor: replays each operation's tape too. Without callgrind
+// nothing is counted.
 
 #include "Bed.h"
 
@@ -31,16 +31,39 @@ void count(const std::string& what, Run run)
     CALLGRIND_DUMP_STATS_AT(what.c_str());
 }
 
-void countOperation(Bed& bed, const Task& task, bool withFloor)
+std::string nameOf(const Task& task, const Bed& bed)
 {
-    const std::string what = task.operation.name + '/' + std::to_string(bed.indicatorCount());
-    bed.run(task, [&](const TapeRequest& /*request*/, const auto& run) { count(what + " library", run); });
-    if (!withFloor)
-        return;
-    Tape floor = bed.record(task);
-    bed.run(task, [&](const TapeRequest& request, const auto& /*run*/) {
-        count(what + " floor", [&] { floor.replay(request); });
+    return task.operation.name + '/' + std::to_string(bed.indicatorCount());
+}
+
+void countLibrary(Bed& bed, const Task& task)
+{
+    // Once before: memory then lies as the operation itself has left it, whatever ran earlier.
+    bed.run(task, [](const TapeRequest& /*request*/, const auto& run) { run(); });
+    bed.run(task, [&](const TapeRequest& /*request*/, const auto& run) {
+        count(nameOf(task, bed) + " library", run);
     });
+}
+
+void countFloor(Bed& bed, const Task& task)
+{
+    Tape floor = bed.record(task);
+    bed.run(task, [&](const TapeRequest& request, const auto& /*run*/) { floor.replay(request); });
+    bed.run(task, [&](const TapeRequest& request, const auto& /*run*/) {
+        count(nameOf(task, bed) + " floor", [&] { floor.replay(request); });
+    });
+}
+
+/// Counts something at every number of indicators.
+template <class Count>
+void countAtEach(const std::vector<std::string>& sizes, const std::vector<Task>& tasks, Bed& bed,
+                 Count countOne)
+{
+    for (const std::string& size : sizes) {
+        bed.setIndicators(std::stoul(size));
+        for (const Task& task : tasks)
+            countOne(bed, task);
+    }
 }
 
 std::vector<Task> tasksCalled(const std::string& names)
@@ -68,15 +91,11 @@ int main(int argc, char** argv)
     mallopt(M_MMAP_MAX, 0); // large pieces as small ones: from memory that the process keeps
 
     const std::vector<Task> tasks = tasksCalled(arguments.front());
+    const std::vector<std::string> sizes(arguments.begin() + 1, arguments.end());
     Bed bed;
-    // Once before, for what is made only at first use.
-    bed.setIndicators(1);
-    for (const Task& task : tasks)
-        bed.run(task, [](const TapeRequest& /*request*/, const auto& run) { run(); });
-    for (auto size = arguments.begin() + 1; size != arguments.end(); ++size) {
-        bed.setIndicators(std::stoul(*size));
-        for (const Task& task : tasks)
-            countOperation(bed, task, withFloor);
-    }
+    countAtEach(sizes, tasks, bed, countLibrary);
+    // Behind all of them: the library's figures are the same with floors and without.
+    if (withFloor)
+        countAtEach(sizes, tasks, bed, countFloor);
     return 0;
 }
