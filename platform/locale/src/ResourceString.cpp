@@ -11,20 +11,22 @@ std::wstring Locale::getResourceLibrary(int library, const std::string& language
 
 struct ResourceString::Implementation
 {
-    std::wstring text;
+    const std::wstring* found; ///< in a catalogue; null: nobody has a text
+    std::wstring messageId;    ///< only where nobody has
 };
 
 ResourceString::ResourceString(const std::wstring& library, const std::wstring& messageId)
-    : implementation_(std::make_unique<Implementation>())
+    : implementation_(new Implementation{findText(library, messageId), {}})
 {
-    implementation_->text = findText(library, messageId).value_or(messageId);
+    if (implementation_->found == nullptr)
+        implementation_->messageId = messageId;
 }
 
 ResourceString::~ResourceString() = default;
 
 ResourceString::operator std::wstring() const
 {
-    return implementation_->text;
+    return implementation_->found != nullptr ? *implementation_->found : implementation_->messageId;
 }
 
 } // namespace Tavro
