@@ -159,8 +159,9 @@ void GlimmarkFactory::_createGlimmarkMap()
 {
     for (Glimmark& glimmark : Counted(glimmarks)) {
         // The last one of an identifier wins. Nobody reads the list any more: its records are moved.
-        glimmarkMap[glimmark.getDeviceID()] = std::move(glimmark);
+        glimmarkMap.insert_or_assign(glimmark.getDeviceID(), std::move(glimmark));
     }
+    glimmarks = std::vector<Glimmark>();
 }
 
 void GlimmarkFactory::_createCapabilitiesMap()

@@ -31,9 +31,10 @@ public:
         std::memset(emptied, 0, bufferSize);
     }
 
-    Line& operator<<(const char* text)
+    Line& operator<<(const char* text) { return *this << std::string_view(text != nullptr ? text : "(null)"); }
+
+    Line& operator<<(std::string_view characters)
     {
-        const std::string_view characters = text != nullptr ? text : "(null)";
         next = std::copy_n(characters.data(), std::min(characters.size(), room()), next);
         return *this;
     }
@@ -52,8 +53,9 @@ private:
     char* last; ///< stays a null character
 };
 
+template <class Parameters>
 void formatWithParameters(Buffer& buffer, const char* text, const char* file, int number,
-                          const char* parameters, MessageType type)
+                          Parameters parameters, MessageType type)
 {
     Line line(buffer);
     switch (type) {
@@ -128,7 +130,7 @@ void TracedFunction::flow(MessageType type, const std::string& parameters, unsig
 {
     const auto number = static_cast<int>(line);
     emit(module, function, number, flowLevel, [&](Buffer& buffer) {
-        formatWithParameters(buffer, function, module.file, number, parameters.c_str(), type);
+        formatWithParameters(buffer, function, module.file, number, std::string_view(parameters), type);
     });
 }
 
