@@ -5,6 +5,7 @@
 #include "Words.h"
 
 #include <filesystem>
+#include <memory>
 #include <optional>
 #include <utility>
 
@@ -26,7 +27,7 @@ Node indicatorNode(std::string description, std::string devicePath, const std::s
     node.path = std::move(devicePath);
     node.status = unknownStatus;
     node.alarmState = unknownState;
-    node.displayText = printable(displayPath);
+    node.displayText = std::make_unique<const std::string>(printable(displayPath));
     return node;
 }
 
