@@ -89,6 +89,8 @@ int main(int argc, char** argv)
         return 2;
     }
     mallopt(M_MMAP_MAX, 0); // large pieces as small ones: from memory that the process keeps
+    mallopt(M_TRIM_THRESHOLD, -1);
+    mallopt(M_MXFAST, 0); // pieces are joined by who frees them, and not by whoever comes along later
 
     const std::vector<Task> tasks = tasksCalled(arguments.front());
     const std::vector<std::string> sizes(arguments.begin() + 1, arguments.end());

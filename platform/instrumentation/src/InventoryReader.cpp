@@ -196,9 +196,9 @@ public:
         if (field_ == Field::kind)
             node().kind = kindCalled(value);
         else if (field_ == Field::description)
-            node().description = checkedText(value);
+            node().description = std::string(checkedText(value));
         else if (field_ == Field::path)
-            node().path = checkedText(value);
+            node().path = std::string(checkedText(value));
         else if (level_ == Level::SourceList)
             inventory_.sources.push_back(sourceCalled(value));
         else if (field_ != Field::schema)

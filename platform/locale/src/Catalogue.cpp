@@ -18,6 +18,7 @@
 #include <memory>
 #include <mutex>
 #include <optional>
+#include <set>
 #include <string_view>
 
 namespace Tavro {
@@ -70,7 +71,7 @@ public:
         const char* const folder = directory();
         if (!last_ || last_->directory != folder || last_->catalogue != catalogue ||
             last_->messageId != messageId)
-            last_ = Answer{folder, catalogue, messageId, find(folder, catalogue, messageId)};
+            last_ = Answer{folder, catalogue, messageId, textOrId(folder, catalogue, messageId)};
         return last_->text;
     }
 
@@ -90,6 +91,14 @@ private:
         return named != nullptr && *named != '\0' ? named : installed_.c_str();
     }
 
+    const std::wstring* textOrId(const std::string& folder, const std::wstring& catalogue,
+                                 const std::wstring& messageId)
+    {
+        const std::wstring* const text = find(folder, catalogue, messageId);
+        return text != nullptr ? text : &*idsWithoutText_.insert(messageId).first;
+    }
+
+    /// Null: there is none.
     const std::wstring* find(const std::string& folder, const std::wstring& catalogue,
                              const std::wstring& messageId)
     {
@@ -135,6 +144,7 @@ private:
     std::string installed_ = installedCatalogues();
     Messages english_ = readMessages(englishCatalogue);
     std::map<std::string, Messages> byFile_;
+    std::set<std::wstring> idsWithoutText_;
     std::optional<Answer> last_;
 };
 

@@ -12,8 +12,8 @@ namespace Tavro {
 std::wstring catalogueName(int library, const std::string& language);
 
 /// The text of a message from the catalogue with that name: in the language, else in the language without
-/// its last part (zh_Hans_CN, zh_Hans, zh), else in English; null where English has none either or
-/// where the name is not one of catalogueName's. It lives until the library is unloaded.
+/// its last part (zh_Hans_CN, zh_Hans, zh), else in English; the message id itself where English has none
+/// either or where the name is not one of catalogueName's. It lives until the library is unloaded.
 ///
 /// Each catalogue is read once, when it is first asked for. One that cannot be read or is broken
 /// gives one error line in the log and counts as empty.
