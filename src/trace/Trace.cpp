@@ -26,7 +26,10 @@ class Line
 public:
     explicit Line(Buffer& buffer) : next(buffer), last(buffer + bufferSize - 1) {}
 
-    Line& operator<<(const char* text) { return *this << std::string_view(text != nullptr ? text : "(null)"); }
+    Line& operator<<(const char* text)
+    {
+        return *this << std::string_view(text != nullptr ? text : "(null)");
+    }
 
     Line& operator<<(std::string_view characters)
     {

@@ -163,7 +163,10 @@ std::size_t mostNodesIn(std::string_view text)
 class InventoryHandler
 {
 public:
-    explicit InventoryHandler(std::string_view text) : text_(text) { inventory_.nodes.reserve(mostNodesIn(text)); }
+    explicit InventoryHandler(std::string_view text) : text_(text)
+    {
+        inventory_.nodes.reserve(mostNodesIn(text));
+    }
 
     Inventory takeInventory() { return std::move(inventory_); }
 
