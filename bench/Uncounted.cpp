@@ -9,11 +9,14 @@
 
 namespace Allocations {
 
+// NOLINTBEGIN(performance-trivially-destructible): declared for what counts
 Pause::Pause() = default;
 Pause::~Pause() = default;
+// NOLINTEND(performance-trivially-destructible)
 
 } // namespace Allocations
 
+// NOLINTNEXTLINE(readability-inconsistent-declaration-parameter-name)
 int uname(utsname* kernel) noexcept
 {
     *kernel = {};

@@ -13,9 +13,6 @@ namespace MVLog {
 // No stream, which takes longer to be made than a line to be put together; and one piece of memory for a usual line.
 struct MVMessageBuffer::Implementation
 {
-    // Not inline and not defaulted: `place` is left as it is.
-    Implementation();
-
     void append(std::string_view piece)
     {
         if (failed)
@@ -34,10 +31,7 @@ struct MVMessageBuffer::Implementation
     bool failed = false;         ///< from the first null text on
 };
 
-// NOLINTNEXTLINE(cppcoreguidelines-pro-type-member-init): `place` is written before it is read
-MVMessageBuffer::Implementation::Implementation() {}
-
-MVMessageBuffer::MVMessageBuffer() : implementation_(std::make_unique<Implementation>()) {}
+MVMessageBuffer::MVMessageBuffer() : implementation_(new Implementation) {} // `place` is left as it is
 
 MVMessageBuffer::~MVMessageBuffer() = default;
 
