@@ -73,7 +73,7 @@ class Profile(unittest.TestCase):
 
 class Guard(unittest.TestCase):
     def setUp(self):
-        self.held = {"memory A/1": dict.fromkeys(count_instructions.HELD, 1000)}
+        self.held = {"memory A/1": dict.fromkeys(count_instructions.HELD, 0) | {"library": 600, "locale": 400}}
 
     def grown(self, **figures):
         rows = {row: collections.Counter(held | figures) for row, held in self.held.items()}
@@ -82,16 +82,17 @@ class Guard(unittest.TestCase):
         return count, said.getvalue()
 
     def test_two_in_a_hundred_more_is_let_pass(self):
-        self.assertEqual(self.grown(library=1020)[0], 0)
+        self.assertEqual(self.grown(library=620)[0], 0)
 
     def test_more_is_told_with_the_old_and_the_new_figure(self):
-        count, said = self.grown(locale=1021)
+        count, said = self.grown(locale=421)
         self.assertEqual(count, 1)
-        self.assertIn("memory A/1: locale 1000 -> 1021\n", said)
+        self.assertIn("memory A/1: instructions 1000 -> 1021\n", said)
+        self.assertIn("    locale 400 -> 421\n", said)
 
     def test_a_figure_that_was_nothing_stays_so(self):
-        self.held["memory A/1"]["logging"] = 0
-        self.assertEqual(self.grown(logging=1)[0], 1)
+        self.assertEqual(self.grown(allocations=1)[0], 1)
+        self.assertEqual(self.grown(calls=1)[0], 1)
 
     def test_an_operation_of_which_nothing_is_held_is_told(self):
         rows = {row: collections.Counter(held) for row, held in self.held.items()}
