@@ -9,10 +9,8 @@
 
 namespace Allocations {
 
-// NOLINTBEGIN(performance-trivially-destructible): declared for what counts
 Pause::Pause() = default;
 Pause::~Pause() = default;
-// NOLINTEND(performance-trivially-destructible)
 
 } // namespace Allocations
 

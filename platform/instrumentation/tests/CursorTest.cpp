@@ -270,7 +270,13 @@ TEST_F(Cursor, takesMoreNodesThanSixteenBitsCount)
 
 TEST_F(Cursor, holdsAtMostTwoAndAHalfTimesTheFile)
 {
-    for (const int count : {1000, 65535}) {
+#ifdef GLIMMARK_SANITIZED
+    // The sanitizer keeps what is freed, and is busy with it while the tests below fork.
+    const std::vector<int> counts = {1000};
+#else
+    const std::vector<int> counts = {1000, 65535};
+#endif
+    for (const int count : counts) {
         std::string json = R"({"nodes":[)";
         for (int number = 0; number < count; ++number) {
             const std::string text = std::to_string(number);
