@@ -1,9 +1,5 @@
 // The library beside the floor: time, allocations and heap of every operation at several sizes, as a table.
-//
-//   --guard    briefly, only at 1 and at 1,000 indicators, without the table; fails when a row's ratio is
-//              more than twice its target in two runs one after the other
-//
-// All other options are those of the benchmark library; --benchmark_filter takes rows by their names.
+// The options are those of the benchmark library; --benchmark_filter takes rows by their names.
 
 #include "Bed.h"
 #include "GlimmarkFactory.h"
@@ -15,7 +11,6 @@
 
 #include <algorithm>
 #include <cstdio>
-#include <iterator>
 #include <string>
 #include <vector>
 
@@ -123,19 +118,13 @@ double traceAThousandTimes(Bed& /*bed*/)
 constexpr std::size_t sizes[] = {1, 10, 100, 1000, 10000, 65535};
 
 /// Enough pairs for a steady median, few enough for a table within minutes.
-benchmark::IterationCount pairsAt(std::size_t indicators, bool brief)
+benchmark::IterationCount pairsAt(std::size_t indicators)
 {
     if (indicators <= 100)
-        return brief ? 51 : 201;
+        return 201;
     if (indicators <= 1000)
-        return brief ? 11 : 51;
+        return 51;
     return indicators <= 10000 ? 9 : 3;
-}
-
-std::vector<std::size_t> sizesOf(bool brief)
-{
-    return brief ? std::vector<std::size_t>{1, 1000}
-                 : std::vector<std::size_t>(std::begin(sizes), std::end(sizes));
 }
 
 const std::vector<Task>& tasks()
@@ -150,15 +139,15 @@ const Task& taskOf(const std::string& name)
                          [&](const Task& task) { return task.operation.name == name; });
 }
 
-void registerOperations(bool brief)
+void registerOperations()
 {
     for (const Task& task : tasks()) {
-        for (const std::size_t size : sizesOf(brief)) {
+        for (const std::size_t size : sizes) {
             benchmark::RegisterBenchmark(
                 (task.operation.name + "/" + std::to_string(size)).c_str(),
                 [&task, size](benchmark::State& state) { measureOperation(state, task, size); })
                 ->UseManualTime()
-                ->Iterations(pairsAt(size, brief));
+                ->Iterations(pairsAt(size));
         }
     }
 }
@@ -170,7 +159,7 @@ void registerParts()
         benchmark::RegisterBenchmark((name + "/" + std::to_string(size)).c_str(),
                                      [=](benchmark::State& state) { measurePart(state, size, part, other); })
             ->UseManualTime()
-            ->Iterations(pairsAt(size, false));
+            ->Iterations(pairsAt(size));
     };
     static const Task& get = taskOf("TAVRO_Glimmark_GetInstance_ByIdentifier");
     for (const std::size_t size : {std::size_t{1000}, std::size_t{10000}}) {
@@ -221,78 +210,15 @@ void keepFreedMemory()
     mallopt(M_MMAP_MAX, 0);
 }
 
-/// The most that an operation's ratio should be at 1 and at 1,000 indicators.
-double targetOf(const std::string& row)
-{
-    const auto has = [&](const char* part) { return row.find(part) != std::string::npos; };
-    if (has("/1/"))
-        return 2.5;
-    // These make no object for most of the indicators: what is left is reading them from an inventory that is
-    // in memory, and making records of them.
-    const bool collectsOnly = has("From_TAVRO_Glimmark/") || has("From_CIM_AlarmDevice/") ||
-                              has("GetInstance_ByIdentifier") ||
-                              has("TAVRO_GlimmarkCapabilities_GetInstance_ByPath");
-    return collectsOnly ? 4.0 : 1.5;
-}
-
-/// Collects the rows whose ratio is more than twice its target.
-class Guard : public benchmark::BenchmarkReporter
-{
-public:
-    bool ReportContext(const Context&) override { return true; }
-    void ReportRuns(const std::vector<Run>& runs) override
-    {
-        for (const Run& run : runs) {
-            const std::string row = run.benchmark_name();
-            const double ratio = run.counters.at("ratio");
-            ++seen;
-            if (ratio <= 2 * targetOf(row))
-                continue;
-            std::printf("%s: %.2f times the floor, more than twice %.1f\n", row.c_str(), ratio,
-                        targetOf(row));
-            lost.push_back(row);
-        }
-    }
-
-    int seen = 0;
-    std::vector<std::string> lost;
-};
-
-/// \return the process's exit status
-int guard()
-{
-    Guard first;
-    benchmark::RunSpecifiedBenchmarks(&first);
-    int lost = first.seen == 0 ? 1 : 0;
-    for (const std::string& row : first.lost) {
-        Guard again;
-        benchmark::RunSpecifiedBenchmarks(&again, "^" + row + "$");
-        if (again.seen != 1 || !again.lost.empty())
-            ++lost;
-    }
-    std::printf("%d of %d ratios are lost\n", lost, first.seen);
-    return lost == 0 ? 0 : 1;
-}
-
-bool isGuard(int argc, char** argv)
-{
-    return argc == 2 && std::string(argv[1]) == "--guard";
-}
-
 } // namespace
 
 int main(int argc, char** argv)
 {
     keepFreedMemory();
-    const bool brief = isGuard(argc, argv);
-    if (!brief) {
-        benchmark::Initialize(&argc, argv);
-        if (benchmark::ReportUnrecognizedArguments(argc, argv))
-            return 2;
-    }
-    registerOperations(brief);
-    if (brief)
-        return guard();
+    benchmark::Initialize(&argc, argv);
+    if (benchmark::ReportUnrecognizedArguments(argc, argv))
+        return 2;
+    registerOperations();
     registerParts();
     TableReporter table;
     benchmark::RunSpecifiedBenchmarks(&table);

@@ -81,7 +81,7 @@ void requireSound(const Tavro::Node& node)
     Fuzz::require(node.kind == 36, "a node is an indicator");
     Fuzz::require(!node.description.empty(), "an indicator has a description");
     Fuzz::require(node.path.rfind('/', 0) == 0, "a path begins at the root");
-    Fuzz::require(node.displayText.value_or("").rfind("/sys/class/", 0) == 0,
+    Fuzz::require(node.displayText != nullptr && node.displayText->rfind("/sys/class/", 0) == 0,
                   "an indicator has its class's path");
     Fuzz::require(node.alarmState.value_or(17) <= 3, "an alarm state is one of the four");
     Fuzz::require(node.status <= 1 || (node.status >= 20 && node.status <= 22),

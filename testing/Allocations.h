@@ -40,7 +40,7 @@ class Pause
 {
 public:
     Pause();
-    ~Pause();
+    ~Pause(); // NOLINT(performance-trivially-destructible): what does not count has an empty one
     Pause(const Pause&) = delete;
     Pause& operator=(const Pause&) = delete;
 };

@@ -2,6 +2,7 @@
 
 #include "Descriptor.h"
 
+#include <algorithm>
 #include <array>
 #include <cerrno>
 #include <system_error>
@@ -12,6 +13,8 @@
 
 namespace Tavro {
 namespace {
+
+constexpr std::size_t roomBehind = 64; ///< for whoever ends the content as a parser wants it
 
 [[noreturn]] void failWithErrno()
 {
@@ -31,7 +34,8 @@ std::string fileType(mode_t mode)
     return "a device";
 }
 
-void checkType(int descriptor)
+/// \return how long the file is now
+std::size_t checkType(int descriptor)
 {
     struct stat status
     {};
@@ -39,12 +43,13 @@ void checkType(int descriptor)
         failWithErrno();
     if (!S_ISREG(status.st_mode))
         throw ReadFailure("expected a regular file, found " + fileType(status.st_mode));
+    return static_cast<std::size_t>(status.st_size);
 }
 
 /// Appends what one call reads. \return whether there was anything left to read
 bool readPart(int descriptor, std::string& content)
 {
-    std::array<char, 65536> part{};
+    std::array<char, 65536> part;
     ssize_t count = 0;
     do
         count = read(descriptor, part.data(), part.size());
@@ -63,9 +68,10 @@ std::string readFile(const std::string& name, std::size_t mostBytes)
     const Descriptor file(open(name.c_str(), O_RDONLY | O_CLOEXEC | O_NOCTTY | O_NONBLOCK));
     if (!file.isOpen())
         failWithErrno();
-    checkType(file.number());
+    const std::size_t size = checkType(file.number());
 
     std::string content;
+    content.reserve(std::min(size, mostBytes) + roomBehind);
     while (readPart(file.number(), content))
         if (content.size() > mostBytes)
             throw ReadFailure("expected at most " + std::to_string(mostBytes) + " bytes, found more");

@@ -24,6 +24,8 @@ namespace {
 
 const TraceModule traceModule{"GlimmarkObjFactory.cpp", loggerGlimmarkObjFactory};
 
+const std::wstring captionMessage(L"MSGID_ALARMDEVICE_CAPTION");
+
 // What a builder returns.
 constexpr int success = 0;
 constexpr int nothingFound = 1;
@@ -57,7 +59,7 @@ std::string caption()
     constexpr int providerTexts = 2; // number of the resource library
     const std::string language = Locale::getLanguageId();
     const std::wstring library = Locale::getResourceLibrary(providerTexts, language);
-    const ResourceString text(library, L"MSGID_ALARMDEVICE_CAPTION");
+    const ResourceString text(library, captionMessage);
     return make_string(text);
 }
 
@@ -159,8 +161,9 @@ void GlimmarkFactory::_createGlimmarkMap()
 {
     for (Glimmark& glimmark : Counted(glimmarks)) {
         // The last one of an identifier wins. Nobody reads the list any more: its records are moved.
-        glimmarkMap[glimmark.getDeviceID()] = std::move(glimmark);
+        glimmarkMap.insert_or_assign(glimmark.getDeviceID(), std::move(glimmark));
     }
+    glimmarks = std::vector<Glimmark>();
 }
 
 void GlimmarkFactory::_createCapabilitiesMap()

@@ -69,7 +69,10 @@ Glimmark readNode(const Instrumentation& node)
     Glimmark record;
     const std::string path = node.convertPathToString(node.getPathToNode());
     std::string description = node.getNodeDescription();
-    require(record.setDeviceID(description + ":" + path), "Failed while setting Device ID");
+    std::string deviceID;
+    deviceID.reserve(description.size() + 1 + path.size());
+    deviceID.append(description).append(":").append(path);
+    require(record.setDeviceID(std::move(deviceID)), "Failed while setting Device ID");
     require(record.setElementName(std::move(description)), "Failed while setting Element Name");
 
     // Status 0 is "not known": the record's defaults say that better than a translation would.
@@ -164,20 +167,16 @@ bool Glimmark::setHealthState(unsigned int nodeStatus)
 
 bool Glimmark::setOperationalStatus(unsigned int nodeStatus)
 {
-    constexpr std::uint16_t unknown = 0;
-    constexpr std::uint16_t ok = 2;
-    constexpr std::uint16_t degraded = 3;
-    constexpr std::uint16_t predictiveFailure = 5;
-    constexpr std::uint16_t inService = 11;
-    OperationalStatus.clear();
+    static constexpr std::initializer_list<std::uint16_t> unknown = {0};
+    static constexpr std::initializer_list<std::uint16_t> okInService = {2, 11};
+    static constexpr std::initializer_list<std::uint16_t> degraded = {3};
+    static constexpr std::initializer_list<std::uint16_t> degradedPredictiveFailure = {3, 5};
     if (nodeStatus == nodeOk)
-        OperationalStatus = {ok, inService};
+        OperationalStatus = okInService;
     else if (nodeStatus == nodePredictiveFailure)
-        OperationalStatus = {degraded, predictiveFailure};
-    else if (isDegraded(nodeStatus))
-        OperationalStatus = {degraded};
+        OperationalStatus = degradedPredictiveFailure;
     else
-        OperationalStatus = {unknown};
+        OperationalStatus = isDegraded(nodeStatus) ? degraded : unknown;
     return true;
 }
 

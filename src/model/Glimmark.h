@@ -4,6 +4,7 @@
 #define TAVRO_GLIMMARK_GLIMMARK_H
 
 #include <cstdint>
+#include <initializer_list>
 #include <string>
 #include <vector>
 
@@ -62,7 +63,7 @@ private:
     std::string ElementName;
     std::uint16_t RequestedState = 0;
     std::uint16_t HealthState = 0;
-    std::vector<std::uint16_t> OperationalStatus;
+    std::initializer_list<std::uint16_t> OperationalStatus; ///< one of a few that live as long as the library
     bool AudibleAlarm = false;
     bool VisibleAlarm = false;
     bool MotionAlarm = false;

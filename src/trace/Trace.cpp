@@ -9,7 +9,6 @@
 #include <iterator>
 #include <limits>
 #include <string_view>
-#include <utility>
 
 namespace Tavro {
 
@@ -25,35 +24,37 @@ using Buffer = char[bufferSize];
 class Line
 {
 public:
-    /// Clears the buffer.
-    explicit Line(Buffer& emptied) : next(emptied), last(emptied + bufferSize - 1)
-    {
-        std::memset(emptied, 0, bufferSize);
-    }
+    explicit Line(Buffer& buffer) : next(buffer), last(buffer + bufferSize - 1) {}
 
     Line& operator<<(const char* text)
     {
-        const std::string_view characters = text != nullptr ? text : "(null)";
+        return *this << std::string_view(text != nullptr ? text : "(null)");
+    }
+
+    Line& operator<<(std::string_view characters)
+    {
         next = std::copy_n(characters.data(), std::min(characters.size(), room()), next);
+        *next = '\0';
         return *this;
     }
 
     Line& operator<<(int number)
     {
-        char digits[std::numeric_limits<int>::digits10 + 3]; // a sign, all digits, the end
-        *std::to_chars(std::begin(digits), std::end(digits) - 1, number).ptr = '\0';
-        return *this << std::as_const(digits);
+        char digits[std::numeric_limits<int>::digits10 + 2]; // a sign, all digits
+        const auto* const end = std::to_chars(std::begin(digits), std::end(digits), number).ptr;
+        return *this << std::string_view(std::begin(digits), static_cast<std::size_t>(end - digits));
     }
 
 private:
     [[nodiscard]] std::size_t room() const { return static_cast<std::size_t>(last - next); }
 
     char* next;
-    char* last; ///< stays a null character
+    char* last; ///< of the buffer
 };
 
+template <class Parameters>
 void formatWithParameters(Buffer& buffer, const char* text, const char* file, int number,
-                          const char* parameters, MessageType type)
+                          Parameters parameters, MessageType type)
 {
     Line line(buffer);
     switch (type) {
@@ -106,6 +107,7 @@ const char* tracepara(const char* text, const char* file, unsigned int line, con
                       MessageType type)
 {
     static Buffer buffer;
+    std::memset(buffer, 0, bufferSize);
     formatWithParameters(buffer, text, file, static_cast<int>(line), parameters, type);
     return buffer;
 }
@@ -113,6 +115,7 @@ const char* tracepara(const char* text, const char* file, unsigned int line, con
 const char* trace(const char* text, const char* file, unsigned int line, MessageType /*type*/)
 {
     static Buffer buffer;
+    std::memset(buffer, 0, bufferSize);
     formatMessage(buffer, text, file, static_cast<int>(line));
     return buffer;
 }
@@ -128,7 +131,7 @@ void TracedFunction::flow(MessageType type, const std::string& parameters, unsig
 {
     const auto number = static_cast<int>(line);
     emit(module, function, number, flowLevel, [&](Buffer& buffer) {
-        formatWithParameters(buffer, function, module.file, number, parameters.c_str(), type);
+        formatWithParameters(buffer, function, module.file, number, std::string_view(parameters), type);
     });
 }
 

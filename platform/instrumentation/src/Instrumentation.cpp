@@ -84,7 +84,7 @@ std::string Instrumentation::getPathToNode() const
 std::string Instrumentation::convertPathToString(const std::string& path) const
 {
     const Node* const node = implementation_->nodeAt(path);
-    return node == nullptr ? path : node->displayText.value_or(path);
+    return node == nullptr || node->displayText == nullptr ? path : *node->displayText;
 }
 
 std::string Instrumentation::getNodeDescription() const

@@ -1,6 +1,7 @@
 #include "InventoryReader.h"
 
 #include "NodeKinds.h"
+#include "QuickParser.h"
 #include "QuotedNames.h"
 
 #include <algorithm>
@@ -9,7 +10,7 @@
 #include <cstdint>
 #include <functional>
 #include <limits>
-#include <set>
+#include <optional>
 #include <string_view>
 #include <utility>
 
@@ -25,16 +26,52 @@ constexpr std::size_t longestNameShown = 64;
 constexpr std::size_t longestDetailShown = 200;
 constexpr std::size_t longestRun = 65536;
 
-struct Field
+enum class Field
 {
+    none,
+    schema,
+    nodes,
+    sources,
+    kind,
+    description,
+    path,
+    status,
+    alarmState
+};
+
+struct KnownField
+{
+    Field field;
     std::string_view name;
     bool isRequired;
 };
 
-constexpr std::array inventoryFields = {Field{"$schema", false}, Field{"nodes", false},
-                                        Field{"sources", false}};
-constexpr std::array nodeFields = {Field{"kind", true}, Field{"description", true}, Field{"path", true},
-                                   Field{"status", true}, Field{"alarmState", false}};
+constexpr std::array inventoryFields = {KnownField{Field::schema, "$schema", false},
+                                        KnownField{Field::nodes, "nodes", false},
+                                        KnownField{Field::sources, "sources", false}};
+constexpr std::array nodeFields = {
+    KnownField{Field::kind, "kind", true}, KnownField{Field::description, "description", true},
+    KnownField{Field::path, "path", true}, KnownField{Field::status, "status", true},
+    KnownField{Field::alarmState, "alarmState", false}};
+
+/// Some of the fields.
+class FieldSet
+{
+public:
+    [[nodiscard]] bool has(Field field) const { return (bits_ & bit(field)) != 0; }
+    /// \return whether it was not among them
+    bool add(Field field)
+    {
+        const bool isNew = !has(field);
+        bits_ |= bit(field);
+        return isNew;
+    }
+
+private:
+    static unsigned int bit(Field field) { return 1U << static_cast<unsigned int>(field); }
+
+    unsigned int bits_ = 0;
+};
 
 template <class Items>
 auto findCalled(const Items& items, std::string_view name)
@@ -59,9 +96,9 @@ std::string shortened(const std::string& text, std::size_t longest = longestName
 }
 
 /// A text of the file as JSON writes it, shortened: nothing in it ends the message or drives a terminal.
-std::string escaped(const std::string& text)
+std::string escaped(std::string_view text)
 {
-    const std::string literal = Json(shortened(text)).dump();
+    const std::string literal = Json(shortened(std::string(text))).dump();
     return literal.substr(1, literal.size() - 2);
 }
 
@@ -110,12 +147,26 @@ void refuseLongRuns(std::string_view text)
     }
 }
 
+/// How many nodes stand in a text, if it is one of an inventory; more only where braces stand in texts too. No node is
+/// shorter than the shortest.
+std::size_t mostNodesIn(std::string_view text)
+{
+    constexpr std::string_view shortest = R"({"kind":0,"path":"","status":0,"description":""})";
+    std::size_t braces = 0;
+    for (std::size_t i = text.find('{'); i != std::string_view::npos; i = text.find('{', i + 1))
+        ++braces;
+    return std::min(braces, text.size() / shortest.size());
+}
+
 /// Takes the file in as the parser comes along, and so stops at the first fault: what is nested where
 /// nothing may be is never read, and a field given twice does not go unnoticed.
 class InventoryHandler
 {
 public:
-    explicit InventoryHandler(std::string_view text) : text_(text) {}
+    explicit InventoryHandler(std::string_view text) : text_(text)
+    {
+        inventory_.nodes.reserve(mostNodesIn(text));
+    }
 
     Inventory takeInventory() { return std::move(inventory_); }
 
@@ -132,28 +183,28 @@ public:
         if (value > largestNumber)
             refuse(std::to_string(value));
         const auto number = static_cast<unsigned int>(value);
-        if (isAt("kind"))
+        if (field_ == Field::kind)
             node().kind = number;
-        else if (isAt("status"))
+        else if (field_ == Field::status)
             node().status = number;
-        else if (isAt("alarmState"))
+        else if (field_ == Field::alarmState)
             node().alarmState = number;
         else
             refuse(std::to_string(value));
         return true;
     }
 
-    bool string(const std::string& value)
+    bool string(std::string_view value)
     {
-        if (isAt("kind"))
+        if (field_ == Field::kind)
             node().kind = kindCalled(value);
-        else if (isAt("description"))
-            node().description = checkedText(value);
-        else if (isAt("path"))
-            node().path = checkedText(value);
+        else if (field_ == Field::description)
+            node().description = std::string(checkedText(value));
+        else if (field_ == Field::path)
+            node().path = std::string(checkedText(value));
         else if (level_ == Level::SourceList)
             inventory_.sources.push_back(sourceCalled(value));
-        else if (level_ != Level::Inventory || field_ != "$schema")
+        else if (field_ != Field::schema)
             refuse(inQuotes(escaped(value)));
         return true;
     }
@@ -165,31 +216,30 @@ public:
         } else if (level_ == Level::NodeList) {
             level_ = Level::Node;
             inventory_.nodes.emplace_back();
-            fieldsOfNode_.clear();
+            fieldsOfNode_ = {};
         } else {
             refuse("an object");
         }
         return true;
     }
 
-    bool key(const std::string& name)
+    bool key(std::string_view name)
     {
-        field_ = name;
         if (level_ == Level::Inventory)
-            enterField(inventoryFields, fieldsOfInventory_);
+            enterField(name, inventoryFields, fieldsOfInventory_);
         else
-            enterField(nodeFields, fieldsOfNode_);
+            enterField(name, nodeFields, fieldsOfNode_);
         return true;
     }
 
     bool end_object()
     {
-        field_.clear();
+        leaveField();
         if (level_ == Level::Node) {
             checkNodeIsComplete();
             level_ = Level::NodeList;
         } else {
-            if (!has(fieldsOfInventory_, "nodes") && !has(fieldsOfInventory_, "sources"))
+            if (!fieldsOfInventory_.has(Field::nodes) && !fieldsOfInventory_.has(Field::sources))
                 throw InventoryError(place() + R"(: expected the field "nodes" or "sources", found none)");
             level_ = Level::Outside;
         }
@@ -198,9 +248,10 @@ public:
 
     bool start_array(std::size_t)
     {
-        if (level_ != Level::Inventory || field_ == "$schema")
+        if (level_ != Level::Inventory || field_ == Field::schema)
             refuse("a list");
-        level_ = field_ == "nodes" ? Level::NodeList : Level::SourceList;
+        level_ = field_ == Field::nodes ? Level::NodeList : Level::SourceList;
+        leaveField();
         return true;
     }
 
@@ -226,38 +277,40 @@ private:
         Node,
         SourceList
     };
-    using Names = std::set<std::string, std::less<>>;
 
     [[nodiscard]] const std::vector<Node>& nodes() const { return inventory_.nodes; }
 
     /// The node that the parser is in.
     Node& node() { return inventory_.nodes.back(); }
 
-    [[nodiscard]] bool isAt(std::string_view nodeField) const
-    {
-        return level_ == Level::Node && field_ == nodeField;
-    }
-
     template <class Fields>
-    void enterField(const Fields& known, Names& seen)
+    void enterField(std::string_view name, const Fields& known, FieldSet& seen)
     {
-        if (findCalled(known, field_) == known.end())
+        name_ = name;
+        const auto* const found = findCalled(known, name);
+        if (found == known.end())
             throw InventoryError(place() + ": unknown field, expected one of " + quotedNames(known));
-        if (!seen.insert(field_).second)
+        if (!seen.add(found->field))
             throw InventoryError(place() + ": field given twice, expected it once");
+        field_ = found->field;
+        name_ = found->name;
     }
 
-    static bool has(const Names& seen, std::string_view name) { return seen.find(name) != seen.end(); }
+    void leaveField()
+    {
+        field_ = Field::none;
+        name_ = {};
+    }
 
     void checkNodeIsComplete() const
     {
-        for (const Field& field : nodeFields)
-            if (field.isRequired && !has(fieldsOfNode_, field.name))
-                throw InventoryError(place() + ": expected the field " + inQuotes(field.name) +
+        for (const KnownField& known : nodeFields)
+            if (known.isRequired && !fieldsOfNode_.has(known.field))
+                throw InventoryError(place() + ": expected the field " + inQuotes(known.name) +
                                      ", found none");
     }
 
-    [[nodiscard]] unsigned int kindCalled(const std::string& name) const
+    [[nodiscard]] unsigned int kindCalled(std::string_view name) const
     {
         const auto* const kind = findCalled(namedKinds, name);
         if (kind == namedKinds.end())
@@ -265,7 +318,7 @@ private:
         return kind->kind;
     }
 
-    [[nodiscard]] NodeSource sourceCalled(const std::string& name) const
+    [[nodiscard]] NodeSource sourceCalled(std::string_view name) const
     {
         const std::vector<NodeSource> all = nodeSources();
         const auto source = findCalled(all, name);
@@ -277,9 +330,9 @@ private:
     }
 
     /// Texts go through interfaces in which a null character ends them.
-    [[nodiscard]] const std::string& checkedText(const std::string& text) const
+    [[nodiscard]] std::string_view checkedText(std::string_view text) const
     {
-        if (text.find('\0') != std::string::npos)
+        if (text.find('\0') != std::string_view::npos)
             refuse("a null character in it");
         return text;
     }
@@ -299,8 +352,8 @@ private:
             pointer = pointer / "nodes" / (nodes().size() - 1);
         else if (level_ == Level::SourceList)
             pointer = pointer / "sources" / inventory_.sources.size();
-        if ((level_ == Level::Inventory || level_ == Level::Node) && !field_.empty())
-            pointer /= escaped(field_);
+        if ((level_ == Level::Inventory || level_ == Level::Node) && !name_.empty())
+            pointer /= escaped(name_);
         return pointer.empty() ? "the whole file" : pointer.to_string();
     }
 
@@ -312,29 +365,44 @@ private:
             return "a node, which is an object";
         if (level_ == Level::SourceList)
             return "one of " + quotedNames(nodeSources());
-        if (field_ == "nodes")
+        if (field_ == Field::nodes)
             return "a list of nodes";
-        if (field_ == "sources")
+        if (field_ == Field::sources)
             return "a list of sources";
         std::string number = "a whole number from 0 to " + std::to_string(largestNumber);
-        if (field_ == "kind")
+        if (field_ == Field::kind)
             return number + " or one of " + quotedNames(namedKinds);
-        if (field_ == "status" || field_ == "alarmState")
+        if (field_ == Field::status || field_ == Field::alarmState)
             return number;
         return "a text";
     }
 
     std::string_view text_;
     Level level_ = Level::Outside;
-    std::string field_; ///< that was named last in the object the parser is in
-    Names fieldsOfInventory_;
-    Names fieldsOfNode_;
+    // Of what was named last in the object that the parser is in.
+    Field field_ = Field::none;
+    std::string_view name_;
+
+    FieldSet fieldsOfInventory_;
+    FieldSet fieldsOfNode_;
     Inventory inventory_;
 };
 
-} // namespace
+/// Nothing: something is wrong with it, or may be.
+std::optional<Inventory> readQuickly(const std::string& json)
+{
+    InventoryHandler handler(json);
+    try {
+        if (parseQuickly(json, handler, longestRun))
+            return handler.takeInventory();
+    } catch (const InventoryError&) {
+        // It is found again, unless there is another one before it.
+    }
+    return std::nullopt;
+}
 
-Inventory readInventory(const std::string& json)
+/// Tells what is wrong, and where.
+Inventory readClosely(const std::string& json)
 {
     refuseLongRuns(json);
     InventoryHandler handler(json);
@@ -343,6 +411,17 @@ Inventory readInventory(const std::string& json)
     if (const std::size_t null = json.find('\0'); null != std::string::npos)
         throw InventoryError(lineAndColumn(json, null + 1) + ": expected JSON: a null character after it");
     return handler.takeInventory();
+}
+
+} // namespace
+
+Inventory readInventory(std::string json)
+{
+    json.append(readAhead, ' ');
+    if (std::optional<Inventory> inventory = readQuickly(json))
+        return *std::move(inventory);
+    json.resize(json.size() - readAhead);
+    return readClosely(json);
 }
 
 } // namespace Tavro

@@ -2,6 +2,7 @@
 #ifndef TAVRO_NODE_H
 #define TAVRO_NODE_H
 
+#include <memory>
 #include <optional>
 #include <string>
 
@@ -15,7 +16,8 @@ struct Node
     std::string path;
     unsigned int status = 0;
     std::optional<unsigned int> alarmState;
-    std::optional<std::string> displayText; ///< what people are shown for the path; nothing: the path itself
+    /// What people are shown for the path; null: the path itself. A pointer, since a file's many nodes have none.
+    std::unique_ptr<const std::string> displayText;
 };
 
 } // namespace Tavro

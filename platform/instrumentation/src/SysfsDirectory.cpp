@@ -5,6 +5,7 @@
 #include <cerrno>
 #include <climits>
 #include <memory>
+#include <string_view>
 
 #include <dirent.h>
 #include <fcntl.h>
@@ -19,24 +20,19 @@ bool isAbsence(int errorCode)
     return errorCode == ENOENT || errorCode == ENODEV || errorCode == ENXIO;
 }
 
-/// Appends up to that many bytes. \return how many; negative: errno says why not
+/// Appends up to that many bytes from where the text ends in the file. Nothing that is no file has such a place: of a pipe
+/// nothing is read. \return how many; negative: errno says why not
 ssize_t readPart(const Descriptor& file, std::size_t mostBytes, std::string& text)
 {
     std::array<char, SysfsDirectory::pageSize> part;
     ssize_t count = 0;
     do
-        count = read(file.number(), part.data(), std::min(part.size(), mostBytes));
+        count = pread(file.number(), part.data(), std::min(part.size(), mostBytes),
+                      static_cast<off_t>(text.size()));
     while (count < 0 && errno == EINTR);
     if (count > 0)
         text.append(part.data(), static_cast<std::size_t>(count));
     return count;
-}
-
-bool isRegularFile(const Descriptor& file)
-{
-    struct stat status
-    {};
-    return fstat(file.number(), &status) == 0 && S_ISREG(status.st_mode);
 }
 
 } // namespace
@@ -65,6 +61,19 @@ bool SysfsDirectory::isAbsent() const
 
 std::vector<std::string> SysfsDirectory::names() const
 {
+    return entries([](const dirent& /*entry*/) { return true; });
+}
+
+std::vector<std::string> SysfsDirectory::directories() const
+{
+    return entries([this](const dirent& entry) {
+        return entry.d_type == DT_UNKNOWN ? hasDirectory(entry.d_name) : entry.d_type == DT_DIR;
+    });
+}
+
+template <class IsWanted>
+std::vector<std::string> SysfsDirectory::entries(IsWanted isWanted) const
+{
     Descriptor listed(openat(descriptor_.number(), ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC));
     const auto closeStream = [](DIR* stream) { closedir(stream); };
     const std::unique_ptr<DIR, decltype(closeStream)> stream(fdopendir(listed.number()), closeStream);
@@ -73,18 +82,17 @@ std::vector<std::string> SysfsDirectory::names() const
     (void)listed.release(); // the stream's
     std::vector<std::string> names;
     while (const dirent* const entry = readdir(stream.get())) // of a stream that no other thread has
-        if (const std::string name = entry->d_name; name != "." && name != "..")
-            names.push_back(name);
+        if (const std::string_view name = entry->d_name; name != "." && name != ".." && isWanted(*entry))
+            names.emplace_back(name);
     std::sort(names.begin(), names.end());
     return names;
 }
 
-bool SysfsDirectory::hasDirectory(const std::string& name) const
+bool SysfsDirectory::hasDirectory(const char* name) const
 {
     struct stat status
     {};
-    return fstatat(descriptor_.number(), name.c_str(), &status, AT_SYMLINK_NOFOLLOW) == 0 &&
-           S_ISDIR(status.st_mode);
+    return fstatat(descriptor_.number(), name, &status, AT_SYMLINK_NOFOLLOW) == 0 && S_ISDIR(status.st_mode);
 }
 
 std::optional<std::string> SysfsDirectory::linkTarget(const std::string& name) const
@@ -115,10 +123,6 @@ SysfsAttribute SysfsDirectory::attribute(const std::string& name, std::size_t mo
     SysfsAttribute attribute;
     if (!file.isOpen()) {
         attribute.errorCode = errno;
-        return attribute;
-    }
-    if (!isRegularFile(file)) {
-        attribute.errorCode = EINVAL;
         return attribute;
     }
     ssize_t count = 0;

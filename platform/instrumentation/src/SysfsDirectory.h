@@ -47,10 +47,10 @@ public:
     /// listed.
     [[nodiscard]] std::vector<std::string> names() const;
 
-    // For a directory that is open.
+    /// Of those, the names of directories; not of links to them.
+    [[nodiscard]] std::vector<std::string> directories() const;
 
-    /// Whether the name is that of a directory, not of a link to one.
-    [[nodiscard]] bool hasDirectory(const std::string& name) const;
+    // For a directory that is open.
 
     /// Where a link leads, as it stands there. Nothing: there is no link of that name.
     [[nodiscard]] std::optional<std::string> linkTarget(const std::string& name) const;
@@ -58,11 +58,14 @@ public:
     /// Whether that directory is, still, what the name leads to.
     [[nodiscard]] bool leadsTo(const SysfsDirectory& directory, const std::string& name) const;
 
-    /// The beginning of a regular file. Anything else, a pipe for one, counts as unreadable.
+    /// The beginning of a file, of that name or at the end of that path below. A pipe counts as unreadable.
     [[nodiscard]] SysfsAttribute attribute(const std::string& name, std::size_t mostBytes = pageSize) const;
 
 private:
     SysfsDirectory(int base, const std::string& path);
+    template <class IsWanted>
+    [[nodiscard]] std::vector<std::string> entries(IsWanted isWanted) const;
+    [[nodiscard]] bool hasDirectory(const char* name) const;
 
     Descriptor descriptor_;
     int errorCode_;

@@ -138,6 +138,12 @@ std::size_t lengthOfFirstWord(std::string_view name)
     return length;
 }
 
+/// Of ASCII, and shown as it stands.
+bool isPlain(char c)
+{
+    return c >= ' ' && c <= '~' && c != '\\';
+}
+
 bool isVisible(utf8proc_int32_t character)
 {
     switch (utf8proc_category(character)) {
@@ -164,6 +170,8 @@ void appendEscaped(std::string_view bytes, std::string& text)
 
 std::string printable(std::string_view text)
 {
+    if (std::all_of(text.begin(), text.end(), isPlain) && (text.empty() || text.back() != ' '))
+        return std::string(text);
     std::string printed;
     printed.reserve(text.size());
     while (!text.empty()) {

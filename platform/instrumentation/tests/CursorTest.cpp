@@ -1,5 +1,6 @@
 #include <Tavro/Instrumentation.h>
 
+#include "testing/Allocations.h"
 #include "testing/Environment.h"
 #include "testing/ForkUnderLoad.h"
 #include "testing/RecordedLog.h"
@@ -265,6 +266,35 @@ TEST_F(Cursor, takesMoreNodesThanSixteenBitsCount)
                 (R"({"kind":36,"description":"D","path":")" + std::to_string(index)) + R"(","status":1})";
     use(json + "]}");
     EXPECT_EQ(descriptionsOf(36).size(), count);
+}
+
+TEST_F(Cursor, holdsAtMostTwoAndAHalfTimesTheFile)
+{
+#ifdef GLIMMARK_SANITIZED
+    // The sanitizer keeps what is freed, and is busy with it while the tests below fork.
+    const std::vector<int> counts = {1000};
+#else
+    const std::vector<int> counts = {1000, 65535};
+#endif
+    for (const int count : counts) {
+        std::string json = R"({"nodes":[)";
+        for (int number = 0; number < count; ++number) {
+            const std::string text = std::to_string(number);
+            json.append(number == 0 ? "" : ",")
+                .append(R"({"alarmState":1,"description":"Drive )")
+                .append(text);
+            json.append(R"( Fault LED","kind":36,"path":"/chassis-1/drive-bay-)").append(text);
+            json.append(R"(/indicator-1","status":1})");
+        }
+        use(json += "]}");
+        Allocations::startCounting();
+        {
+            const Instrumentation cursor;
+        }
+        const Allocations::Use used = Allocations::stopCounting();
+        EXPECT_LE(static_cast<double>(used.peak), 2.5 * static_cast<double>(json.size())) << count;
+        EXPECT_EQ(used.held, 0) << count;
+    }
 }
 
 TEST_F(Cursor, cursorsOfSeveralThreadsDoNotMeet)

@@ -240,6 +240,14 @@ TEST_F(InventoryFaults, theReportTakesLittleMoreMemoryThanTheFile)
     }
 }
 
+TEST_F(InventoryFaults, halfOfAnEscapedPairIsNoText)
+{
+    for (const char* const half : {"\\udc00", "\\ud800", "\\udfff x"})
+        EXPECT_THAT(faultIn(std::string(R"({"nodes":[{"path":")") + half + "\"}]}"),
+                    StartsWith("line 1, column "))
+            << half;
+}
+
 const std::string anInventory = R"(: expected an object with the field "nodes" or "sources", found )";
 
 TEST_F(InventoryFaults, deepNestingIsRefusedAtItsBeginning)

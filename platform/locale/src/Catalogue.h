@@ -3,9 +3,7 @@
 #ifndef TAVRO_CATALOGUE_H
 #define TAVRO_CATALOGUE_H
 
-#include <optional>
 #include <string>
-#include <string_view>
 
 namespace Tavro {
 
@@ -14,12 +12,12 @@ namespace Tavro {
 std::wstring catalogueName(int library, const std::string& language);
 
 /// The text of a message from the catalogue with that name: in the language, else in the language without
-/// its last part (zh_Hans_CN, zh_Hans, zh), else in English; nothing where English has none either or
-/// where the name is not one of catalogueName's.
+/// its last part (zh_Hans_CN, zh_Hans, zh), else in English; the message id itself where English has none
+/// either or where the name is not one of catalogueName's. It lives until the library is unloaded.
 ///
 /// Each catalogue is read once, when it is first asked for. One that cannot be read or is broken
 /// gives one error line in the log and counts as empty.
-std::optional<std::wstring> findText(const std::wstring& catalogue, const std::wstring& messageId);
+const std::wstring* findText(const std::wstring& catalogue, const std::wstring& messageId);
 
 } // namespace Tavro
 

@@ -1,6 +1,7 @@
 #include "Tavro/Locale.h"
 
 #include <algorithm>
+#include <cstddef>
 #include <cstdlib>
 #include <initializer_list>
 #include <string_view>
@@ -38,7 +39,9 @@ bool isLanguage(std::string_view text)
 std::string getLanguageId()
 {
     const std::string_view locale = localeForMessages();
-    const std::string_view language = locale.substr(0, locale.find_first_of(".@"));
+    const auto* const end =
+        std::find_if(locale.begin(), locale.end(), [](char c) { return c == '.' || c == '@'; });
+    const std::string_view language = locale.substr(0, static_cast<std::size_t>(end - locale.begin()));
     return std::string(isLanguage(language) ? language : defaultLanguage);
 }
 

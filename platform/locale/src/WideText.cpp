@@ -1,6 +1,7 @@
 #include "Tavro/Locale.h"
 
 #include <array>
+#include <cstddef>
 
 #include <utf8proc.h>
 
@@ -8,6 +9,11 @@ namespace Tavro {
 namespace {
 
 constexpr utf8proc_int32_t replacementCharacter = 0xFFFD;
+
+bool isAscii(wchar_t character)
+{
+    return static_cast<char32_t>(character) < 0x80;
+}
 
 void appendUtf8(std::string& text, char32_t character)
 {
@@ -22,10 +28,14 @@ void appendUtf8(std::string& text, char32_t character)
 
 std::string make_string(const std::wstring& text)
 {
-    std::string utf8;
-    utf8.reserve(text.size());
-    for (const wchar_t character : text)
-        appendUtf8(utf8, static_cast<char32_t>(character));
+    // Most texts are ASCII from one end to the other, which is UTF-8 as it stands.
+    std::string utf8(text.size(), '\0');
+    std::size_t done = 0;
+    for (; done < text.size() && isAscii(text[done]); ++done)
+        utf8[done] = static_cast<char>(text[done]);
+    utf8.resize(done);
+    for (; done < text.size(); ++done)
+        appendUtf8(utf8, static_cast<char32_t>(text[done]));
     return utf8;
 }
 

@@ -1,30 +1,37 @@
 #include "MVLog/MVMessageBuffer.h"
 
+#include <array>
 #include <charconv>
+#include <cstddef>
 #include <cstdint>
+#include <cstring>
 #include <iterator>
 #include <string_view>
 
 namespace MVLog {
 
-// A text and not a stream: a stream takes longer to be made than a line to be put together.
+// No stream, which takes longer to be made than a line to be put together; and one piece of memory for a usual line.
 struct MVMessageBuffer::Implementation
 {
-    Implementation() { text.reserve(usualLength); }
-
     void append(std::string_view piece)
     {
-        if (!failed)
-            text += piece;
+        if (failed)
+            return;
+        if (!rest.empty() || piece.size() > place.size() - length) {
+            rest += piece;
+            return;
+        }
+        std::memcpy(&place[length], piece.data(), piece.size());
+        length += piece.size();
     }
 
-    static constexpr std::size_t usualLength = 255; ///< that of a line with its parameter list
-
-    std::string text;
-    bool failed = false; ///< from the first null text on
+    std::array<char, 448> place; ///< of the text's beginning
+    std::size_t length = 0;      ///< of that beginning
+    std::string rest;            ///< of the text
+    bool failed = false;         ///< from the first null text on
 };
 
-MVMessageBuffer::MVMessageBuffer() : implementation_(std::make_unique<Implementation>()) {}
+MVMessageBuffer::MVMessageBuffer() : implementation_(new Implementation) {} // `place` is left as it is
 
 MVMessageBuffer::~MVMessageBuffer() = default;
 
@@ -63,7 +70,10 @@ MVMessageBuffer& MVMessageBuffer::operator<<(bool flag)
 
 std::string MVMessageBuffer::str() const
 {
-    return implementation_->text;
+    std::string text(implementation_->place.data(), implementation_->length);
+    if (!implementation_->rest.empty())
+        text += implementation_->rest;
+    return text;
 }
 
 } // namespace MVLog

@@ -42,13 +42,13 @@ std::string describeSlot(const std::string& enclosure, const std::string& slot)
     return "Enclosure " + printable(enclosure) + ' ' + words;
 }
 
-void appendSlot(const SysfsDirectory& slot, const std::string& description, const Paths& paths,
-                std::vector<Node>& nodes)
+void appendSlot(const SysfsDirectory& enclosure, const std::string& slot, const std::string& description,
+                const Paths& paths, std::vector<Node>& nodes)
 {
     // First: where it is missing because the slot has gone, so are the lights.
-    const SysfsAttribute status = slot.attribute("status");
+    const SysfsAttribute status = enclosure.attribute(slot + "/status");
     for (const Light& light : lights) {
-        const SysfsAttribute value = slot.attribute(light.attribute);
+        const SysfsAttribute value = enclosure.attribute(slot + '/' + light.attribute);
         if (value.isAbsent())
             continue;
         const Paths lightPaths = paths.below(light.attribute);
@@ -73,13 +73,8 @@ void appendEnclosures(const std::string& place, Sysfs& sysfs, std::vector<Node>&
         if (!enclosure.isOpen())
             continue;
         const Paths paths{devicePath(enclosures, place, name), std::string(place).append("/").append(name)};
-        for (const std::string& slotName : enclosure.names()) {
-            if (!enclosure.hasDirectory(slotName))
-                continue;
-            const SysfsDirectory slot(enclosure, slotName);
-            if (slot.isOpen())
-                appendSlot(slot, describeSlot(name, slotName), paths.below(slotName), nodes);
-        }
+        for (const std::string& slot : enclosure.directories())
+            appendSlot(enclosure, slot, describeSlot(name, slot), paths.below(slot), nodes);
     }
 }
 

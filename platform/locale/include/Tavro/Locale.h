@@ -27,7 +27,8 @@ class ResourceString
 {
 public:
     /// \param library    an answer of Locale::getResourceLibrary
-    /// \param messageId  such as MSGID_ALARMDEVICE_CAPTION
+    /// \param messageId  such as MSGID_ALARMDEVICE_CAPTION. One that nobody has a text for is remembered until the
+    ///     library is unloaded: ids are a program's constants.
     ResourceString(const std::wstring& library, const std::wstring& messageId);
     ~ResourceString();
 
