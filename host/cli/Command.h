@@ -65,6 +65,14 @@ struct Watch
 
 using Command = std::variant<Ask, DrawGraph, ListClasses, Serve, Watch>;
 
+/// Shows the alarm devices to Prometheus; apart from the commands, as it has an answer even where there is no broker.
+struct Metrics
+{
+    cim::ObjectPath target;            ///< the class, with a namespace
+    std::chrono::milliseconds limit;   ///< how long asking may take
+    std::optional<std::string> output; ///< the file that is replaced; nothing: standard output
+};
+
 /// What the broker is to be started with.
 struct Settings
 {
