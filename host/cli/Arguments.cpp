@@ -324,7 +324,8 @@ void addWatch(CLI::App& app, Arguments& arguments)
 
 void addMetrics(CLI::App& app, Arguments& arguments)
 {
-    CLI::App& command = addCommand(app, "metrics", "Write the alarm devices in the text format of Prometheus");
+    CLI::App& command =
+        addCommand(app, "metrics", "Write the alarm devices in the text format of Prometheus");
     command.add_option("CLASS", arguments.measured, "Their class, such as root/cimv2:CLASS")
         ->type_name("")
         ->capture_default_str();

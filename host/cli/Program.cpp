@@ -27,10 +27,10 @@ std::unique_ptr<Broker> startBroker(const Settings& settings, const Surroundings
     Registration registration = readRegistrations(registrationFiles);
     if (settings.inventory)
         useInventory(*settings.inventory, defaults);
-    return std::make_unique<Broker>(
-        std::move(registration), findProviderDirectories(settings, surroundings),
-        reportTo(err, settings.trace), settings.like ? findHabits(*settings.like) : nullptr,
-        readClasses(findSchemaFiles(settings, surroundings)));
+    return std::make_unique<Broker>(std::move(registration), findProviderDirectories(settings, surroundings),
+                                    reportTo(err, settings.trace),
+                                    settings.like ? findHabits(*settings.like) : nullptr,
+                                    readClasses(findSchemaFiles(settings, surroundings)));
 }
 
 Ending follow(const Invocation& invocation, const Surroundings& surroundings,

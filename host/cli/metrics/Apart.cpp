@@ -50,7 +50,8 @@ std::optional<std::string> readUntil(std::chrono::steady_clock::time_point end, 
     std::string text;
     std::array<char, 65536> part{};
     while (true) {
-        const auto left = std::chrono::ceil<std::chrono::milliseconds>(end - std::chrono::steady_clock::now()).count();
+        const auto left =
+            std::chrono::ceil<std::chrono::milliseconds>(end - std::chrono::steady_clock::now()).count();
         pollfd waiting{descriptor, POLLIN, 0};
         const int ready = left > 0 ? poll(&waiting, 1, static_cast<int>(left)) : 0;
         if (ready == 0)

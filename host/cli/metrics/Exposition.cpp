@@ -26,7 +26,8 @@ std::string textOfLabels(const std::vector<Label>& labels)
 {
     std::string text;
     for (const Label& label : labels)
-        text += (text.empty() ? "{" : ",") + std::string(label.name) + "=\"" + escapedValue(label.value) + '"';
+        text +=
+            (text.empty() ? "{" : ",") + std::string(label.name) + "=\"" + escapedValue(label.value) + '"';
     return text.empty() ? text : text + '}';
 }
 
