@@ -4,11 +4,16 @@
 
 set(units ${PROJECT_SOURCE_DIR}/metrics/systemd)
 
-# install_metrics(DESTINATION FILE...)
-function(install_metrics destination)
+# install_metrics(DESTINATION FILE [NAME])
+function(install_metrics destination file)
+    get_filename_component(name ${file} NAME)
+    if(ARGC GREATER 2)
+        set(name ${ARGV2})
+    endif()
     install(
-        FILES ${ARGN}
+        FILES ${file}
         DESTINATION ${destination}
+        RENAME ${name}
         COMPONENT metrics
         EXCLUDE_FROM_ALL)
 endfunction()
@@ -19,15 +24,11 @@ if(GLIMMARK_PACKAGES STREQUAL "DEB")
 else()
     set(unitdir /usr/lib/systemd/system)
 endif()
-install_metrics(${unitdir} ${units}/glimmark-metrics.service ${units}/glimmark-metrics.timer)
-install_metrics(/usr/lib/sysusers.d ${units}/glimmark-metrics.conf)
+install_metrics(${unitdir} ${units}/glimmark-metrics.service)
+install_metrics(${unitdir} ${units}/glimmark-metrics.timer)
+install_metrics(/usr/lib/sysusers.d ${units}/glimmark-metrics.sysusers glimmark-metrics.conf)
+install_metrics(/usr/lib/tmpfiles.d ${units}/glimmark-metrics.tmpfiles glimmark-metrics.conf)
 install_metrics(${CMAKE_INSTALL_DATAROOTDIR}/glimmark-metrics ${PROJECT_SOURCE_DIR}/metrics/glimmark.rules.yml)
-
-# The service may write to no folder but its own; node exporter looks into another.
-set(link ${CMAKE_CURRENT_BINARY_DIR}/metrics/glimmark.prom)
-file(MAKE_DIRECTORY ${CMAKE_CURRENT_BINARY_DIR}/metrics)
-file(CREATE_LINK ../../glimmark-metrics/glimmark.prom ${link} SYMBOLIC)
-install_metrics(/var/lib/prometheus/node-exporter ${link})
 
 glimmark_package(
     metrics glimmark-metrics admin "server's diagnostic indicators for Prometheus"
@@ -49,4 +50,4 @@ set(CPACK_RPM_METRICS_POST_INSTALL_SCRIPT_FILE ${scripts}/post)
 set(CPACK_RPM_METRICS_PRE_UNINSTALL_SCRIPT_FILE ${scripts}/preun)
 set(CPACK_RPM_METRICS_POST_UNINSTALL_SCRIPT_FILE ${scripts}/postun)
 list(APPEND CPACK_RPM_EXCLUDE_FROM_AUTO_FILELIST_ADDITION /usr/lib /usr/lib/systemd /usr/lib/systemd/system
-     /usr/lib/sysusers.d /var /var/lib)
+     /usr/lib/sysusers.d /usr/lib/tmpfiles.d)
