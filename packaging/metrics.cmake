@@ -27,7 +27,6 @@ endif()
 install_metrics(${unitdir} ${units}/glimmark-metrics.service)
 install_metrics(${unitdir} ${units}/glimmark-metrics.timer)
 install_metrics(/usr/lib/sysusers.d ${units}/glimmark-metrics.sysusers glimmark-metrics.conf)
-install_metrics(/usr/lib/tmpfiles.d ${units}/glimmark-metrics.tmpfiles glimmark-metrics.conf)
 install_metrics(${CMAKE_INSTALL_DATAROOTDIR}/glimmark-metrics ${PROJECT_SOURCE_DIR}/metrics/glimmark.rules.yml)
 
 glimmark_package(
@@ -50,4 +49,4 @@ set(CPACK_RPM_METRICS_POST_INSTALL_SCRIPT_FILE ${scripts}/post)
 set(CPACK_RPM_METRICS_PRE_UNINSTALL_SCRIPT_FILE ${scripts}/preun)
 set(CPACK_RPM_METRICS_POST_UNINSTALL_SCRIPT_FILE ${scripts}/postun)
 list(APPEND CPACK_RPM_EXCLUDE_FROM_AUTO_FILELIST_ADDITION /usr/lib /usr/lib/systemd /usr/lib/systemd/system
-     /usr/lib/sysusers.d /usr/lib/tmpfiles.d)
+     /usr/lib/sysusers.d)

@@ -25,8 +25,8 @@ import urllib.parse
 import urllib.request
 
 RULES = pathlib.Path(__file__).resolve().parent.parent / "glimmark.rules.yml"
-SECONDS = {"for: 1m": "for: 2s", "for: 5m": "for: 4s", "offset 1h": "offset 14s", "offset 1d": "offset 26s"}
-BASELINE = 12  # seconds before anything is planted: one of the offsets then looks back at it, until 26 seconds later
+SECONDS = {"for: 1m": "for: 2s", "for: 5m": "for: 4s", "offset 1h": "offset 18s", "offset 1d": "offset 34s"}
+BASELINE = 16  # seconds before anything is planted: one of the offsets then looks back at it, until 34 seconds later
 PATIENCE = 60  # seconds for each picture to come, which takes less than ten where the processor is free
 
 OK, DEGRADED, PREDICTED = 1, 22, 20  # a node's status

@@ -76,7 +76,10 @@ suits_promtool() {
 }
 
 @test "the link in node exporter's folder leads to the file that the service writes" {
-    read -r _ link _ _ _ _ target <<<"$(grep '^L' "$folder/systemd/glimmark-metrics.tmpfiles")"
-    [ "$link" = /var/lib/prometheus/node-exporter/glimmark.prom ]
-    grep -q -- "--output $(realpath -m "${link%/*}/$target")\$" "$service"
+    for script in postinst post; do
+        read -r _ _ target link <<<"$(grep 'ln -sfn' "$folder/../packaging/metrics/$script" | tr -d '"')"
+        link=${link#\$DPKG_ROOT}
+        [ "$link" = /var/lib/prometheus/node-exporter/glimmark.prom ]
+        grep -q -- "--output $(realpath -m "${link%/*}/$target")\$" "$service"
+    done
 }
