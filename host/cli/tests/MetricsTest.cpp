@@ -51,8 +51,9 @@ TEST(Exposition, escapesLabelsAsTheFormatWants)
     EXPECT_EQ(gaugeWith("Fan 1"), head + "n{l=\"Fan 1\"} 1\n");
     EXPECT_EQ(gaugeWith("a\"b\\c\nd"), head + "n{l=\"a\\\"b\\\\c\\nd\"} 1\n");
     EXPECT_EQ(gaugeWith("L\u00fcfter\t{2}, #"), head + "n{l=\"L\u00fcfter\t{2}, #\"} 1\n");
-    EXPECT_EQ(gaugeWith("\xff\xc3"), head + "n{l=\"\uFFFD\uFFFD\"} 1\n") << "Prometheus refuses all of a text "
-                                                                            "that is not UTF-8";
+    EXPECT_EQ(gaugeWith("\xff\xc3"), head + "n{l=\"\uFFFD\uFFFD\"} 1\n")
+        << "Prometheus refuses all of a text "
+           "that is not UTF-8";
 }
 
 TEST(Exposition, writesGaugesWithAndWithoutLabels)
@@ -68,17 +69,17 @@ TEST(Exposition, writesGaugesWithAndWithoutLabels)
 
 // The gauges
 
-cim::Answer lampsAnswer(std::vector<cim::Instance> instances)
+cim::Answer lampsAnswer(std::initializer_list<cim::Instance> instances)
 {
-    return {{}, {}, std::move(instances)};
+    return {{}, {}, instances};
 }
 
-cim::Instance lampWithStatus(std::vector<cim::Value::Scalar> status)
+cim::Instance lampWithStatus(const std::vector<cim::Value::Scalar>& status)
 {
     cim::Instance instance = lamp("L:/1", 10, 3);
     for (cim::Property& property : instance.properties)
         if (property.name == "OperationalStatus")
-            property.value = cim::arrayValue(CMPI_uint16, std::move(status));
+            property.value = cim::arrayValue(CMPI_uint16, status);
     return instance;
 }
 
@@ -86,7 +87,8 @@ cim::Instance lampWithStatus(std::vector<cim::Value::Scalar> status)
 TEST(AlarmDeviceGauges, areAnInterface)
 {
     EXPECT_EQ(
-        alarmDeviceGauges(lampsAnswer({lampWithStatus({std::uint64_t{3}, std::uint64_t{5}}), lamp("L:/2", 5, 1)})),
+        alarmDeviceGauges(
+            lampsAnswer({lampWithStatus({std::uint64_t{3}, std::uint64_t{5}}), lamp("L:/2", 5, 1)})),
         R"(# HELP cim_alarm_device_alarm_state What the device shows: 0 unknown, 1 off, 2 steady, 3 alternating.
 # TYPE cim_alarm_device_alarm_state gauge
 cim_alarm_device_alarm_state{id="L:/1",name="L"} 3
@@ -110,8 +112,9 @@ TEST(CollectionGauges, areAnInterface)
 {
     using namespace std::chrono;
     const Collection failed{false, milliseconds(1250), system_clock::time_point(milliseconds(1700000000125))};
-    EXPECT_EQ(collectionGauges(failed),
-              R"(# HELP cim_alarm_device_collection_success Whether the alarm devices were collected; if not, none is here.
+    EXPECT_EQ(
+        collectionGauges(failed),
+        R"(# HELP cim_alarm_device_collection_success Whether the alarm devices were collected; if not, none is here.
 # TYPE cim_alarm_device_collection_success gauge
 cim_alarm_device_collection_success 0
 # HELP cim_alarm_device_collection_duration_seconds How long collecting them took.
@@ -126,10 +129,11 @@ cim_alarm_device_collection_timestamp_seconds 1700000000.125
 
 TEST(AlarmDeviceGauges, haveEachStatusOnce)
 {
-    const std::string text =
-        alarmDeviceGauges(lampsAnswer({lampWithStatus({std::uint64_t{3}, std::uint64_t{3}, std::uint64_t{40000}})}));
-    EXPECT_THAT(text, HasSubstr("status=\"Degraded\"} 1\n"
-                                "cim_alarm_device_operational_status{id=\"L:/1\",name=\"L\",status=\"40000\"} 1\n"));
+    const std::string text = alarmDeviceGauges(
+        lampsAnswer({lampWithStatus({std::uint64_t{3}, std::uint64_t{3}, std::uint64_t{40000}})}));
+    EXPECT_THAT(
+        text, HasSubstr("status=\"Degraded\"} 1\n"
+                        "cim_alarm_device_operational_status{id=\"L:/1\",name=\"L\",status=\"40000\"} 1\n"));
     EXPECT_THAT(text, Not(ContainsRegex("Degraded.*\n.*Degraded")));
     EXPECT_THAT(alarmDeviceGauges(lampsAnswer({lampWithStatus({})})), Not(HasSubstr("status=")));
 }
@@ -161,7 +165,8 @@ TEST(AlarmDeviceGauges, areNoneWithoutAPicture)
     EXPECT_EQ(refusalOf({}), "there is no alarm device, or what has them cannot be read");
     EXPECT_EQ(refusalOf(lampsAnswer({lamp("L:/1"), lamp("L:/2"), lamp("L:/1")})),
               "two alarm devices have the DeviceID \"L:/1\"");
-    EXPECT_EQ(refusalOf(lampsAnswer({lamp("\xff"), lamp("\xfe")})), "two alarm devices have the DeviceID \"\uFFFD\"");
+    EXPECT_EQ(refusalOf(lampsAnswer({lamp("\xff"), lamp("\xfe")})),
+              "two alarm devices have the DeviceID \"\uFFFD\"");
     EXPECT_EQ(refusalOf(lampsAnswer({lamp("")})), "an alarm device has no DeviceID");
 }
 
@@ -181,10 +186,11 @@ TEST(Apart, returnsWhatTheWorkReturns)
 {
     EXPECT_EQ(doApart([] { return std::string(); }, std::chrono::seconds(30)), "");
     const std::string large(1000000, 'm');
-    EXPECT_EQ(doApart([&] { return large; }, std::chrono::seconds(30)), large);
+    EXPECT_EQ(doApart([&] { return std::string(large); }, std::chrono::seconds(30)), large);
     const pid_t here = getpid();
-    EXPECT_EQ(doApart([&] { return std::string(getpid() == here ? "here" : "apart"); }, std::chrono::seconds(30)),
-              "apart");
+    EXPECT_EQ(
+        doApart([&] { return std::string(getpid() == here ? "here" : "apart"); }, std::chrono::seconds(30)),
+        "apart");
 }
 
 TEST(Apart, tellsWhatBecameOfTheWork)
@@ -330,8 +336,9 @@ TEST_F(MetricsCommand, showsTheDevices)
     const MetricsOutcome outcome = runMetrics({"CIMT_Lamp"});
     EXPECT_EQ(outcome.status, 0);
     EXPECT_EQ(outcome.err, "");
-    EXPECT_THAT(outcome.out, HasSubstr("\ncim_alarm_device_alarm_state{id=\"L\u00fcfter \\\"2\\\", a=b\\\\c\","
-                                       "name=\"L\u00fcfter 2\"} 3\n"));
+    EXPECT_THAT(outcome.out,
+                HasSubstr("\ncim_alarm_device_alarm_state{id=\"L\u00fcfter \\\"2\\\", a=b\\\\c\","
+                          "name=\"L\u00fcfter 2\"} 3\n"));
     EXPECT_THAT(outcome.out, HasSubstr("\ncim_alarm_devices 2\n"));
     EXPECT_THAT(outcome.out, HasSubstr("\ncim_alarm_device_collection_success 1\n"));
     EXPECT_THAT(outcome.out,
@@ -344,7 +351,8 @@ TEST_F(MetricsCommand, asksForWhateverIsAnAlarmDevice)
     std::ofstream(directory.path("lamp.mof"))
         << "class CIM_AlarmDevice { [Key] string DeviceID; };\n"
            "class CIMT_Lamp : CIM_AlarmDevice { [Key] string CreationClassName; };\n";
-    EXPECT_THAT(runMetrics({"--schema", directory.path("lamp.mof")}).out, HasSubstr("\ncim_alarm_devices 2\n"));
+    EXPECT_THAT(runMetrics({"--schema", directory.path("lamp.mof")}).out,
+                HasSubstr("\ncim_alarm_devices 2\n"));
     expectFailure(runMetrics({}), "CMPI_RC_ERR_INVALID_CLASS (5): no provider is registered for the class "
                                   "CIM_AlarmDevice in root/cimv2");
 }
