@@ -13,6 +13,7 @@
 
 #include <fcntl.h>
 #include <poll.h>
+#include <sys/prctl.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -32,6 +33,7 @@ constexpr char isMessage = 'm';
 /// The child's life. Nothing that the parent began is ended or written here.
 [[noreturn]] void live(const std::function<std::string()>& work, int descriptor)
 {
+    prctl(PR_SET_PDEATHSIG, SIGKILL); // nobody else would end it
     std::string text;
     try {
         text = work() + isResult;

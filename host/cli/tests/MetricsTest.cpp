@@ -10,6 +10,7 @@
 #include "Lamp.h"
 #include "testing/TemporaryDirectory.h"
 
+#include <array>
 #include <csignal>
 #include <cstdlib>
 #include <fstream>
@@ -20,8 +21,10 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <poll.h>
 #include <sys/resource.h>
 #include <sys/stat.h>
+#include <sys/wait.h>
 #include <unistd.h>
 
 using namespace cimhost;
@@ -213,6 +216,30 @@ TEST(Apart, endsWorkThatTakesTooLong)
             pause();
     };
     EXPECT_EQ(failureOf(sleepForever, std::chrono::milliseconds(50)), "there was no answer within 50 ms");
+}
+
+TEST(Apart, endsTheWorkWhereThisProcessEnds)
+{
+    std::array<int, 2> ends{-1, -1};
+    ASSERT_EQ(pipe(ends.data()), 0);
+    const auto writeAndSleep = [&]() -> std::string {
+        static_cast<void>(write(ends[1], "x", 1));
+        while (true)
+            pause();
+    };
+    const pid_t process = fork();
+    if (process == 0) {
+        doApart(writeAndSleep, std::chrono::hours(1));
+        _exit(0);
+    }
+    close(ends[1]);
+    char byte = 0;
+    EXPECT_EQ(::read(ends[0], &byte, 1), 1);
+    kill(process, SIGKILL);
+    waitpid(process, nullptr, 0);
+    pollfd left{ends[0], POLLIN, 0};
+    EXPECT_EQ(poll(&left, 1, 20000), 1) << "nobody has the pipe any more";
+    close(ends[0]);
 }
 
 // The file that is replaced
