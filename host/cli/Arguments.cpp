@@ -81,6 +81,7 @@ struct Arguments
     Serve serve{"127.0.0.1", standardPort};
     std::string watched; ///< empty: what the installation says
     double interval = 2; ///< seconds
+    bool hasMetrics = false;
     std::string measured = alarmDeviceClass;
     double limit = 30;  ///< seconds
     std::string output; ///< empty: none
@@ -294,7 +295,7 @@ void addQuestion(CLI::App& app, const QuestionEntry& entry, Arguments& arguments
     addWide(command, arguments.isWide);
 }
 
-void addServe(CLI::App& app, Serve& serve)
+void addServe(CLI::App& app, Serve& serve, bool& hasMetrics)
 {
     CLI::App& command = addCommand(
         app, "serve", "Answer CIM clients over HTTP, for development: no authentication, no encryption");
@@ -306,6 +307,7 @@ void addServe(CLI::App& app, Serve& serve)
         ->type_name("PORT")
         ->check(between(0, 65535, "a number from 0 to 65535"))
         ->capture_default_str();
+    command.add_flag("--metrics", hasMetrics, "Answer GET /metrics for Prometheus too");
 }
 
 void addWatch(CLI::App& app, Arguments& arguments)
@@ -412,6 +414,8 @@ std::variant<Invocation, Measurement, Notice> commandOf(const CLI::App& app, Arg
         return Invocation{watchOf(arguments), settings};
     if (name == "classes")
         return Invocation{ListClasses{}, settings};
+    if (arguments.hasMetrics)
+        arguments.serve.metrics = readClass("serve", arguments.measured, arguments.nameSpace);
     return Invocation{arguments.serve, settings};
 }
 
@@ -470,7 +474,7 @@ std::variant<Invocation, Measurement, Notice> parseArguments(std::vector<std::st
         addQuestion(app, entry, result);
     addCommand(app, "classes", "List the classes that can be asked, with their namespaces and providers");
     addCommand(app, "graph", "Write a namespace's instances as a Graphviz graph");
-    addServe(app, result.serve);
+    addServe(app, result.serve, result.hasMetrics);
     addWatch(app, result);
     addMetrics(app, result);
 

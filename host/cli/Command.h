@@ -53,6 +53,8 @@ struct Serve
 {
     std::string address;    ///< an IPv4 or IPv6 address of this machine
     std::uint16_t port = 0; ///< 0: any that is free
+    /// The class whose instances are shown to Prometheus too; nothing: none are.
+    std::optional<cim::ObjectPath> metrics{};
 };
 
 /// Shows the instances of a class live until a signal ends it.

@@ -13,15 +13,26 @@ namespace cimhost::cli {
 
 namespace {
 
+using Began = std::chrono::steady_clock::time_point;
+
+/// The whole picture. \param gauges  empty: there is none of the devices
+std::string pictureOf(const std::string& gauges, Began began)
+{
+    return gauges + collectionGauges({!gauges.empty(), std::chrono::steady_clock::now() - began,
+                                      std::chrono::system_clock::now()});
+}
+
+std::string ask(const cim::ObjectPath& target, Broker& broker)
+{
+    return alarmDeviceGauges(broker.enumerateInstances(target, alarmDeviceProperties()));
+}
+
 /// The gauges; nothing where there is no picture, and `err` has a line.
 std::string collect(const Metrics& command, const StartBroker& start, std::ostream& err)
 {
-    const auto ask = [&] {
-        const std::unique_ptr<Broker> broker = start();
-        return alarmDeviceGauges(broker->enumerateInstances(command.target, alarmDeviceProperties()));
-    };
+    const auto work = [&] { return ask(command.target, *start()); };
     try {
-        return doApart(ask, command.limit);
+        return doApart(work, command.limit);
     } catch (const ApartError& error) {
         err << "cimhost: no metrics: " << error.what() << '\n';
         return "";
@@ -30,19 +41,27 @@ std::string collect(const Metrics& command, const StartBroker& start, std::ostre
 
 } // namespace
 
+std::string metricsOf(const cim::ObjectPath& target, Broker& broker)
+{
+    const Began began = std::chrono::steady_clock::now();
+    try {
+        return pictureOf(ask(target, broker), began);
+    } catch (const NoPicture&) {
+        return pictureOf("", began);
+    }
+}
+
 ExitStatus writeMetrics(const Metrics& command, const StartBroker& start, std::ostream& out,
                         std::ostream& err)
 {
-    const auto began = std::chrono::steady_clock::now();
+    const Began began = std::chrono::steady_clock::now();
     const std::string gauges = collect(command, start, err);
-    const Collection collection{!gauges.empty(), std::chrono::steady_clock::now() - began,
-                                std::chrono::system_clock::now()};
-    const std::string text = gauges + collectionGauges(collection);
+    const std::string text = pictureOf(gauges, began);
     if (command.output)
         replaceFile(*command.output, text);
     else
         out << text;
-    return collection.isSuccessful ? exitAnswered : exitError;
+    return gauges.empty() ? exitError : exitAnswered;
 }
 
 } // namespace cimhost::cli

@@ -50,6 +50,22 @@ suits_promtool() {
     [ -z "$(comm -13 "$BATS_TEST_TMPDIR/printed" "$BATS_TEST_TMPDIR/named")" ]
 }
 
+# Without what differs from one collection to the next.
+as_always() { sed -E 's/^(cim_alarm_device_collection_(duration|timestamp)_seconds) .*/\1/'; }
+
+@test "a server hands out the same" {
+    "$CIMHOST" --inventory "$INVENTORIES/small-server.json" metrics | as_always >"$BATS_TEST_TMPDIR/printed"
+    "$CIMHOST" --inventory "$INVENTORIES/small-server.json" serve --metrics --port 0 2>"$BATS_TEST_TMPDIR/said" 3>&- &
+    server=$!
+    until url=$(grep -oE 'http://[0-9.:]+' "$BATS_TEST_TMPDIR/said"); do sleep 0.05; done
+    python3 -c 'import sys, urllib.request
+answer = urllib.request.urlopen(sys.argv[1] + "/metrics")
+assert answer.headers["Content-Type"] == "text/plain; version=0.0.4; charset=utf-8", answer.headers
+print(answer.read().decode(), end="")' "$url" | as_always >"$BATS_TEST_TMPDIR/served"
+    kill "$server"
+    diff "$BATS_TEST_TMPDIR/printed" "$BATS_TEST_TMPDIR/served"
+}
+
 @test "systemd takes the units without a word" {
     # Where the packages are not installed, the program and its manual page are elsewhere.
     sed "s|/usr/bin/cimhost|$CIMHOST|" "$service" >"$BATS_TEST_TMPDIR/glimmark-metrics.service"

@@ -121,6 +121,16 @@ TEST(Arguments, watchHasAClassAndAnInterval)
               "--format has no meaning for watch, which shows a table, or a line for each change");
 }
 
+TEST(Arguments, serveShowsMetricsIfAsked)
+{
+    const auto metricsOf = [](std::vector<std::string> arguments) {
+        return std::get<Serve>(parse(std::move(arguments)).command).metrics;
+    };
+    EXPECT_EQ(metricsOf({"serve"}), std::nullopt);
+    EXPECT_EQ(metricsOf({"serve", "--metrics"}), (cim::ObjectPath{"", "root/cimv2", "CIM_AlarmDevice", {}}));
+    EXPECT_EQ(metricsOf({"-n", "root/x", "serve", "--metrics"})->nameSpace, "root/x");
+}
+
 TEST(Arguments, metricsHaveAClassALimitAndAFile)
 {
     const auto metricsOf = [](std::vector<std::string> arguments) {

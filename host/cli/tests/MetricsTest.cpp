@@ -1,5 +1,6 @@
 // Alarm devices for Prometheus: the text, the process that asks, the file that is replaced, and the command.
 
+#include "cli/Metrics.h"
 #include "cim/Values.h"
 #include "cli/Program.h"
 #include "cli/metrics/AlarmDevices.h"
@@ -398,6 +399,14 @@ TEST_F(MetricsCommand, neverShowsAFailureAsHealth)
                   "the process that asked the provider ended with signal 6 (Aborted)");
     expectFailure(runMetrics({"CIMT_Lamp", "--limit", "1", "--inventory", inventory("lamp a 5 1\nhang")}),
                   "there was no answer within 1000 ms");
+}
+
+TEST(MetricsOfABroker, neverShowAFailureAsHealth)
+{
+    Broker broker({}, {});
+    const std::string text = metricsOf({"", "root/cimv2", "CIM_AlarmDevice", {}}, broker);
+    EXPECT_THAT(text, StartsWith("# HELP cim_alarm_device_collection_success"));
+    EXPECT_THAT(text, HasSubstr("\ncim_alarm_device_collection_success 0\n"));
 }
 
 TEST_F(MetricsCommand, replacesTheFileWhateverItFinds)
