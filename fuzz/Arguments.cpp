@@ -31,6 +31,8 @@ int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size)
         const auto read = cli::parseArguments(linesOf(Fuzz::textOf(data, size)));
         if (const auto* const notice = std::get_if<cli::Notice>(&read)) {
             Fuzz::require(!notice->text.empty(), "a notice has a text");
+        } else if (const auto* const measurement = std::get_if<cli::Measurement>(&read)) {
+            Fuzz::require(!measurement->metrics.target.className.empty(), "a measurement names a class");
         } else {
             const cli::Command& command = std::get<cli::Invocation>(read).command;
             const auto* const ask = std::get_if<cli::Ask>(&command);

@@ -166,4 +166,6 @@ set(CPACK_RPM_SPEC_MORE_DEFINE
 %define clamp_mtime_to_source_date_epoch 1
 %define _build_id_links none")
 
+include(metrics.cmake)
+
 include(CPack)

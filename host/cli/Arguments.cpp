@@ -3,6 +3,7 @@
 #include "broker/Habits.h"
 #include "cim/ObjectPathText.h"
 #include "cim/Utf8.h"
+#include "cli/metrics/AlarmDevices.h"
 
 #include <algorithm>
 #include <array>
@@ -34,6 +35,7 @@ Examples:
   cimhost graph | dot -Tsvg > graph.svg    the whole picture
   cimhost serve                            for CIM clients on this machine
   cimhost watch                            what the installation is for, live
+  cimhost metrics                          alarm devices, for Prometheus
 
 Environment:
   CIMHOST_PROVIDER_DIR   directories of provider libraries, separated by colons
@@ -62,6 +64,9 @@ void translateFieldSpellings(std::vector<std::string>& arguments)
 /// Of CIM-XML over HTTP without encryption, as registered with IANA (wbem-http).
 constexpr std::uint16_t standardPort = 5988;
 
+constexpr double leastLimit = 1;   ///< seconds
+constexpr double mostLimit = 3600; ///< seconds
+
 constexpr double leastInterval = 0.1;    ///< seconds
 constexpr double mostInterval = 86400.0; ///< seconds
 
@@ -76,6 +81,10 @@ struct Arguments
     Serve serve{"127.0.0.1", standardPort};
     std::string watched; ///< empty: what the installation says
     double interval = 2; ///< seconds
+    bool hasMetrics = false;
+    std::string measured = alarmDeviceClass;
+    double limit = 30;  ///< seconds
+    std::string output; ///< empty: none
     bool isWide = false;
     Settings settings;
 };
@@ -286,7 +295,7 @@ void addQuestion(CLI::App& app, const QuestionEntry& entry, Arguments& arguments
     addWide(command, arguments.isWide);
 }
 
-void addServe(CLI::App& app, Serve& serve)
+void addServe(CLI::App& app, Serve& serve, bool& hasMetrics)
 {
     CLI::App& command = addCommand(
         app, "serve", "Answer CIM clients over HTTP, for development: no authentication, no encryption");
@@ -298,6 +307,7 @@ void addServe(CLI::App& app, Serve& serve)
         ->type_name("PORT")
         ->check(between(0, 65535, "a number from 0 to 65535"))
         ->capture_default_str();
+    command.add_flag("--metrics", hasMetrics, "Answer GET /metrics for Prometheus too");
 }
 
 void addWatch(CLI::App& app, Arguments& arguments)
@@ -314,6 +324,22 @@ void addWatch(CLI::App& app, Arguments& arguments)
     addWide(command, arguments.isWide);
 }
 
+void addMetrics(CLI::App& app, Arguments& arguments)
+{
+    CLI::App& command =
+        addCommand(app, "metrics", "Write the alarm devices in the text format of Prometheus");
+    command.add_option("CLASS", arguments.measured, "Their class, such as root/cimv2:CLASS")
+        ->type_name("")
+        ->capture_default_str();
+    command.add_option("--output", arguments.output, "File that is replaced in one step")
+        ->type_name("FILE")
+        ->check(named("file"));
+    command.add_option("--limit", arguments.limit, "Seconds that asking may take")
+        ->type_name("SECONDS")
+        ->check(between(leastLimit, mostLimit, "1 to 3600 seconds"))
+        ->capture_default_str();
+}
+
 /// The class that a command takes.
 cim::ObjectPath readClass(const std::string& command, const std::string& text, const std::string& nameSpace)
 {
@@ -323,13 +349,23 @@ cim::ObjectPath readClass(const std::string& command, const std::string& text, c
     return path;
 }
 
-Watch watchOf(const Arguments& arguments)
+std::chrono::milliseconds millisecondsOf(double seconds)
 {
     constexpr double millisecondsASecond = 1000;
+    return std::chrono::milliseconds(std::llround(seconds * millisecondsASecond));
+}
+
+Metrics metricsOf(const Arguments& arguments)
+{
+    return {readClass("metrics", arguments.measured, arguments.nameSpace), millisecondsOf(arguments.limit),
+            arguments.output.empty() ? std::nullopt : std::optional(arguments.output)};
+}
+
+Watch watchOf(const Arguments& arguments)
+{
     return {arguments.watched.empty() ? cim::ObjectPath{"", arguments.nameSpace, "", {}}
                                       : readClass("watch", arguments.watched, arguments.nameSpace),
-            std::chrono::milliseconds(std::llround(arguments.interval * millisecondsASecond)),
-            arguments.isWide};
+            millisecondsOf(arguments.interval), arguments.isWide};
 }
 
 Ask questionOf(const QuestionEntry& entry, Arguments& arguments)
@@ -347,28 +383,40 @@ Ask questionOf(const QuestionEntry& entry, Arguments& arguments)
     return ask;
 }
 
-/// The command that was given, with what the parser alone cannot judge.
-Command commandOf(const CLI::App& app, Arguments& arguments)
+/// Which only questions take.
+void refuseFormat(const std::string& command, const std::string& format)
 {
+    static const std::map<std::string, const char*> forms{
+        {"classes", "writes a table"},
+        {"graph", "writes DOT"},
+        {"metrics", "writes the text format of Prometheus"},
+        {"serve", "writes XML"},
+        {"watch", "shows a table, or a line for each change"}};
+    if (!format.empty())
+        throw UsageError("--format has no meaning for " + command + ", which " + forms.at(command));
+}
+
+/// The command that was given, with what the parser alone cannot judge.
+std::variant<Invocation, Measurement, Notice> commandOf(const CLI::App& app, Arguments& arguments)
+{
+    const Settings& settings = arguments.settings;
     const std::string name = app.get_subcommands().front()->get_name();
     const auto* entry = std::find_if(questionEntries.begin(), questionEntries.end(),
                                      [&](const QuestionEntry& candidate) { return candidate.name == name; });
     if (entry != questionEntries.end())
-        return questionOf(*entry, arguments);
-    static const std::map<std::string, const char*> forms{
-        {"classes", "writes a table"},
-        {"graph", "writes DOT"},
-        {"serve", "writes XML"},
-        {"watch", "shows a table, or a line for each change"}};
-    if (!arguments.format.empty())
-        throw UsageError("--format has no meaning for " + name + ", which " + forms.at(name));
+        return Invocation{questionOf(*entry, arguments), settings};
+    refuseFormat(name, arguments.format);
+    if (name == "metrics")
+        return Measurement{metricsOf(arguments), settings};
     if (name == "graph")
-        return DrawGraph{arguments.nameSpace};
+        return Invocation{DrawGraph{arguments.nameSpace}, settings};
     if (name == "watch")
-        return watchOf(arguments);
+        return Invocation{watchOf(arguments), settings};
     if (name == "classes")
-        return ListClasses{};
-    return arguments.serve;
+        return Invocation{ListClasses{}, settings};
+    if (arguments.hasMetrics)
+        arguments.serve.metrics = readClass("serve", arguments.measured, arguments.nameSpace);
+    return Invocation{arguments.serve, settings};
 }
 
 /// What is wrong, in one line.
@@ -413,7 +461,7 @@ Notice noticeOf(const CLI::App& app, const CLI::ParseError& error)
 
 } // namespace
 
-std::variant<Invocation, Notice> parseArguments(std::vector<std::string> arguments)
+std::variant<Invocation, Measurement, Notice> parseArguments(std::vector<std::string> arguments)
 {
     Arguments result;
     CLI::App app("Asks CIM providers, loaded into this process, what a CIM client asks.", "cimhost");
@@ -426,8 +474,9 @@ std::variant<Invocation, Notice> parseArguments(std::vector<std::string> argumen
         addQuestion(app, entry, result);
     addCommand(app, "classes", "List the classes that can be asked, with their namespaces and providers");
     addCommand(app, "graph", "Write a namespace's instances as a Graphviz graph");
-    addServe(app, result.serve);
+    addServe(app, result.serve, result.hasMetrics);
     addWatch(app, result);
+    addMetrics(app, result);
 
     translateFieldSpellings(arguments);
     std::reverse(arguments.begin(), arguments.end()); // the parser takes them off the back
@@ -436,7 +485,7 @@ std::variant<Invocation, Notice> parseArguments(std::vector<std::string> argumen
     } catch (const CLI::ParseError& error) {
         return noticeOf(app, error);
     }
-    return Invocation{commandOf(app, result), result.settings};
+    return commandOf(app, result);
 }
 
 } // namespace cimhost::cli

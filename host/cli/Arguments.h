@@ -27,6 +27,13 @@ struct Invocation
     Settings settings;
 };
 
+/// The alarm devices are to be shown.
+struct Measurement
+{
+    Metrics metrics;
+    Settings settings;
+};
+
 /// Text to print instead of doing anything: the help or the version.
 struct Notice
 {
@@ -37,7 +44,7 @@ struct Notice
 /// `-ac`, `-arc`, `-ar` and `-arr`, stand for `--assoc-class`, `--result-class`, `--role` and
 /// `--result-role`
 /// \throws UsageError
-std::variant<Invocation, Notice> parseArguments(std::vector<std::string> arguments);
+std::variant<Invocation, Measurement, Notice> parseArguments(std::vector<std::string> arguments);
 
 } // namespace cimhost::cli
 

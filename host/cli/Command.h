@@ -53,6 +53,8 @@ struct Serve
 {
     std::string address;    ///< an IPv4 or IPv6 address of this machine
     std::uint16_t port = 0; ///< 0: any that is free
+    /// The class whose instances are shown to Prometheus too; nothing: none are.
+    std::optional<cim::ObjectPath> metrics{};
 };
 
 /// Shows the instances of a class live until a signal ends it.
@@ -64,6 +66,14 @@ struct Watch
 };
 
 using Command = std::variant<Ask, DrawGraph, ListClasses, Serve, Watch>;
+
+/// Shows the alarm devices to Prometheus; apart from the commands, as it has an answer even where there is no broker.
+struct Metrics
+{
+    cim::ObjectPath target;            ///< the class, with a namespace
+    std::chrono::milliseconds limit;   ///< how long asking may take
+    std::optional<std::string> output; ///< the file that is replaced; nothing: standard output
+};
 
 /// What the broker is to be started with.
 struct Settings

@@ -1,6 +1,8 @@
 #include "cli/Serve.h"
 
+#include "cli/Metrics.h"
 #include "cli/Signals.h"
+#include "cli/metrics/Exposition.h"
 #include "serve/CimBinding.h"
 #include "serve/HttpServer.h"
 
@@ -23,12 +25,20 @@ std::string hostName()
     return gethostname(name.data(), name.size() - 1) == 0 && name[0] != '\0' ? name.data() : "localhost";
 }
 
+/// The page that Prometheus asks for, where it is wanted.
+serve::Page pageOf(const Serve& command, Broker& broker)
+{
+    if (!command.metrics)
+        return {};
+    return {"/metrics", expositionType, [&] { return metricsOf(*command.metrics, broker); }};
+}
+
 } // namespace
 
 ExitStatus serveUntilSignal(const Serve& command, Broker& broker, std::ostream& err)
 {
     const HeldSignals signals{SIGINT, SIGTERM};
-    const serve::CimBinding binding(broker, hostName());
+    const serve::CimBinding binding(broker, hostName(), {}, pageOf(command, broker));
     std::optional<serve::HttpServer> server;
     try {
         server.emplace(serve::Endpoint{command.address, command.port}, binding);

@@ -29,8 +29,9 @@ int main(int argc, char* argv[])
 {
     using namespace cimhost::cli;
 
-    // Writing to a pipe that nobody reads any more ends in an exit status, not in a signal.
+    // Writing to a pipe that nobody reads any more, or beyond a limit, ends in an exit status, not in a signal.
     std::signal(SIGPIPE, SIG_IGN);
+    std::signal(SIGXFSZ, SIG_IGN);
 
     std::optional<std::size_t> columns;
     if (isatty(STDOUT_FILENO) != 0)

@@ -193,10 +193,11 @@ std::vector<HeaderField> responseHeaders(const std::string& prefix)
 
 } // namespace
 
-CimBinding::CimBinding(Broker& broker, std::string hostName, const RequestLimits& limits)
+CimBinding::CimBinding(Broker& broker, std::string hostName, const RequestLimits& limits, Page page)
     : broker_(broker),
       hostName_(std::move(hostName)),
       limits_(limits),
+      page_(std::move(page)),
       lists_(broker.classes(), broker.registration()),
       budget_(std::make_shared<TextBudget>(limits.answers)),
       slots_(std::make_unique<Slots>(limits.atOnce))
@@ -241,8 +242,20 @@ HttpResponse CimBinding::tooLarge() const
     return responseTo({413, "expected a body of at most " + std::to_string(limits_.bytes) + " bytes", {}});
 }
 
+Slots::Taken CimBinding::takeSlot() const
+{
+    std::optional<Slots::Taken> slot = slots_->take(limits_.waiting);
+    if (!slot)
+        throw HttpError{503, "too many requests are being answered, try again", {{"Retry-After", "10"}}};
+    return std::move(*slot);
+}
+
 HttpResponse CimBinding::respond(const HttpRequest& request) const
 {
+    if (request.method == "GET" && page_.text && request.target == page_.target) {
+        const Slots::Taken slot = takeSlot();
+        return {200, {{"Content-Type", page_.type}}, Text(page_.text())};
+    }
     const std::string prefix = checkMethod(request);
     checkOperation(request, prefix);
     checkContent(request);
@@ -251,9 +264,7 @@ HttpResponse CimBinding::respond(const HttpRequest& request) const
     checkMatch(request, prefix, message);
     if (auto* const question = std::get_if<Question>(&message.content))
         lists_.shorten(question->request.properties);
-    const std::optional<Slots::Taken> slot = slots_->take(limits_.waiting);
-    if (!slot)
-        throw HttpError{503, "too many requests are being answered, try again", {{"Retry-After", "10"}}};
+    const Slots::Taken slot = takeSlot();
     Reply reply = execute(message, broker_, *enumerations_);
     return {200, responseHeaders(prefix),
             writeResponse(message, std::move(reply), hostName_, broker_.classes(), budget_)};

@@ -6,6 +6,7 @@
 #include "broker/Broker.h"
 #include "serve/Enumerations.h"
 #include "serve/Http.h"
+#include "serve/Page.h"
 #include "serve/PropertyLists.h"
 #include "serve/Slots.h"
 #include "serve/Xml.h"
@@ -34,7 +35,8 @@ class CimBinding
 public:
     /// \param broker    outlives this object
     /// \param hostName  of this machine, for paths that name no host but have to
-    CimBinding(Broker& broker, std::string hostName, const RequestLimits& limits = {});
+    /// \param page      what is answered besides CIM; without a text, nothing
+    CimBinding(Broker& broker, std::string hostName, const RequestLimits& limits = {}, Page page = {});
 
     /// The refusal of a request whose body need not be waited for; nothing: read on.
     /// \param request  without its body, with a head that is not refused by itself
@@ -54,10 +56,13 @@ public:
 
 private:
     [[nodiscard]] HttpResponse respond(const HttpRequest& request) const;
+    /// \throws HttpError  none became free in time
+    [[nodiscard]] Slots::Taken takeSlot() const;
 
     Broker& broker_;
     std::string hostName_;
     RequestLimits limits_;
+    Page page_;
     PropertyLists lists_;
     std::shared_ptr<TextBudget> budget_;
     std::unique_ptr<Slots> slots_;

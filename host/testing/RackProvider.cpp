@@ -2,7 +2,7 @@
 /// A provider for the tests of the command line: a rack with two lamps and the association between them, a
 /// class that always fails and one that breaks the interface. A file named by CIMT_INVENTORY has other lamps,
 /// for tests that change them: lines of `lamp ID HEALTH ALARMSTATE`; `error TEXT`, which is then the answer;
-/// and `print TEXT`, which goes to standard error.
+/// `print TEXT`, which goes to standard error; `crash` and `hang`, which the process then does.
 
 #include "testing/ProviderParts.h"
 
@@ -16,6 +16,7 @@
 #include <vector>
 
 #include <strings.h>
+#include <unistd.h>
 
 using namespace sample;
 
@@ -58,6 +59,10 @@ Inventory read(std::istream& file)
             inventory.error = line.substr(kind.size() + 1);
         else if (kind == "print")
             std::cerr << line.substr(kind.size() + 1) << std::endl;
+        else if (kind == "crash")
+            std::abort();
+        else if (kind == "hang")
+            pause();
     }
     return inventory;
 }

@@ -21,7 +21,7 @@ OURS = [file for file in ROOT.rglob("*") if not {"build", "out", ".git"} & set(f
 PAGES = sorted(file for file in OURS if file.suffix == ".md" and file.name != "CHANGELOG.md")
 
 # Programs that a machine may lack.
-PROGRAMS = set("cimconfig cimhost cimmof cimserver export glimmark-register sfcbd sfcbrepos sfcbstage wbemcli".split())
+PROGRAMS = set("cimconfig cimhost cimmof cimserver export glimmark-register promtool sfcbd sfcbrepos sfcbstage wbemcli".split())
 
 # Commands, by their beginnings: the file that runs them, and what it has of them.
 TESTED = {
@@ -48,6 +48,9 @@ TESTED = {
     r"scripts/check-interface": ("scripts/release", "scripts/check-interface"),
     r"scripts/check-(brokers|format|lint|packages|shell)": (".ci/run", "scripts/check-"),
     r"scripts/fuzz": (".ci/run", "scripts/fuzz"),
+    r"promtool check rules": ("metrics/tests/metrics.bats", "check rules"),
+    r"cimhost metrics \| promtool check metrics": ("metrics/tests/metrics.bats", "check metrics"),
+    r"CIMHOST=\S+ python3 metrics/tests/fleet.py": ("metrics/CMakeLists.txt", "fleet.py"),
     r"scripts/install-hooks": ("tests/scripts/build.bats", "install-hooks"),
     r"scripts/package": ("scripts/check-packages", "scripts/package"),
     r"SFCB_PREFIX=\S+ PEGASUS_HOME=\S+ scripts/check-brokers": ("tests/brokers/check.py", "SFCB_PREFIX"),

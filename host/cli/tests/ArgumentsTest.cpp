@@ -121,6 +121,37 @@ TEST(Arguments, watchHasAClassAndAnInterval)
               "--format has no meaning for watch, which shows a table, or a line for each change");
 }
 
+TEST(Arguments, serveShowsMetricsIfAsked)
+{
+    const auto metricsOf = [](std::vector<std::string> arguments) {
+        return std::get<Serve>(parse(std::move(arguments)).command).metrics;
+    };
+    EXPECT_EQ(metricsOf({"serve"}), std::nullopt);
+    EXPECT_EQ(metricsOf({"serve", "--metrics"}), (cim::ObjectPath{"", "root/cimv2", "CIM_AlarmDevice", {}}));
+    EXPECT_EQ(metricsOf({"-n", "root/x", "serve", "--metrics"})->nameSpace, "root/x");
+}
+
+TEST(Arguments, metricsHaveAClassALimitAndAFile)
+{
+    const auto metricsOf = [](std::vector<std::string> arguments) {
+        return std::get<Measurement>(parseArguments(std::move(arguments))).metrics;
+    };
+    EXPECT_EQ(metricsOf({"metrics"}).target, (cim::ObjectPath{"", "root/cimv2", "CIM_AlarmDevice", {}}));
+    EXPECT_EQ(metricsOf({"metrics"}).limit, std::chrono::seconds(30));
+    EXPECT_EQ(metricsOf({"metrics"}).output, std::nullopt);
+    EXPECT_EQ(metricsOf({"metrics", "root/x:C"}).target, (cim::ObjectPath{"", "root/x", "C", {}}));
+    EXPECT_EQ(metricsOf({"metrics", "-n", "root/x"}).target.nameSpace, "root/x");
+    EXPECT_EQ(metricsOf({"metrics", "--limit", "1.5"}).limit, std::chrono::milliseconds(1500));
+    EXPECT_EQ(metricsOf({"metrics", "--output", "f"}).output, "f");
+    for (const char* const limit : {"0", "0.9", "3601", "nan", ""})
+        EXPECT_THAT(errorOf({"metrics", "--limit", limit}),
+                    StartsWith("--limit: expected 1 to 3600 seconds"));
+    EXPECT_THAT(errorOf({"metrics", "--output", ""}), StartsWith("--output: expected the name of a file"));
+    EXPECT_EQ(errorOf({"metrics", "C.K=1"}), "metrics takes a class; gi gets the one instance of a path");
+    EXPECT_EQ(errorOf({"metrics", "--format", "json"}),
+              "--format has no meaning for metrics, which writes the text format of Prometheus");
+}
+
 TEST(Arguments, theTargetHasANamespaceOfItsOwnOrTheCommonOne)
 {
     EXPECT_EQ(requestOf({"ein", "C"}).target, (cim::ObjectPath{"", "root/cimv2", "C", {}}));

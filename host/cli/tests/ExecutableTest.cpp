@@ -115,6 +115,14 @@ TEST_F(Executable, saysWhatToDoIfItsPortIsTaken)
     EXPECT_THAT(err(), HasSubstr("Address already in use; --port chooses another port\n"));
 }
 
+TEST_F(Executable, leavesAFileOfMetricsWhereTheNewOneDoesNotFit)
+{
+    const std::string file = directory.path("lamps.prom");
+    EXPECT_EQ(shell("echo old >" + file + "; ulimit -f 1; $CIMHOST metrics CIMT_Lamp --output " + file), 1);
+    EXPECT_EQ(err(), "cimhost: cannot write " + file + ": File too large\n");
+    EXPECT_EQ(readFile(file), "old\n");
+}
+
 TEST_F(Executable, saysIfItsOutputDoesNotFit)
 {
     EXPECT_EQ(shell("$CIMHOST ein CIMT_Lamp >/dev/full"), 1);

@@ -26,6 +26,28 @@ std::string headerOf(const HttpResponse& response, const std::string& name)
     return "";
 }
 
+TEST(BindingWithAPage, answersItsTargetAndCim)
+{
+    Broker broker{{}, {}};
+    const CimBinding binding(broker, "here", {}, {"/page", "text/x", [] { return std::string("a page"); }});
+    HttpRequest request;
+    request.method = "GET";
+    request.target = "/page";
+    EXPECT_FALSE(binding.refuse(request));
+    const HttpResponse response = binding.answer(request);
+    EXPECT_EQ(response.status, 200U);
+    EXPECT_EQ(headerOf(response, "Content-Type"), "text/x");
+    EXPECT_EQ(response.body.whole(), "a page");
+    for (const char* const other : {"/", "/page/", "/pag", "/cimom"}) {
+        request.target = other;
+        EXPECT_EQ(binding.answer(request).status, 405U) << other;
+    }
+    request.target = "/page";
+    EXPECT_EQ(CimBinding(broker, "here").answer(request).status, 405U) << "where there is no page";
+    request.method = "POST";
+    EXPECT_EQ(binding.answer(request).status, 400U) << "a question of CIM, which it is not";
+}
+
 class Binding : public testing::Test
 {
 protected:

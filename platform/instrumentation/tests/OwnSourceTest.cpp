@@ -12,6 +12,7 @@
 
 #include <filesystem>
 #include <fstream>
+#include <memory>
 #include <optional>
 #include <string>
 #include <vector>
@@ -40,8 +41,8 @@ void appendLamps(const std::string& place, Tavro::Sysfs& /*sysfs*/, std::vector<
     if (!list)
         Tavro::logError({"appendLamps", "OwnSourceTest.cpp", __LINE__}, place + ": expected a list of lamps");
     for (std::string name; std::getline(list, name);)
-        nodes.push_back(
-            {Tavro::NodeLexicon::DiagnosticIndicator, name, name, 1, std::nullopt, "lamp " + name});
+        nodes.push_back({Tavro::NodeLexicon::DiagnosticIndicator, name, name, 1, std::nullopt,
+                         std::make_unique<const std::string>("lamp " + name)});
 }
 
 } // namespace
