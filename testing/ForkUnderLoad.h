@@ -15,6 +15,14 @@
 
 namespace Testing {
 
+/// Whether a child that is forked among threads may allocate memory. The sanitizers' allocator is not prepared for a
+/// fork before version 18 of clang: a child may find its locks taken for good.
+#ifdef GLIMMARK_SANITIZED
+constexpr bool childrenMayAllocate = false;
+#else
+constexpr bool childrenMayAllocate = true;
+#endif
+
 /// Forks children while three threads do the work over and over; each child does it once. \return how many of
 /// them ended well. One that hangs is ended after half a minute.
 inline std::ptrdiff_t childrenThatReturn(int children, const std::function<void()>& work)
