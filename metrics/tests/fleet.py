@@ -270,10 +270,10 @@ def check_summaries(alerts):
 def main():
     parser = argparse.ArgumentParser()
     parser.add_argument("--servers", type=int, default=100)
-    parser.add_argument("--seed", type=int, default=random.SystemRandom().randrange(1 << 32))
+    parser.add_argument("--draw", type=int, default=random.SystemRandom().randrange(1 << 32))
     options = parser.parse_args()
-    print(f"seed {options.seed}")
-    chance = random.Random(options.seed)
+    print(f"draw {options.draw}")
+    chance = random.Random(options.draw)
 
     with tempfile.TemporaryDirectory(prefix="fleet-") as name:
         folder = pathlib.Path(name)
