@@ -171,7 +171,8 @@ billed() { python3 -c 'import json, sys; print(*(one["name"] for one in json.loa
         missing=$(dpkg-deb -f "$package" Depends | tr , '\n' | sed -nE 's/^ *([a-z0-9+.-]+).*/\1/p' | sed 's|-fmt9$||' | grep -v python3 |
             sort -u | comm -23 - <(billed "$package.spdx.json"))
         echo "$package: $missing"
-        [ -z "$missing" ] || [[ $package == */libtavro-dev_* ]]
+        # Headers and units load nothing themselves.
+        [ -z "$missing" ] || [[ $package == */libtavro-dev_* || $package == */glimmark-metrics_* ]]
     done
     for package in "$PACKAGES"/*.rpm; do
         name=$(rpm -qp --qf '%{NAME}' "$package")

@@ -20,11 +20,15 @@ constexpr int errorLevel = 6000;
 
 using Buffer = char[bufferSize];
 
-/// A text in a buffer, put together piece by piece; what is longer than the buffer is cut.
+/// A text in a buffer, put together piece by piece and ended at last; what is longer than the buffer is cut.
 class Line
 {
 public:
     explicit Line(Buffer& buffer) : next(buffer), last(buffer + bufferSize - 1) {}
+    ~Line() { *next = '\0'; }
+
+    Line(const Line&) = delete;
+    Line& operator=(const Line&) = delete;
 
     Line& operator<<(const char* text)
     {
@@ -34,7 +38,6 @@ public:
     Line& operator<<(std::string_view characters)
     {
         next = std::copy_n(characters.data(), std::min(characters.size(), room()), next);
-        *next = '\0';
         return *this;
     }
 

@@ -66,13 +66,13 @@ const std::wstring* findIn(const Messages& messages, const std::string& key)
 class Catalogues
 {
 public:
-    const std::wstring* text(const std::wstring& catalogue, const std::wstring& messageId)
+    const std::wstring& text(const std::wstring& catalogue, const std::wstring& messageId)
     {
         const char* const folder = directory();
         if (!last_ || last_->directory != folder || last_->catalogue != catalogue ||
             last_->messageId != messageId)
-            last_ = Answer{folder, catalogue, messageId, textOrId(folder, catalogue, messageId)};
-        return last_->text;
+            last_ = Answer{folder, catalogue, messageId, &textOrId(folder, catalogue, messageId)};
+        return *last_->text;
     }
 
 private:
@@ -81,7 +81,7 @@ private:
         std::string directory;
         std::wstring catalogue;
         std::wstring messageId;
-        const std::wstring* text;
+        const std::wstring* text; ///< of a catalogue or of the ids without text
     };
 
     /// The folder that TAVRO_CATALOGUES names now, or the one beside this library.
@@ -91,11 +91,11 @@ private:
         return named != nullptr && *named != '\0' ? named : installed_.c_str();
     }
 
-    const std::wstring* textOrId(const std::string& folder, const std::wstring& catalogue,
+    const std::wstring& textOrId(const std::string& folder, const std::wstring& catalogue,
                                  const std::wstring& messageId)
     {
         const std::wstring* const text = find(folder, catalogue, messageId);
-        return text != nullptr ? text : &*idsWithoutText_.insert(messageId).first;
+        return text != nullptr ? *text : *idsWithoutText_.insert(messageId).first;
     }
 
     /// Null: there is none.
@@ -181,7 +181,7 @@ std::wstring catalogueName(int library, const std::string& language)
     return name;
 }
 
-const std::wstring* findText(const std::wstring& catalogue, const std::wstring& messageId)
+const std::wstring& findText(const std::wstring& catalogue, const std::wstring& messageId)
 {
     const std::lock_guard<std::mutex> guard(access);
     if (catalogues == nullptr)

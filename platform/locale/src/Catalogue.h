@@ -17,7 +17,7 @@ std::wstring catalogueName(int library, const std::string& language);
 ///
 /// Each catalogue is read once, when it is first asked for. One that cannot be read or is broken
 /// gives one error line in the log and counts as empty.
-const std::wstring* findText(const std::wstring& catalogue, const std::wstring& messageId);
+const std::wstring& findText(const std::wstring& catalogue, const std::wstring& messageId);
 
 } // namespace Tavro
 

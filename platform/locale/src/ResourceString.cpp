@@ -9,14 +9,14 @@ std::wstring Locale::getResourceLibrary(int library, const std::string& language
     return catalogueName(library, language);
 }
 
-// The pointer is that to a text of the library, which is nobody's to delete: nothing is allocated for one that is asked
-// for over and over.
+// A caption is asked for with every object. So the one pointer that this class has is that to a text which the catalogues
+// keep, in the place of one to an implementation of its own: nothing is allocated, and nothing is deleted.
 struct ResourceString::Implementation
 {};
 
 ResourceString::ResourceString(const std::wstring& library, const std::wstring& messageId)
     : implementation_(
-          reinterpret_cast<Implementation*>(const_cast<std::wstring*>(findText(library, messageId))))
+          reinterpret_cast<Implementation*>(const_cast<std::wstring*>(&findText(library, messageId))))
 {}
 
 ResourceString::~ResourceString()

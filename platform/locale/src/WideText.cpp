@@ -1,5 +1,6 @@
 #include "Tavro/Locale.h"
 
+#include <algorithm>
 #include <array>
 #include <cstddef>
 
@@ -29,13 +30,10 @@ void appendUtf8(std::string& text, char32_t character)
 std::string make_string(const std::wstring& text)
 {
     // Most texts are ASCII from one end to the other, which is UTF-8 as it stands.
-    std::string utf8(text.size(), '\0');
-    std::size_t done = 0;
-    for (; done < text.size() && isAscii(text[done]); ++done)
-        utf8[done] = static_cast<char>(text[done]);
-    utf8.resize(done);
-    for (; done < text.size(); ++done)
-        appendUtf8(utf8, static_cast<char32_t>(text[done]));
+    auto rest = std::find_if_not(text.begin(), text.end(), isAscii);
+    std::string utf8(text.begin(), rest);
+    for (; rest != text.end(); ++rest)
+        appendUtf8(utf8, static_cast<char32_t>(*rest));
     return utf8;
 }
 

@@ -52,13 +52,13 @@ MVMessageBuffer& MVMessageBuffer::operator<<(const std::string& text)
 
 MVMessageBuffer& MVMessageBuffer::operator<<(const void* address)
 {
+    if (address == nullptr)
+        return *this << "0";
     constexpr int hexadecimal = 16;
     const auto number = reinterpret_cast<std::uintptr_t>(address);
-    char digits[2 * sizeof number];
-    const auto* const end = std::to_chars(std::begin(digits), std::end(digits), number, hexadecimal).ptr;
-    if (address != nullptr)
-        implementation_->append("0x");
-    implementation_->append({digits, static_cast<std::size_t>(end - digits)});
+    char text[2 + 2 * sizeof number] = {'0', 'x'};
+    const auto* const end = std::to_chars(std::begin(text) + 2, std::end(text), number, hexadecimal).ptr;
+    implementation_->append({std::begin(text), static_cast<std::size_t>(end - std::begin(text))});
     return *this;
 }
 
