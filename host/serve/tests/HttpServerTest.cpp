@@ -382,7 +382,7 @@ TEST_F(Server, saysWhetherAProviderIsStillAsked)
 {
     RequestLimits requests;
     requests.atOnce = 0; // all wait for others, as they do for a provider
-    requests.waiting = std::chrono::seconds(1);
+    requests.waiting = std::chrono::seconds(3);
     const CimBinding waiting(broker, "here", requests);
     ServerLimits limits;
     limits.farewell = std::chrono::seconds(0);
