@@ -223,15 +223,15 @@ TEST(ResponseWriter, answersMethodsOfClassesInTheirOwnElement)
 TEST(ResponseWriter, refusesWhatTheBudgetDoesNotHold)
 {
     Reply reply;
-    const cim::Instance instance{{"", "", "CIM_A", {}}, {{"P", cim::textValue(std::string(50000, 'x'))}}};
-    reply.answer.instances = {instance, instance, instance, instance};
+    const cim::Instance large{{"", "", "CIM_A", {}}, {{"P", cim::textValue(std::string(50000, 'x'))}}};
+    reply.answer.instances = {large, large, large, large};
     const RequestMessage request = requestFor(Operation::enumerateInstances);
     const auto budget = std::make_shared<TextBudget>(150000);
     EXPECT_THAT(writeResponse(request, reply, "here", {}, budget).whole(),
                 HasSubstr("<ERROR CODE=\"27\" DESCRIPTION=\"the answers that are being given take all"));
     EXPECT_TRUE(budget->take(150000)) << "nothing is kept of it";
     budget->giveBack(150000);
-    reply.answer.instances = {instance, instance};
+    reply.answer.instances = {large, large};
     EXPECT_THAT(writeResponse(request, reply, "here", {}, budget).whole(), HasSubstr("</IRETURNVALUE>"));
 }
 
