@@ -417,7 +417,7 @@ Inventory readClosely(const std::string& json)
 
 Inventory readInventory(std::string json)
 {
-    json.append(readAhead, ' ');
+    json.append(readAhead, '\0');
     if (std::optional<Inventory> inventory = readQuickly(json))
         return *std::move(inventory);
     json.resize(json.size() - readAhead);

@@ -121,19 +121,19 @@ private:
     std::size_t place_ = 0;
 };
 
-/// How much the parser reads at a time: a text ends with so many blanks.
+/// How much the parser reads at a time, behind the null character that ends a text too: it has so many of them.
 constexpr std::size_t readAhead = 16;
 
 /// Parses a text. \return false where it has a fault or so many bytes between two values, names, braces or brackets
 /// that it is to be looked at closely; what the handler has been told up to there is of no use then
-/// \param json  with `readAhead` blanks at its end \throw what the handler throws; std::bad_alloc
+/// \param json  with `readAhead` null characters at its end \throw what the handler throws; std::bad_alloc
 template <class Handler>
 bool parseQuickly(const std::string& json, Handler& handler, std::size_t longestGap)
 {
     rapidjson::StringStream text(json.c_str());
     QuickHandler<Handler> quick(handler, text, longestGap);
     rapidjson::GenericReader<rapidjson::UTF8<>, rapidjson::UTF8<>, ParserMemory> reader;
-    return !reader.Parse(text, quick).IsError() && text.Tell() == json.size() && quick.advances();
+    return !reader.Parse(text, quick).IsError() && text.Tell() + readAhead == json.size() && quick.advances();
 }
 
 } // namespace Tavro
