@@ -96,7 +96,7 @@ public:
     }
     bool Key(const char* text, rapidjson::SizeType length, bool /*copy*/)
     {
-        return advances() && handler_.key({text, length}); // what is no text is no field's name either
+        return isText({text, length}) && advances() && handler_.key({text, length});
     }
     bool StartObject() { return advances() && handler_.start_object(0); }
     bool EndObject(rapidjson::SizeType /*count*/) { return advances() && handler_.end_object(); }

@@ -192,7 +192,9 @@ INSTANTIATE_TEST_SUITE_P(
 
 TEST_F(InventoryFaults, theReportQuotesNoBytesThatAreNoUtf8)
 {
-    EXPECT_EQ(faultIn("{\"nodes\":[{\"path\":\"\xFF").find('\xFF'), std::string::npos);
+    for (const char* const content : {"{\"nodes\":[{\"path\":\"\xFF", "{\"\x87\":[]}",
+                                      "{\"nodes\":[{\"\xFF\":1}]}", "{\"nodes\":[{\"path\":\"\xFF\"}]}"})
+        EXPECT_EQ(faultIn(content).find_first_of("\x87\xFF"), std::string::npos) << content;
 }
 
 TEST_F(InventoryFaults, theReportStaysShortWhateverTheFileHolds)
