@@ -41,7 +41,7 @@ std::string collect(const Metrics& command, const StartBroker& start, std::ostre
 
 } // namespace
 
-std::string metricsOf(const cim::ObjectPath& target, Broker& broker)
+std::string expositionOf(const cim::ObjectPath& target, Broker& broker)
 {
     const Began began = std::chrono::steady_clock::now();
     try {

@@ -17,7 +17,7 @@ using StartBroker = std::function<std::unique_ptr<Broker>()>;
 
 /// The whole picture of a broker that serves others too: asked in this process, on this thread. What the provider
 /// fails at is a picture without a device.
-std::string metricsOf(const cim::ObjectPath& target, Broker& broker);
+std::string expositionOf(const cim::ObjectPath& target, Broker& broker);
 
 /// Asks in a process of its own, and writes what it found to `out` or the command's file. Whatever fails on the way
 /// there - starting the broker, a provider that answers an error, crashes or takes too long - is a line on `err` and

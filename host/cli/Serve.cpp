@@ -30,7 +30,7 @@ serve::Page pageOf(const Serve& command, Broker& broker)
 {
     if (!command.metrics)
         return {};
-    return {"/metrics", expositionType, [&] { return metricsOf(*command.metrics, broker); }};
+    return {"/metrics", expositionType, [&] { return expositionOf(*command.metrics, broker); }};
 }
 
 } // namespace

@@ -404,7 +404,7 @@ TEST_F(MetricsCommand, neverShowsAFailureAsHealth)
 TEST(MetricsOfABroker, neverShowAFailureAsHealth)
 {
     Broker broker({}, {});
-    const std::string text = metricsOf({"", "root/cimv2", "CIM_AlarmDevice", {}}, broker);
+    const std::string text = expositionOf({"", "root/cimv2", "CIM_AlarmDevice", {}}, broker);
     EXPECT_THAT(text, StartsWith("# HELP cim_alarm_device_collection_success"));
     EXPECT_THAT(text, HasSubstr("\ncim_alarm_device_collection_success 0\n"));
 }
