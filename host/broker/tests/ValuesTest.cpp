@@ -2,6 +2,7 @@
 
 #include "BrokerFixture.h"
 
+#include <cstring>
 #include <functional>
 #include <limits>
 
@@ -30,6 +31,7 @@ protected:
     void expectKept(CMPIType type, Number CMPIValue::*member, Number number, const cim::Value& model)
     {
         CMPIValue value{};
+        std::memset(&value, 0xA5, sizeof value); // beyond the type's width is what happened to be there
         value.*member = number;
         EXPECT_EQ(set(&value, type), CMPI_RC_OK);
         const CMPIData data = get();
@@ -59,6 +61,23 @@ TEST_F(ValuesTest, KeepNumbersOfEveryType)
                cim::signedValue(std::numeric_limits<std::int64_t>::min(), CMPI_sint64));
     expectKept(CMPI_real32, &CMPIValue::real32, 1.5F, cim::realValue(1.5, CMPI_real32));
     expectKept(CMPI_real64, &CMPIValue::real64, -1e300, cim::realValue(-1e300, CMPI_real64));
+}
+
+TEST_F(ValuesTest, KeepTheOrderOfANumbersBytes)
+{
+    expectKept(CMPI_char16, &CMPIValue::char16, CMPIChar16{0x98A8}, cim::unsignedValue(0x98A8, CMPI_char16));
+    expectKept(CMPI_uint8, &CMPIValue::uint8, CMPIUint8{7}, cim::unsignedValue(7, CMPI_uint8));
+    expectKept(CMPI_uint16, &CMPIValue::uint16, CMPIUint16{0x0102}, cim::unsignedValue(0x0102, CMPI_uint16));
+    expectKept(CMPI_uint32, &CMPIValue::uint32, CMPIUint32{0x01020304},
+               cim::unsignedValue(0x01020304, CMPI_uint32));
+    expectKept(CMPI_uint64, &CMPIValue::uint64, CMPIUint64{0x0102030405060708},
+               cim::unsignedValue(0x0102030405060708, CMPI_uint64));
+    expectKept(CMPI_sint8, &CMPIValue::sint8, CMPISint8{-7}, cim::signedValue(-7, CMPI_sint8));
+    expectKept(CMPI_sint16, &CMPIValue::sint16, CMPISint16{-0x0102}, cim::signedValue(-0x0102, CMPI_sint16));
+    expectKept(CMPI_sint32, &CMPIValue::sint32, CMPISint32{-0x01020304},
+               cim::signedValue(-0x01020304, CMPI_sint32));
+    expectKept(CMPI_sint64, &CMPIValue::sint64, CMPISint64{-0x0102030405060708},
+               cim::signedValue(-0x0102030405060708, CMPI_sint64));
 }
 
 TEST_F(ValuesTest, ReadCharactersBackAsStrings)

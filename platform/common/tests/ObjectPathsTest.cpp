@@ -230,6 +230,21 @@ TEST(ObjectPathValues, eachTypeIsReadFromItsOwnMember)
     }
 }
 
+TEST(ObjectPathValues, nothingButItsOwnMemberTellsAFlagACharacterOrAReal)
+{
+    const auto noisy = [](auto member, auto number) {
+        CMPIValue value = valueOf(&CMPIValue::uint64, std::numeric_limits<CMPIUint64>::max());
+        value.*member = number;
+        return value;
+    };
+    EXPECT_TRUE(areValuesEqual({"noisy", CMPI_boolean, noisy(&CMPIValue::boolean, CMPIBoolean{0})},
+                               {"false", CMPI_boolean, valueOf(&CMPIValue::boolean, 0)}));
+    EXPECT_TRUE(areValuesEqual({"noisy", CMPI_char16, noisy(&CMPIValue::char16, CMPIChar16{0x98A8})},
+                               {"char16", CMPI_char16, valueOf(&CMPIValue::char16, 0x98A8)}));
+    EXPECT_TRUE(areValuesEqual({"noisy", CMPI_real32, noisy(&CMPIValue::real32, 0.5F)},
+                               {"real64", CMPI_real64, valueOf(&CMPIValue::real64, 0.5)}));
+}
+
 TEST(ObjectPathValues, booleansAreComparedAsTrueOrFalse)
 {
     const Value no{"false", CMPI_boolean, valueOf(&CMPIValue::boolean, 0)};

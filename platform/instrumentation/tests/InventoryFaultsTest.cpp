@@ -197,6 +197,18 @@ TEST_F(InventoryFaults, theReportQuotesNoBytesThatAreNoUtf8)
         EXPECT_EQ(faultIn(content).find_first_of("\x87\xFF"), std::string::npos) << content;
 }
 
+TEST_F(InventoryFaults, aByteThatIsNoUtf8IsFoundWhereverItIsInALongText)
+{
+    // Texts are read eight bytes at a time, and what is left over one by one.
+    for (std::size_t place = 0; place < 20; ++place) {
+        std::string text(20, 'x');
+        text[place] = '\xFF';
+        EXPECT_THAT(
+            faultIn(R"({"nodes":[{"kind":36,"description":"D","path":")" + text + R"(","status":1}]})"),
+            StartsWith("line 1, column " + std::to_string(48 + place) + ": expected JSON: "));
+    }
+}
+
 TEST_F(InventoryFaults, theReportStaysShortWhateverTheFileHolds)
 {
     const std::string lots(100000, '9');
