@@ -1,6 +1,7 @@
 # Installs the build into an empty prefix and asks the provider from there, with nothing set in the environment. Run as
 #   cmake -DBUILD_DIR=DIR -DPREFIX=DIR -DINVENTORY=FILE -DPROVIDERDIR=lib/... -DLIBDIR=lib -DREADELF=... -DCOMPILER=...
-#         -DGENERATOR=... -DSANITIZED=BOOL -DWORK_DIR=DIR -P THIS
+#         -DSYSROOT=DIR -DGENERATOR=... -DSANITIZED=BOOL -DWORK_DIR=DIR -P THIS
+# SYSROOT: where the compiler for another processor finds libraries; else empty
 
 cmake_minimum_required(VERSION 3.20)
 
@@ -65,7 +66,7 @@ file(RENAME ${PREFIX} ${moved})
 set(maker ${WORK_DIR}/maker)
 execute_process(
     COMMAND ${CMAKE_COMMAND} -G ${GENERATOR} -S ${CMAKE_CURRENT_LIST_DIR}/development -B ${maker}
-            -DCMAKE_PREFIX_PATH=${moved} -DCMAKE_CXX_COMPILER=${COMPILER}
+            -DCMAKE_PREFIX_PATH=${moved} -DCMAKE_CXX_COMPILER=${COMPILER} -DCMAKE_SYSROOT=${SYSROOT}
             -DSANITIZED=${SANITIZED}
     OUTPUT_QUIET COMMAND_ERROR_IS_FATAL ANY)
 execute_process(COMMAND ${CMAKE_COMMAND} --build ${maker} OUTPUT_QUIET COMMAND_ERROR_IS_FATAL ANY)
