@@ -33,6 +33,13 @@ void Deadlines::end(int socket)
     deadlines_.erase(socket);
 }
 
+void Deadlines::endAll()
+{
+    const std::lock_guard<std::mutex> lock(mutex_);
+    for (const auto& [socket, due] : deadlines_)
+        shutdown(socket, SHUT_RDWR);
+}
+
 void Deadlines::watch()
 {
     std::unique_lock<std::mutex> lock(mutex_);

@@ -26,6 +26,8 @@ public:
     void begin(int socket);
     /// The connection may take its time, or is about to be closed.
     void end(int socket);
+    /// All steps that have begun are due: their sockets are shut down.
+    void endAll();
 
 private:
     using Clock = std::chrono::steady_clock;

@@ -88,6 +88,7 @@ public:
     ~Implementation()
     {
         finish();
+        waitForConnections();
         MHD_stop_daemon(daemon_);
     }
 
@@ -156,11 +157,30 @@ private:
     static void onConnection(void* self, MHD_Connection* connection, void** /*state*/,
                              MHD_ConnectionNotificationCode what)
     {
-        Deadlines& deadlines = static_cast<Implementation*>(self)->deadlines_;
+        auto& server = *static_cast<Implementation*>(self);
+        Deadlines& deadlines = server.deadlines_;
         if (what == MHD_CONNECTION_NOTIFY_STARTED)
             deadlines.begin(socketOf(connection));
         else
             deadlines.end(socketOf(connection));
+        server.countConnection(what);
+    }
+
+    void countConnection(MHD_ConnectionNotificationCode what)
+    {
+        const std::lock_guard<std::mutex> lock(mutex_);
+        connections_ += what == MHD_CONNECTION_NOTIFY_STARTED ? 1 : -1;
+        if (connections_ == 0)
+            allEnded_.notify_all();
+    }
+
+    /// The library follows a null pointer when it is stopped while it refuses a request line that is too long.
+    void waitForConnections()
+    {
+        constexpr std::chrono::seconds longest(1);
+        deadlines_.endAll();
+        std::unique_lock<std::mutex> lock(mutex_);
+        allEnded_.wait_for(lock, longest, [&] { return connections_ == 0; });
     }
 
     Exchange* begin(void** state)
@@ -238,6 +258,7 @@ private:
     std::atomic<bool> isEnding_ = false;
     std::atomic<int> asked_ = 0; ///< requests that the binding is asked for
     int requests_ = 0;           ///< those that are being read, answered or sent
+    int connections_ = 0;
     Deadlines deadlines_;
     MHD_Daemon* daemon_;
 };

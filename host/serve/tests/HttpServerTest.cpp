@@ -6,6 +6,7 @@
 #include "serve/tests/Messages.h"
 
 #include <future>
+#include <list>
 #include <memory>
 #include <string>
 #include <system_error>
@@ -376,6 +377,19 @@ TEST_F(Server, answersWhatIsThereWhenItEnds)
     server.reset();
     EXPECT_TRUE(idle.isClosed());
     EXPECT_TRUE(busy.isClosed());
+}
+
+TEST_F(Server, endsWhileItRefusesLinesThatAreTooLong)
+{
+    const std::string request = "POST /" + std::string(100000, 'a');
+    for (int i = 0; i < 100; ++i) {
+        start();
+        std::list<Connection> connections;
+        for (int client = 0; client < 8; ++client)
+            connections.emplace_back(server->endpoint()).send(request);
+        connections.front().receive(); // the others are being refused
+        server.reset();
+    }
 }
 
 TEST_F(Server, saysWhetherAProviderIsStillAsked)
