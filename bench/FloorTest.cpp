@@ -128,7 +128,7 @@ std::ptrdiff_t heldBy(Bed& bed, const Task& task, std::size_t indicators)
     return use.peak;
 }
 
-TEST_P(FloorTest, HoldsAtMostOneKibibyteForAnIndicator)
+TEST_P(FloorTest, HoldsAtMostSevenHundredBytesForAnIndicator)
 {
     // The list of records has just doubled its place: it is never less filled.
     constexpr std::size_t count = 129;
@@ -136,7 +136,7 @@ TEST_P(FloorTest, HoldsAtMostOneKibibyteForAnIndicator)
     heldBy(bed, GetParam(), 1); // what is allocated once
     const std::ptrdiff_t each = heldBy(bed, GetParam(), count) / static_cast<std::ptrdiff_t>(count);
     RecordProperty("bytes_for_an_indicator", std::to_string(each));
-    EXPECT_LE(each, 1024);
+    EXPECT_LE(each, 700);
 }
 
 INSTANTIATE_TEST_SUITE_P(AllOperations, FloorTest, ::testing::ValuesIn(allTasks()),

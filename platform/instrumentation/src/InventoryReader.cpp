@@ -415,12 +415,10 @@ Inventory readClosely(const std::string& json)
 
 } // namespace
 
-Inventory readInventory(std::string json)
+Inventory readInventory(const std::string& json)
 {
-    json.append(readAhead, '\0');
     if (std::optional<Inventory> inventory = readQuickly(json))
         return *std::move(inventory);
-    json.resize(json.size() - readAhead);
     return readClosely(json);
 }
 

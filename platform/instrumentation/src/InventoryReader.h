@@ -28,7 +28,7 @@ struct Inventory
 };
 
 /// \throw InventoryError at the first fault
-Inventory readInventory(std::string json);
+Inventory readInventory(const std::string& json);
 
 } // namespace Tavro
 

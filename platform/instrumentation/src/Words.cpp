@@ -15,8 +15,8 @@ struct SpecialWord
     std::string_view shown;
 };
 
-/// Words that a capital letter alone does not make readable. The names of functions are those of the kernel's
-/// LED drivers; pfa, ica, ifa and idt are states of a drive in a PCI Express enclosure.
+/// Words that a capital letter alone does not make readable, in the order of the alphabet. The names of functions are those
+/// of the kernel's LED drivers; pfa, ica, ifa and idt are states of a drive in a PCI Express enclosure.
 constexpr std::array specialWords = {
     SpecialWord{"bmc", "BMC"},
     SpecialWord{"capslock", "Caps Lock"},
@@ -59,6 +59,15 @@ constexpr std::array specialWords = {
     SpecialWord{"wps", "WPS"},
 };
 
+constexpr bool areInOrder()
+{
+    for (std::size_t i = 1; i < specialWords.size(); ++i)
+        if (specialWords[i - 1].word >= specialWords[i].word)
+            return false;
+    return true;
+}
+static_assert(areInOrder());
+
 // The characters of ASCII, whatever the process's locale.
 
 bool isSmall(char c)
@@ -100,9 +109,11 @@ std::string shown(std::string_view word)
 {
     std::string text(word);
     std::transform(text.begin(), text.end(), text.begin(), small);
-    for (const SpecialWord& special : specialWords)
-        if (special.word == text)
-            return std::string(special.shown);
+    const auto* const special = std::lower_bound(
+        specialWords.begin(), specialWords.end(), text,
+        [](const SpecialWord& known, const std::string& sought) { return known.word < sought; });
+    if (special != specialWords.end() && special->word == text)
+        return std::string(special->shown);
     text = word;
     text.front() = capital(text.front());
     return text;
@@ -138,11 +149,8 @@ std::size_t lengthOfFirstWord(std::string_view name)
     return length;
 }
 
-/// Of ASCII, and shown as it stands.
-bool isPlain(char c)
-{
-    return c >= ' ' && c <= '~' && c != '\\';
-}
+/// Of ASCII, and shown as it stands. Not a function: a call for each character takes longer than what it does.
+constexpr auto isPlain = [](char c) { return c >= ' ' && c <= '~' && c != '\\'; };
 
 bool isVisible(utf8proc_int32_t character)
 {

@@ -235,9 +235,19 @@ TEST_F(Cursor, takesAReferenceToASchema)
 
 TEST_F(Cursor, takesAByteOrderMarkAndEscapes)
 {
-    use("\xEF\xBB\xBF"
-        R"({"nodes":[{"kind":36,"description":"\u00fc \ud83d\udea8 \" \\ \n","path":"","status":1}]})");
-    EXPECT_THAT(descriptionsOf(36), ElementsAre("\xC3\xBC \xF0\x9F\x9A\xA8 \" \\ \n"));
+    for (const char* const mark : {"", "\xEF\xBB\xBF"}) {
+        use(mark + std::string(R"({"nodes":[{"k\u0069nd":36,"status":1,"path":"",)") +
+            R"("description":"\u00fc \ud83d\udea8 \" \\ \n"}]})");
+        EXPECT_THAT(descriptionsOf(36), ElementsAre("\xC3\xBC \xF0\x9F\x9A\xA8 \" \\ \n")) << mark;
+    }
+}
+
+TEST_F(Cursor, takesEscapesInLongTexts)
+{
+    const std::string piece(3000, 'x');
+    use(R"({"nodes":[{"kind":36,"status":1,"path":"a\/b","description":")" + piece + R"(\u0041)" + piece +
+        R"(\")" + piece + R"("},{"kind":36,"status":1,"path":"","description":"B"}]})");
+    EXPECT_THAT(descriptionsOf(36), ElementsAre(piece + 'A' + piece + '"' + piece, "B"));
 }
 
 TEST_F(Cursor, knowsTheKindsByTheirNames)

@@ -190,6 +190,16 @@ INSTANTIATE_TEST_SUITE_P(
               "line 2, column 1: expected JSON: a null character after it"},
         Fault{"\xFE\xFF", "line 1, column 1: expected JSON: "}));
 
+TEST_F(InventoryFaults, aControlCharacterIsRefusedWhereverItStands)
+{
+    for (char control = 1; control < ' '; ++control)
+        for (const std::size_t before : {0U, 7U, 16U, 33U, 64U})
+            EXPECT_THAT(faultIn(R"({"nodes":[{"path":")" + std::string(before, 'x') + control +
+                                std::string(20, 'y') + R"(","kind":36,"status":0,"description":"z"}]})"),
+                        StartsWith("line "))
+                << static_cast<int>(control) << " behind " << before;
+}
+
 TEST_F(InventoryFaults, theReportQuotesNoBytesThatAreNoUtf8)
 {
     for (const char* const content : {"{\"nodes\":[{\"path\":\"\xFF", "{\"\x87\":[]}",

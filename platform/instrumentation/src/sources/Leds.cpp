@@ -78,7 +78,9 @@ std::optional<Node> readLed(const SysfsDirectory& leds, const std::string& place
 void appendLeds(const std::string& place, Sysfs& sysfs, std::vector<Node>& nodes)
 {
     const SysfsDirectory leds = sysfs.open(place);
-    for (const std::string& name : leds.names())
+    const std::vector<std::string> names = leds.names();
+    nodes.reserve(nodes.size() + names.size());
+    for (const std::string& name : names)
         if (std::optional<Node> node = readLed(leds, place, name))
             nodes.push_back(*std::move(node));
 }
