@@ -21,6 +21,12 @@ set(GLIMMARK_SANITIZE
     ""
     CACHE STRING "Sanitizers to build everything with, as in -fsanitize=, or nothing")
 
+# Libraries in C++ that the distribution has compiled are of its compiler's standard library, and are not used then.
+option(GLIMMARK_LIBCXX "Build everything with clang's own standard library, libc++" OFF)
+if(GLIMMARK_LIBCXX)
+    string(APPEND CMAKE_CXX_FLAGS " -stdlib=libc++")
+endif()
+
 add_library(glimmark_settings INTERFACE)
 add_library(glimmark::settings ALIAS glimmark_settings)
 
