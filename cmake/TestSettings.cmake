@@ -5,10 +5,8 @@ if(GLIMMARK_LIBCXX)
     # The package googletest has the sources.
     set(INSTALL_GTEST OFF)
     add_subdirectory(/usr/src/googletest ${CMAKE_CURRENT_BINARY_DIR}/googletest EXCLUDE_FROM_ALL)
-    message(
-        WARNING
-            "Left out with libc++: the tests of properties (RapidCheck is compiled with the other standard library); floor-tests, "
-            "*.SharedObject and ProviderLibrary.IsBuiltAsBrokersNeedIt (the names that are exported are those of the other one)")
+    message(WARNING "Left out with libc++: the tests of properties, as RapidCheck is compiled with the other standard library; "
+                    "floor-tests, *.SharedObject and ProviderLibrary.IsBuiltAsBrokersNeedIt, as they know that one's names")
 else()
     find_package(GTest 1.12 REQUIRED)
     find_package(rapidcheck REQUIRED)
