@@ -211,6 +211,12 @@ binaries() { find "$1" -type f \( -name '*.so*' -o -path '*/bin/*' \); }
     [ "$(grep -rlF "$SOURCE" "$TREE" | wc -l)" -eq 0 ]
 }
 
+@test "all files of the RPM packages bear the time of the sources" {
+    for package in "$PACKAGES"/*.rpm; do
+        [ "$(rpm -qp --qf '[%{FILEMTIMES}\n]' "$package" | sort -u)" = "$(rpm -qp --qf '%{BUILDTIME}' "$package")" ]
+    done
+}
+
 @test "packages that are built twice are the same" {
     diff <(cd "$PACKAGES" && ls) <(cd "$AGAIN" && ls)
     for package in "$PACKAGES"/*; do
