@@ -37,7 +37,8 @@ double secondsOf(Run run)
 }
 
 /// Runs a pair in each iteration of the benchmark and sets its counters. The two go first in turn.
-/// \param first, second  each runs once and returns seconds
+/// \param first   runs once and returns seconds
+/// \param second  does so too
 template <class First, class Second>
 void comparePairs(benchmark::State& state, First first, Second second)
 {

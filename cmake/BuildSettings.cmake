@@ -7,6 +7,9 @@ endif()
 set(CMAKE_CXX_STANDARD 17)
 set(CMAKE_CXX_STANDARD_REQUIRED ON)
 set(CMAKE_CXX_EXTENSIONS OFF)
+set(CMAKE_C_STANDARD 11)
+set(CMAKE_C_STANDARD_REQUIRED ON)
+set(CMAKE_C_EXTENSIONS OFF)
 set(CMAKE_POSITION_INDEPENDENT_CODE ON)
 set(CMAKE_EXPORT_COMPILE_COMMANDS ON)
 
@@ -18,6 +21,12 @@ set(GLIMMARK_SANITIZE
     ""
     CACHE STRING "Sanitizers to build everything with, as in -fsanitize=, or nothing")
 
+# Libraries in C++ that the distribution has compiled are of its compiler's standard library, and are not used then.
+option(GLIMMARK_LIBCXX "Build everything with clang's own standard library, libc++" OFF)
+if(GLIMMARK_LIBCXX)
+    string(APPEND CMAKE_CXX_FLAGS " -stdlib=libc++")
+endif()
+
 add_library(glimmark_settings INTERFACE)
 add_library(glimmark::settings ALIAS glimmark_settings)
 
@@ -25,14 +34,19 @@ target_compile_options(
     glimmark_settings
     INTERFACE -Wall
               -Wextra
-              -Wpedantic
+              -pedantic-errors
               -Wconversion
               -Wsign-conversion
               -Wshadow
               -Wnon-virtual-dtor
               -Woverloaded-virtual
               -Wold-style-cast
+              -Wcast-align
               -Wcast-qual
+              -Wdate-time
+              -Wdouble-promotion
+              -Wextra-semi
+              -Wsuggest-override
               -Wformat=2
               -Wimplicit-fallthrough
               -Wundef
@@ -41,7 +55,12 @@ target_compile_options(
               $<$<CXX_COMPILER_ID:GNU>:-Wduplicated-cond
               -Wduplicated-branches
               -Wlogical-op
-              -Wuseless-cast>)
+              -Wuseless-cast>
+              $<$<CXX_COMPILER_ID:Clang>:-Wcomma
+              -Wconditional-uninitialized
+              -Wdocumentation
+              -Wloop-analysis
+              -Wunreachable-code>)
 
 # Sources that are compiled together look like headers to this check, which is about headers.
 if(CMAKE_UNITY_BUILD)

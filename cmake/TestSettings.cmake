@@ -1,7 +1,16 @@
 # What every program of tests is built with: link against glimmark::test-settings. Its tests become ctest's by
 # glimmark_add_tests_of().
 
-find_package(GTest 1.12 REQUIRED)
+if(GLIMMARK_LIBCXX)
+    # The package googletest has the sources.
+    set(INSTALL_GTEST OFF)
+    add_subdirectory(/usr/src/googletest ${CMAKE_CURRENT_BINARY_DIR}/googletest EXCLUDE_FROM_ALL)
+    message(WARNING "Left out with libc++: the tests of properties, as RapidCheck is compiled with the other standard library; "
+                    "floor-tests, *.SharedObject and ProviderLibrary.IsBuiltAsBrokersNeedIt, as they know that one's names")
+else()
+    find_package(GTest 1.12 REQUIRED)
+    find_package(rapidcheck REQUIRED)
+endif()
 
 add_library(glimmark_test_settings INTERFACE)
 add_library(glimmark::test-settings ALIAS glimmark_test_settings)

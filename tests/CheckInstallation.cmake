@@ -1,6 +1,6 @@
 # Installs the build into an empty prefix and asks the provider from there, with nothing set in the environment. Run as
 #   cmake -DBUILD_DIR=DIR -DPREFIX=DIR -DINVENTORY=FILE -DPROVIDERDIR=lib/... -DLIBDIR=lib -DREADELF=... -DCOMPILER=...
-#         -DSYSROOT=DIR -DGENERATOR=... -DSANITIZED=BOOL -DWORK_DIR=DIR -P THIS
+#         -DFLAGS=... -DSYSROOT=DIR -DGENERATOR=... -DSANITIZED=BOOL -DWORK_DIR=DIR -P THIS
 # SYSROOT: where the compiler for another processor finds libraries; else empty
 
 cmake_minimum_required(VERSION 3.20)
@@ -66,8 +66,8 @@ file(RENAME ${PREFIX} ${moved})
 set(maker ${WORK_DIR}/maker)
 execute_process(
     COMMAND ${CMAKE_COMMAND} -G ${GENERATOR} -S ${CMAKE_CURRENT_LIST_DIR}/development -B ${maker}
-            -DCMAKE_PREFIX_PATH=${moved} -DCMAKE_CXX_COMPILER=${COMPILER} -DCMAKE_SYSROOT=${SYSROOT}
-            -DSANITIZED=${SANITIZED}
+            -DCMAKE_PREFIX_PATH=${moved} -DCMAKE_CXX_COMPILER=${COMPILER} -DCMAKE_CXX_FLAGS=${FLAGS}
+            -DCMAKE_SYSROOT=${SYSROOT} -DSANITIZED=${SANITIZED}
     OUTPUT_QUIET COMMAND_ERROR_IS_FATAL ANY)
 execute_process(COMMAND ${CMAKE_COMMAND} --build ${maker} OUTPUT_QUIET COMMAND_ERROR_IS_FATAL ANY)
 
@@ -94,7 +94,7 @@ get_filename_component(package_directory ${package} DIRECTORY)
 execute_process(
     COMMAND ${CMAKE_COMMAND} -E env PKG_CONFIG_PATH=${package_directory} pkg-config --cflags tavro-support
     OUTPUT_VARIABLE flags OUTPUT_STRIP_TRAILING_WHITESPACE COMMAND_ERROR_IS_FATAL ANY)
-separate_arguments(flags UNIX_COMMAND "${flags}")
+separate_arguments(flags UNIX_COMMAND "${FLAGS} ${flags}")
 file(REMOVE_RECURSE ${maker})
 file(MAKE_DIRECTORY ${maker})
 execute_process(

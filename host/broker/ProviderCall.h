@@ -25,8 +25,10 @@ auto callProvider(Core& core, const std::string& operation, const Body& body, co
     };
     try {
         return body();
+#ifdef __GLIBCXX__ // elsewhere the end of a thread is nothing to catch
     } catch (const abi::__forced_unwind&) {
         throw; // the thread ends
+#endif
     } catch (const std::exception& error) {
         return report(std::string("an exception: ") + error.what());
     } catch (...) {

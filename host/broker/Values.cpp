@@ -134,7 +134,7 @@ Scalar takeScalar(Call& call, const CMPIValue* value, CMPIType type, const char*
     case CMPI_char16:
         return std::uint64_t{value->char16};
     case CMPI_real32:
-        return double{value->real32};
+        return static_cast<double>(value->real32);
     case CMPI_real64:
         return value->real64;
     case CMPI_uint8:

@@ -2,9 +2,29 @@
 
 #include "cim/Values.h"
 
+#include <cerrno>
 #include <charconv>
+#include <clocale>
+#include <cmath>
+#include <cstdlib>
+#include <string>
 
 namespace cimhost::cim {
+
+namespace {
+
+/// What std::from_chars() does, which not every standard library has for real numbers: in any locale.
+std::optional<double> readReal(const std::string& text)
+{
+    static const locale_t plain = newlocale(LC_ALL_MASK, "C", nullptr);
+    char* end = nullptr;
+    errno = 0;
+    const double number = strtod_l(text.c_str(), &end, plain);
+    const bool fits = errno != ERANGE || std::fpclassify(number) == FP_SUBNORMAL;
+    return fits && end == text.c_str() + text.size() ? std::optional(number) : std::nullopt;
+}
+
+} // namespace
 
 std::optional<Value> parseNumber(std::string_view text)
 {
@@ -21,9 +41,10 @@ std::optional<Value> parseNumber(std::string_view text)
     };
     std::uint64_t natural = 0;
     std::int64_t integer = 0;
-    double real = 0;
-    if (text.find_first_of(".eE") != std::string_view::npos)
-        return isRead(real) ? std::optional(realValue(real)) : std::nullopt;
+    if (text.find_first_of(".eE") != std::string_view::npos) {
+        const std::optional<double> real = readReal(std::string(first, last));
+        return real ? std::optional(realValue(*real)) : std::nullopt;
+    }
     if (isRead(natural))
         return unsignedValue(natural);
     if (isRead(integer))

@@ -8,6 +8,7 @@
 #include "serve/ResponseWriter.h"
 
 #include <algorithm>
+#include <array>
 #include <charconv>
 #include <exception>
 #include <utility>

@@ -38,7 +38,8 @@ const std::vector<Element>& childrenInOrder(const Element& element, Names names)
 /// The text of an element that has no children.
 const std::string& textOf(const Element& element);
 
-/// \param found, expected  of the element
+/// \param found     of the element
+/// \param expected  of it
 [[noreturn]] void failAt(const Element& element, const std::string& found, const std::string& expected);
 
 } // namespace cimhost::serve

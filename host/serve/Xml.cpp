@@ -223,7 +223,10 @@ void Builder::fail(Fault fault, const std::string& what) const
 Element parseXml(std::string_view document, const XmlLimits& limits, bool (*isKnown)(std::string_view name))
 {
     // The library sets itself up once; several threads may be the first.
-    static const bool isSetUp = (xmlInitParser(), true);
+    static const bool isSetUp = [] {
+        xmlInitParser();
+        return true;
+    }();
     static_cast<void>(isSetUp);
     if (document.empty())
         throw RequestError(Fault::notWellFormed, "found nothing, expected an XML document");

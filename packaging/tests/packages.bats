@@ -181,6 +181,24 @@ billed() { python3 -c 'import json, sys; print(*(one["name"] for one in json.loa
     billed "$PACKAGES"/libtavro-instrumentation1_*.spdx.json | grep -qx nlohmann-json3-dev
 }
 
+# What the standard makes of the sums of a tree's files.
+verification_code() { (cd "$1" && find . -type f -exec sha1sum {} +) | cut -c1-40 | sort | tr -d '\n' | sha1sum | cut -c1-40; }
+
+@test "a bill lists all files of its package" {
+    for package in "$PACKAGES"/*.deb "$PACKAGES"/*.rpm; do
+        tree=$BATS_TEST_TMPDIR/${package##*/}
+        mkdir "$tree"
+        case $package in
+        *.deb) dpkg-deb -x "$package" "$tree" ;;
+        *) rpm2archive - <"$package" | tar -xz -C "$tree" ;;
+        esac
+        grep -qF '"filesAnalyzed": true' "$package.spdx.json"
+        grep -qF "\"packageVerificationCodeValue\": \"$(verification_code "$tree")\"" "$package.spdx.json"
+        [ "$(grep -c '"fileName": ' "$package.spdx.json")" -eq "$(find "$tree" -type f | wc -l)" ]
+        [ -z "$(grep '"SPDXID": ' "$package.spdx.json" | sort | uniq -d)" ]
+    done
+}
+
 # Programs and libraries in a tree.
 binaries() { find "$1" -type f \( -name '*.so*' -o -path '*/bin/*' \); }
 
@@ -191,6 +209,12 @@ binaries() { find "$1" -type f \( -name '*.so*' -o -path '*/bin/*' \); }
         [ "$(strings --all "$file" | grep -cF "$SOURCE")" -eq 0 ]
     done
     [ "$(grep -rlF "$SOURCE" "$TREE" | wc -l)" -eq 0 ]
+}
+
+@test "all files of the RPM packages bear the time of the sources" {
+    for package in "$PACKAGES"/*.rpm; do
+        [ "$(rpm -qp --qf '[%{FILEMTIMES}\n]' "$package" | sort -u)" = "$(rpm -qp --qf '%{BUILDTIME}' "$package")" ]
+    done
 }
 
 @test "packages that are built twice are the same" {

@@ -9,7 +9,7 @@
 #include "serve/ValueWriter.h"
 #include "serve/Xml.h"
 
-#include <cmath>
+#include <limits>
 #include <string>
 
 #include <gmock/gmock.h>
@@ -255,9 +255,10 @@ TEST(ValueWriter, writesNumbersThatAreNone)
     const auto text = [](double number) {
         return instanceText({{"", "", "A", {}}, {{"P", cim::realValue(number)}}});
     };
-    EXPECT_THAT(text(NAN), HasSubstr("<VALUE>NaN</VALUE>"));
-    EXPECT_THAT(text(INFINITY), HasSubstr("<VALUE>INF</VALUE>"));
-    EXPECT_THAT(text(-INFINITY), HasSubstr("<VALUE>-INF</VALUE>"));
+    using Limits = std::numeric_limits<double>;
+    EXPECT_THAT(text(Limits::quiet_NaN()), HasSubstr("<VALUE>NaN</VALUE>"));
+    EXPECT_THAT(text(Limits::infinity()), HasSubstr("<VALUE>INF</VALUE>"));
+    EXPECT_THAT(text(-Limits::infinity()), HasSubstr("<VALUE>-INF</VALUE>"));
 }
 
 TEST(ValueWriter, writesAnEmptyTextWithAnEndTag)

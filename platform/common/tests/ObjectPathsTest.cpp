@@ -446,8 +446,11 @@ TEST(ObjectPathReferences, withNullKeysDifferFromThoseWithEmptyTexts)
 
 TEST(ObjectPathReferences, toNothingEqualNothing)
 {
+    // Without this only the first member of the union need be zero.
+    CMPIValue null{};
+    null.ref = nullptr;
     Path nullPointer("Association");
-    nullPointer.add("Part", CMPI_ref, {});
+    nullPointer.add("Part", CMPI_ref, null);
     Path noHandle("Device");
     noHandle.object.hdl = nullptr;
     Path withoutHandle("Association");

@@ -20,7 +20,11 @@ using LogFunction = void(const char*, const char*, int, const std::string&, int,
                          const std::string&);
 
 constexpr const char* logLevelMessage =
+#ifdef _LIBCPP_VERSION
+    "_ZN5MVLog8MVLogger15logLevelMessageEPKcS2_iRKNSt3__112basic_stringIcNS3_11char_traitsIcEENS3_9allocatorIcEEEEiS2_iiSB_";
+#else
     "_ZN5MVLog8MVLogger15logLevelMessageEPKcS2_iRKNSt7__cxx1112basic_stringIcSt11char_traitsIcESaIcEEEiS2_iiSA_";
+#endif
 
 std::ptrdiff_t lineCount(const std::string& file)
 {

@@ -36,11 +36,12 @@ namespace MVLog {
 /// std::bad_alloc is thrown: a line that cannot be written is lost, and the first such loss of a destination
 /// is complained of on standard error. A line below its channel's level costs a comparison.
 ///
-/// \param function, file, line  where the line comes from; the texts may be null
-/// \param category              the module, such as "Mavrel.Glimmark"
-/// \param level                 the higher the graver: 3000 flow of calls, 6000 error
-/// \param reserved              and the two numbers after it: not used, null and 0
-/// \param text                  the message
+/// Of both:
+/// - function, file, line: where the line comes from; the texts may be null
+/// - category: the module, such as "Mavrel.Glimmark"
+/// - level: the higher the graver: 3000 flow of calls, 6000 error
+/// - reserved, and the two numbers after it: not used, null and 0
+/// - text: the message
 class MVLogger
 {
 public:

@@ -21,7 +21,7 @@ public:
     /// A null text puts the buffer into its failed state: what it holds stays, nothing more is added.
     MVMessageBuffer& operator<<(const char* text);
     MVMessageBuffer& operator<<(const std::string& text);
-    /// In the stream's format of an untyped pointer; null is an address like any other.
+    /// In the stream's format of an untyped pointer; null is an address like any other, 0.
     MVMessageBuffer& operator<<(const void* address);
     /// As 1 or 0.
     MVMessageBuffer& operator<<(bool flag);
