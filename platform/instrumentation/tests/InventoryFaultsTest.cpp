@@ -209,7 +209,7 @@ TEST_F(InventoryFaults, theReportQuotesNoBytesThatAreNoUtf8)
 
 TEST_F(InventoryFaults, aByteThatIsNoUtf8IsFoundWhereverItIsInALongText)
 {
-    // Texts are read eight bytes at a time, and what is left over one by one.
+    // A parser may look at several bytes at a time, and at what is left over one by one.
     for (std::size_t place = 0; place < 20; ++place) {
         std::string text(20, 'x');
         text[place] = '\xFF';
